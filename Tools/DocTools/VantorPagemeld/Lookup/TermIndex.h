@@ -1,0 +1,29 @@
+#pragma once
+
+#include "Tools/DocTools/VantorPagemeld/Lookup/PositionTable.h"
+
+#include <rapidjson/document.h>
+
+/// Finds the members of one growing JSON object by name in constant time: what a linear search over the
+/// object finds, the first member whose name has the same bytes.
+class TermIndex
+{
+public:
+    /// Makes this the index of the object. Costs nothing if the object is as the index left it, and a walk
+    /// over its members otherwise.
+    void Follow(rapidjson::Value& object);
+
+    /// Returns the value of the first member that has member's name, valid until the next call. If there is
+    /// none, moves member to the end of the object, which grows with the allocator, and returns null.
+    rapidjson::Value* FindOrAppend(rapidjson::Value::Member& member,
+                                   rapidjson::Document::AllocatorType& allocator);
+
+private:
+    [[nodiscard]] std::uint32_t PositionOf(const rapidjson::Value& name, std::uint64_t hash) const;
+    void NoteStorage();
+
+    rapidjson::Value* m_object = nullptr;
+    rapidjson::Value::Member* m_members = nullptr;
+    rapidjson::SizeType m_memberCount = 0;
+    PositionTable m_positions;
+};

@@ -1,0 +1,95 @@
+#include "Runtime/Testing/RunNativeTests.h"
+#include "Tools/DocTools/VantorPagemeld/DocumentationSet.h"
+#include "Tools/DocTools/VantorPagemeld/ModuleDiscovery.h"
+#include "Tools/DocTools/VantorPagemeld/Output/Diagnostics.h"
+#include "Tools/DocTools/VantorPagemeld/Verification.h"
+
+#include <algorithm>
+#include <list>
+#include <string>
+#include <string_view>
+
+namespace
+{
+
+constexpr Diagnostics kDiagnostics("./Tools/DocTools/VantorPagemeld/Main");
+
+constexpr int kSuccess = 0;
+constexpr int kFailure = 255;
+
+void ReportUsage(int number, const char* program)
+{
+    kDiagnostics.Error(number, "Usage: %s <path1> <path2> ...\n or %s -autopaths <rootdir>\n", program,
+                       program);
+}
+
+int RunVerification(const char* rootDocPath)
+{
+    ReportProgress("rootDocPath = %s\n", rootDocPath);
+    if (!VerifyTocAndIndex(rootDocPath))
+    {
+        kDiagnostics.Error(200, "VerifyTocAndIndex failed\n");
+        return kFailure;
+    }
+    ReportProgress("VerifyTocAndIndex succeeded\n");
+    return kSuccess;
+}
+
+/// Combines both documentation sets. What one of them reports does not keep the other from being combined,
+/// nor does it change the exit status.
+int RunCombining(const std::list<std::string>& moduleRoots)
+{
+    (void)CombineAllTocAndIndex(moduleRoots, "Manual");
+    (void)CombineAllTocAndIndex(moduleRoots, "ScriptReference");
+    return kSuccess;
+}
+
+int RunDiscoveryAndCombining(std::string rootDirectory)
+{
+    std::replace(rootDirectory.begin(), rootDirectory.end(), '\\', '/');
+    std::list<std::string> moduleRoots;
+    GetPathsOfDocs(rootDirectory, moduleRoots);
+    return RunCombining(moduleRoots);
+}
+
+} // namespace
+
+/// Chooses the run mode by the first argument alone, and turns its outcome into the exit status.
+int main(int argc, char* argv[])
+{
+    const char* const program = argc > 0 ? argv[0] : "";
+    const std::string_view mode = argc > 1 ? argv[1] : "";
+    const char* const argument = argc > 2 ? argv[2] : nullptr;
+
+    if (mode == "-runNativeTests")
+    {
+        (void)RunNativeTests(argument == nullptr ? "" : argument);
+        return kSuccess;
+    }
+    ReportProgress("executing Pagemeld\n");
+    if (argc < 2)
+    {
+        ReportUsage(173, program);
+        return kFailure;
+    }
+    if (mode == "-verify")
+    {
+        if (argument == nullptr)
+        {
+            kDiagnostics.Error(192, "Usage: %s -verify <rootDocPath>\n", program);
+            return kFailure;
+        }
+        return RunVerification(argument);
+    }
+    if (mode == "-autopaths")
+    {
+        if (argument == nullptr)
+        {
+            // Unlike the same message above, this ends with success; it is kept so on purpose.
+            ReportUsage(212, program);
+            return kSuccess;
+        }
+        return RunDiscoveryAndCombining(argument);
+    }
+    return RunCombining(std::list<std::string>(argv + 1, argv + argc));
+}

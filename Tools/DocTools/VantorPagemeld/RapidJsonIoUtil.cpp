@@ -1,0 +1,163 @@
+#include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
+
+#include "Tools/DocTools/VantorPagemeld/Json/JsonReader.h"
+#include "Tools/DocTools/VantorPagemeld/Output/Diagnostics.h"
+#include "Tools/DocTools/VantorPagemeld/Output/ScopedFile.h"
+
+#include <rapidjson/prettywriter.h>
+#include <rapidjson/writer.h>
+
+#include <cstdint>
+#include <cstdlib>
+#include <memory>
+
+#include <fcntl.h>
+#include <unistd.h>
+
+namespace
+{
+
+constexpr Diagnostics kDiagnostics("./Tools/DocTools/VantorPagemeld/RapidJsonIoUtil");
+
+/// The parser counts in 32 bits.
+constexpr long kMaxFileSize = UINT32_MAX;
+
+struct FreeDeleter
+{
+    void operator()(void* memory) const { std::free(memory); }
+};
+using FileText = std::unique_ptr<char, FreeDeleter>;
+
+/// Opens for reading without waiting: a named pipe that nobody writes to would otherwise hold up the build
+/// for ever.
+ScopedFile OpenForReading(const char* path)
+{
+    const int descriptor = ::open(path, O_RDONLY | O_NONBLOCK | O_CLOEXEC);
+    if (descriptor < 0)
+    {
+        return nullptr;
+    }
+    ScopedFile file(::fdopen(descriptor, "rb"));
+    if (file == nullptr)
+    {
+        (void)::close(descriptor);
+    }
+    return file;
+}
+
+/// Returns the size in bytes, or -1 for what has none, such as a pipe. Leaves the stream at its start.
+long SizeOf(std::FILE* file)
+{
+    if (std::fseek(file, 0, SEEK_END) != 0)
+    {
+        return -1;
+    }
+    const long size = std::ftell(file);
+    std::rewind(file);
+    return size;
+}
+
+/// Returns the whole of an open file with a NUL behind it, or null, after a warning, when it can't be had.
+FileText ReadWhole(std::FILE* file, const char* path)
+{
+    const long size = SizeOf(file);
+    std::size_t bytesRead = 0;
+    if (size >= 0 && size <= kMaxFileSize)
+    {
+        const auto bytesWanted = static_cast<std::size_t>(size);
+        FileText text(static_cast<char*>(std::malloc(bytesWanted + 1)));
+        if (text != nullptr)
+        {
+            bytesRead = std::fread(text.get(), 1, bytesWanted, file);
+            if (bytesRead == bytesWanted && std::ferror(file) == 0)
+            {
+                text.get()[bytesRead] = '\0';
+                return text;
+            }
+        }
+    }
+    kDiagnostics.Warning(60, "Unable to read entire file %s, requested %d, got %d bytes\n", path,
+                         static_cast<int>(size), static_cast<int>(bytesRead));
+    return nullptr;
+}
+
+/// Returns the whole of the file at path with a NUL behind it, or null, after a warning, when it can't be
+/// had.
+FileText ReadFile(const char* path)
+{
+    const ScopedFile file = OpenForReading(path);
+    if (file == nullptr)
+    {
+        kDiagnostics.Warning(47, "Unable to read %s\n", path);
+        return nullptr;
+    }
+    return ReadWhole(file.get(), path);
+}
+
+} // namespace
+
+namespace RapidJsonIoUtil
+{
+
+bool TryGetJsonDocFromFile(const char* path, rapidjson::Document& document)
+{
+    const FileText text = ReadFile(path);
+    if (text == nullptr)
+    {
+        return false;
+    }
+    const rapidjson::ParseResult result = ParseJson(text.get(), document);
+    if (result.IsError())
+    {
+        kDiagnostics.Error(71, "Failed to parse JSON file %s, error at offset: %d\n", path,
+                           static_cast<int>(result.Offset()));
+        return false;
+    }
+    return true;
+}
+
+bool TryGetJsonDocFromString(const char* json, rapidjson::Document& document)
+{
+    return !ParseJson(json, document).IsError();
+}
+
+std::string OutputJsonValueToString(const rapidjson::Value& value)
+{
+    RenderedText text;
+    AppendCompactJson(text, value);
+    return text.GetString();
+}
+
+RenderedText RenderPrettyJson(const rapidjson::Value& value)
+{
+    RenderedText text;
+    rapidjson::PrettyWriter<RenderedText> writer(text);
+    value.Accept(writer);
+    return text;
+}
+
+void AppendCompactJson(RenderedText& text, const rapidjson::Value& value)
+{
+    rapidjson::Writer<RenderedText> writer(text);
+    value.Accept(writer);
+}
+
+bool OutputJsonValueToFile(const rapidjson::Value& value, const char* path)
+{
+    return OutputJsonTextToFile(RenderPrettyJson(value), path);
+}
+
+bool OutputJsonTextToFile(const RenderedText& json, const char* path)
+{
+    const ScopedFile file(std::fopen(path, "w+b"));
+    if (file == nullptr)
+    {
+        kDiagnostics.Warning(23, "Failed to open %s for writing\n", path);
+        return false;
+    }
+    // Whether every byte arrived is deliberately not asked.
+    (void)WriteText(file.get(), TextOf(json));
+    return true;
+}
+
+} // namespace RapidJsonIoUtil

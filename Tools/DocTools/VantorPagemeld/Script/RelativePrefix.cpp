@@ -1,0 +1,44 @@
+#include "Tools/DocTools/VantorPagemeld/Script/RelativePrefix.h"
+
+#include <algorithm>
+#include <cstddef>
+
+namespace
+{
+
+/// Returns where the paths part: the position of a '/' in toModule, or its start.
+std::size_t FindSplit(std::string_view fromModule, std::string_view toModule)
+{
+    const auto difference =
+        std::mismatch(fromModule.begin(), fromModule.end(), toModule.begin(), toModule.end());
+    const auto common = static_cast<std::size_t>(difference.second - toModule.begin());
+    if (common == toModule.size() || toModule[common] != '/')
+    {
+        const std::size_t slash = toModule.substr(0, common).rfind('/');
+        return slash == std::string_view::npos ? 0 : slash;
+    }
+    return common;
+}
+
+/// Returns toModule behind the split and behind every '/' that stands there.
+std::string_view TailBehind(std::string_view toModule, std::size_t split)
+{
+    std::string_view tail = toModule.substr(split);
+    tail.remove_prefix(std::min(tail.find_first_not_of('/'), tail.size()));
+    return tail;
+}
+
+} // namespace
+
+std::string RelativePrefix(std::string_view fromModule, std::string_view toModule)
+{
+    const std::size_t split = FindSplit(fromModule, toModule);
+    const std::string_view below = fromModule.substr(split);
+
+    std::string prefix;
+    for (auto climbs = std::count(below.begin(), below.end(), '/'); climbs > 0; --climbs)
+    {
+        prefix += "../";
+    }
+    return prefix.append(TailBehind(toModule, split));
+}

@@ -1,0 +1,13 @@
+#pragma once
+
+#include "Tools/DocTools/VantorPagemeld/Structure/StructureFault.h"
+
+#include <rapidjson/document.h>
+
+/// Checks an input search index: the types of its four members, then each entry of pages, info, common and
+/// searchIndex, every page and info number against the document's own arrays.
+///
+/// Hands every fault to onFault, at most one per entry, the first of that entry; numbers that point into a
+/// missing array are not held against it. Returns false as soon as onFault does, and true at the end of the
+/// document. Changes nothing.
+bool CheckIndexStructure(const rapidjson::Value& document, const FaultHandler& onFault);

@@ -1,0 +1,68 @@
+#pragma once
+
+#include "Tools/DocTools/VantorPagemeld/JsonCombiner.h"
+#include "Tools/DocTools/VantorPagemeld/Lookup/SiblingIndex.h"
+#include "Tools/DocTools/VantorPagemeld/Script/TocScript.h"
+
+#include <optional>
+#include <unordered_map>
+
+/// Merges the tables of contents of all modules. Entries of one list that have the same link and title become
+/// one; new ones go to the end of the list in the order of the modules.
+class TocCombiner : public JsonCombiner
+{
+public:
+    /// Starts with an empty object.
+    TocCombiner();
+
+    /// Checks the node and, by calling itself, everything below it.
+    bool VerifyJSONStructure(const rapidjson::Value& node) override;
+
+    /// Trusts that the document passed VerifyJSONStructure. The first document becomes the combined one; a
+    /// later one whose root has another link or title is deliberately dropped without a word.
+    void AppendJsonDocument(rapidjson::Document& document) override;
+
+    /// Adds a "module" member to every node, with the combined document's allocator.
+    void AddModuleIndexToEachEntry(rapidjson::Document& document, int moduleIndex) override;
+
+    /// Reports an error and returns false when the file can't be opened. Returns false without a word or a
+    /// file when the root has no link or no title.
+    bool OutputJsonValueAsJs(const char* modulePath, const rapidjson::Document& document,
+                             const char* outputPath) override;
+
+    /// Returns what OutputScript writes for combinedDocument.
+    [[nodiscard]] std::optional<RenderedText> RenderScript(const rapidjson::Value& root) const;
+
+    /// Writes what RenderScript returned; otherwise as OutputJsonValueAsJs.
+    bool OutputScript(const char* modulePath, const std::optional<RenderedText>& script,
+                      const char* outputPath) const;
+
+    /// Whether two nodes count as the same entry: equal links and equal titles, each as NUL-terminated text.
+    bool SameLinkAndTitle(rapidjson::Value& a, rapidjson::Value& b);
+
+    /// Merges source, a node or list of a module document, into destination, which lies in the combined
+    /// document.
+    void AppendJsonValue(rapidjson::Value& destination, rapidjson::Value& source);
+
+    /// Tags a node or list and everything below it. The links themselves stay as they are, despite the name:
+    /// their prefixes differ from one output module to the next and are put in front when the script is
+    /// written.
+    void AddPlatformPrefixToLinks(rapidjson::Value& value, int moduleIndex);
+
+    /// Writes text in double quotes, its own escaped, and then extra. Returns false if the write fails.
+    bool WriteQuotedStringPlusExtra(std::FILE* file, const char* text, const char* extra, int indent,
+                                    bool newLine);
+
+    /// Writes one node, or the nodes of one list, with everything below. Returns false if the write fails.
+    bool OutputValueAsJs(std::FILE* file, const rapidjson::Value& value, int indent);
+
+private:
+    void AppendList(rapidjson::Value& destination, rapidjson::Value& source);
+    void AppendNode(rapidjson::Value& destination, rapidjson::Value& source);
+
+    TocScriptLayout m_layout;
+
+    /// For every combined list that another was merged into, by the address of its "children" value, which
+    /// stays where it is as long as the node is not given further members.
+    std::unordered_map<const rapidjson::Value*, SiblingIndex> m_siblings;
+};
