@@ -1,0 +1,18 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+/// What a process left behind.
+struct ProgramResult
+{
+    int status; ///< exit status, or minus the number of the signal that ended it
+    std::string standardOutput;
+    std::string standardError;
+};
+
+/// Runs a program, found on the search path unless it has a slash, to its end.
+ProgramResult RunProgram(const std::string& program, const std::vector<std::string>& arguments);
+
+/// Runs the built pagemeld to its end.
+ProgramResult RunPagemeld(const std::vector<std::string>& arguments);

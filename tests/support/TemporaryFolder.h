@@ -1,0 +1,22 @@
+#pragma once
+
+#include <string>
+
+/// A new empty folder that is removed, with all that it holds, at the end of this object's life.
+class TemporaryFolder
+{
+public:
+    TemporaryFolder();
+    ~TemporaryFolder();
+
+    TemporaryFolder(const TemporaryFolder&) = delete;
+    TemporaryFolder& operator=(const TemporaryFolder&) = delete;
+
+    [[nodiscard]] const std::string& Path() const { return m_path; }
+
+    /// Returns the path of something below the folder.
+    [[nodiscard]] std::string operator/(const std::string& name) const { return m_path + "/" + name; }
+
+private:
+    std::string m_path;
+};
