@@ -234,27 +234,3 @@ TEST(DocumentationSet, UnwritableSearchIndexScriptEndsTheRun)
               "a/Manual/docdata/global_toc.json\n",
               Names(Outputs(folder)));
 }
-
-TEST(DocumentationSet, OutputsThatCannotBePutInPlaceStopNoOther)
-{
-    const TemporaryFolder folder;
-    AddModule(folder, "a/Manual", kIndexA, kTocA);
-    std::filesystem::create_directories(folder / "a/Manual/docdata/global_index.json.tmp"); // can't be opened
-    std::filesystem::create_directories(folder / "a/Manual/docdata/global_index.js"); // can't be replaced
-    std::filesystem::create_directories(folder / "a/Manual/docdata/global_toc.js.tmp");
-    WriteWholeFile(folder / "a/Manual/docdata/global_toc.js", "stale");
-    EXPECT_EQ("executing Pagemeld\n"
-              "WARNING: ./Tools/DocTools/VantorPagemeld/RapidJsonIoUtil:23 Failed to open "
-              "@/a/Manual/docdata/global_index.json.tmp for writing\n"
-              "ERROR: ./Tools/DocTools/VantorPagemeld/TocCombiner:314 Failed to open output file "
-              "@/a/Manual/docdata/global_toc.js.tmp\n"
-              "WARNING: ./Tools/DocTools/VantorPagemeld/RapidJsonIoUtil:47 Unable to read "
-              "@/a/ScriptReference/docdata/index.json\n"
-              "status 0\n",
-              ReportOfRun(folder, {"@/a"}));
-    const Tree outputs = Outputs(folder);
-    EXPECT_EQ("a/Manual/docdata/global_index.js.tmp\na/Manual/docdata/global_toc.js\na/Manual/docdata/"
-              "global_toc.json\n",
-              Names(outputs));
-    EXPECT_EQ("stale", outputs.at("a/Manual/docdata/global_toc.js"));
-}
