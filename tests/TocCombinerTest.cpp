@@ -3,6 +3,7 @@
 #include "tests/support/MergedModules.h"
 
 #include <gtest/gtest.h>
+#include <rapidjson/prettywriter.h>
 
 #include <cstring>
 #include <random>
@@ -149,5 +150,10 @@ TEST(TocCombiner, TreesAtTheDepthLimitPassThroughEveryStep)
     const auto text = merged.Get().RenderScript(merged.Get().combinedDocument);
     EXPECT_NE(std::string::npos, TextOf(*text).find(R"(toc = {
 "link": "l","title": "t","children": [{"link": p1+"l","title": "t","children": [{"link": p1+)"));
-    EXPECT_LT(deep.size(), RapidJsonIoUtil::RenderPrettyJson(merged.Get().combinedDocument).GetSize());
+
+    // The pretty form without its blanks, which would be more than half a gigabyte.
+    RenderedText pretty;
+    rapidjson::PrettyWriter<RenderedText> writer(pretty);
+    writer.SetIndent(' ', 0);
+    EXPECT_TRUE(merged.Get().combinedDocument.Accept(writer));
 }
