@@ -107,7 +107,7 @@ TEST(JsonReading, WarnsOfWhatHasNoTextToRead)
 
 TEST(JsonReading, DocumentTellsTheOutcomeOfTheLastParse)
 {
-    rapidjson::Document document = ParsedJson("{\"old\":[1,\"text that is not short\"]}");
+    rapidjson::Document document = ParsedJson(R"({"old":[1,"text that is not short"]})");
     EXPECT_FALSE(RapidJsonIoUtil::TryGetJsonDocFromString("[[1,2,\"x\"], oops", document));
     EXPECT_TRUE(document.IsNull());
     EXPECT_TRUE(document.HasParseError());
