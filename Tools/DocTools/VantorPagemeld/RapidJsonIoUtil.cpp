@@ -12,6 +12,7 @@
 #include <memory>
 
 #include <fcntl.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 namespace
@@ -45,10 +46,13 @@ ScopedFile OpenForReading(const char* path)
     return file;
 }
 
-/// Returns the size in bytes, or -1 for what has none, such as a pipe. Leaves the stream at its start.
+/// Returns the size in bytes, or -1 for what has none: a folder, whatever its file system says, or a pipe.
+/// Leaves the stream at its start.
 long SizeOf(std::FILE* file)
 {
-    if (std::fseek(file, 0, SEEK_END) != 0)
+    struct stat status = {};
+    if (::fstat(::fileno(file), &status) != 0 || S_ISDIR(status.st_mode) ||
+        std::fseek(file, 0, SEEK_END) != 0)
     {
         return -1;
     }
@@ -69,7 +73,7 @@ FileText ReadWhole(std::FILE* file, const char* path)
         if (text != nullptr)
         {
             bytesRead = std::fread(text.get(), 1, bytesWanted, file);
-            if (bytesRead == bytesWanted && std::ferror(file) == 0)
+            if (bytesRead == bytesWanted)
             {
                 text.get()[bytesRead] = '\0';
                 return text;

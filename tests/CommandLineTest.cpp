@@ -1,0 +1,118 @@
+#include "tests/support/RunProgram.h"
+#include "tests/support/WholeFile.h"
+
+#include <gtest/gtest.h>
+
+TEST(CommandLine, FirstArgumentAloneSelectsTheMode)
+{
+    const struct
+    {
+        std::vector<std::string> arguments;
+        const char* report;
+    } cases[] = {
+        {{}, R"(executing Pagemeld
+ERROR: #Main:173 Usage: PROGRAM <path1> <path2> ...
+ or PROGRAM -autopaths <rootdir>
+status 255
+)"},
+        {{"-autopaths"}, R"(executing Pagemeld
+ERROR: #Main:212 Usage: PROGRAM <path1> <path2> ...
+ or PROGRAM -autopaths <rootdir>
+status 0
+)"}, // the same text, but no failure: wanted
+        {{"-verify"}, R"(executing Pagemeld
+ERROR: #Main:192 Usage: PROGRAM -verify <rootDocPath>
+status 255
+)"},
+        {{"-autopaths", "@/none", "ignored"}, "executing Pagemeld\nstatus 0\n"},
+        {{"@\\a", "-verify", "--help", ""}, R"(executing Pagemeld
+WARNING: #RapidJsonIoUtil:47 Unable to read @\a/Manual/docdata/index.json
+WARNING: #RapidJsonIoUtil:47 Unable to read -verify/Manual/docdata/index.json
+WARNING: #RapidJsonIoUtil:47 Unable to read --help/Manual/docdata/index.json
+WARNING: #RapidJsonIoUtil:47 Unable to read /Manual/docdata/index.json
+WARNING: #RapidJsonIoUtil:47 Unable to read @\a/ScriptReference/docdata/index.json
+WARNING: #RapidJsonIoUtil:47 Unable to read -verify/ScriptReference/docdata/index.json
+WARNING: #RapidJsonIoUtil:47 Unable to read --help/ScriptReference/docdata/index.json
+WARNING: #RapidJsonIoUtil:47 Unable to read /ScriptReference/docdata/index.json
+status 0
+)"},
+        {{"-Verify"}, R"(executing Pagemeld
+WARNING: #RapidJsonIoUtil:47 Unable to read -Verify/Manual/docdata/index.json
+WARNING: #RapidJsonIoUtil:47 Unable to read -Verify/ScriptReference/docdata/index.json
+status 0
+)"},
+    };
+    const TemporaryFolder folder;
+    for (const auto& c : cases)
+    {
+        EXPECT_EQ(c.report, ReportOfRun(folder, c.arguments));
+    }
+    EXPECT_TRUE(ReadTree(folder.Path()).empty());
+}
+
+TEST(CommandLine, SelfTestModeWritesNothingToStandardError)
+{
+    const ProgramResult result =
+        RunProgram(PAGEMELD_PROGRAM, {"-runNativeTests", "no test has this name", "ignored"});
+    EXPECT_EQ(0, result.status);
+    EXPECT_EQ("", result.standardError);
+}
+
+TEST(CommandLine, VerificationStopsAtTheFirstFileThatFails)
+{
+    const struct
+    {
+        const char* contents[4]; ///< of the four files in their order; null for one that is missing
+        const char* report;
+    } cases[] = {
+        {{"[]", "7", " null\n", "\"any JSON will do\""}, R"(executing Pagemeld
+rootDocPath = @
+Verifying @/en/Manual/docdata/toc.json
+Verifying @/en/Manual/docdata/index.json
+Verifying @/en/ScriptReference/docdata/toc.json
+Verifying @/en/ScriptReference/docdata/index.json
+VerifyTocAndIndex succeeded
+status 0
+)"},
+        {{nullptr, nullptr, nullptr, nullptr}, R"(executing Pagemeld
+rootDocPath = @
+Skipping @/en/Manual/docdata/toc.json
+Skipping @/en/Manual/docdata/index.json
+Skipping @/en/ScriptReference/docdata/toc.json
+Skipping @/en/ScriptReference/docdata/index.json
+VerifyTocAndIndex succeeded
+status 0
+)"},
+        {{"{\"a\":}", "{}", "{}", "{}"}, R"(executing Pagemeld
+rootDocPath = @
+Verifying @/en/Manual/docdata/toc.json
+ERROR: #RapidJsonIoUtil:71 Failed to parse JSON file @/en/Manual/docdata/toc.json, error at offset: 5
+ERROR: #Main:200 VerifyTocAndIndex failed
+status 255
+)"},
+        {{nullptr, nullptr, "{}", "{\"a\":1"}, R"(executing Pagemeld
+rootDocPath = @
+Skipping @/en/Manual/docdata/toc.json
+Skipping @/en/Manual/docdata/index.json
+Verifying @/en/ScriptReference/docdata/toc.json
+Verifying @/en/ScriptReference/docdata/index.json
+ERROR: #RapidJsonIoUtil:71 Failed to parse JSON file @/en/ScriptReference/docdata/index.json, error at offset: 6
+ERROR: #Main:200 VerifyTocAndIndex failed
+status 255
+)"},
+    };
+    const char* const names[] = {"Manual/docdata/toc.json", "Manual/docdata/index.json",
+                                 "ScriptReference/docdata/toc.json", "ScriptReference/docdata/index.json"};
+    for (const auto& c : cases)
+    {
+        const TemporaryFolder folder;
+        for (int i = 0; i < 4; ++i)
+        {
+            if (c.contents[i] != nullptr)
+            {
+                WriteWholeFile(folder / (std::string("en/") + names[i]), c.contents[i]);
+            }
+        }
+        EXPECT_EQ(c.report, ReportOfRun(folder, {"-verify", "@", "ignored"}));
+    }
+}

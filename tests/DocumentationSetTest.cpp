@@ -1,0 +1,227 @@
+#include "tests/support/RunProgram.h"
+#include "tests/support/WholeFile.h"
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+
+// Texts say @ for the temporary folder.
+
+namespace
+{
+
+const char* const kIndexA =
+    R"({"pages":[["a.html","Say \"A\""]],"info":[["About \"A\"",0]],"common":{"the":1},"searchIndex":{"say":[0]}})";
+const char* const kIndexB =
+    R"({"pages":[["b.html","Ä/B"]],"info":[["b\n",0]],"common":{},"searchIndex":{"say":[0],"b":[0]}})";
+const char* const kTocA =
+    R"({"link":"toc","title":"toc","children":[{"link":"a.html","title":"Say \"A\"","children":null}]})";
+const char* const kTocB =
+    R"({"link":"toc","title":"toc","children":[{"link":"null","title":"B","children":[{"link":"b.html","title":"","children":[]}]}]})";
+
+void AddModule(const TemporaryFolder& folder, const std::string& modulePath, const std::string& index,
+               const std::string& toc)
+{
+    WriteWholeFile(folder / (modulePath + "/docdata/index.json"), index);
+    WriteWholeFile(folder / (modulePath + "/docdata/toc.json"), toc);
+}
+
+/// Returns every file that is no input of a module, by its path.
+std::map<std::string, std::string> Outputs(const TemporaryFolder& folder)
+{
+    std::map<std::string, std::string> outputs;
+    for (const auto& [path, content] : ReadTree(folder.Path()))
+    {
+        const std::string name = std::filesystem::path(path).filename();
+        if (name != "index.json" && name != "toc.json")
+        {
+            outputs[path] = content;
+        }
+    }
+    return outputs;
+}
+
+/// Returns the path of every file that is no input of a module, each on a line.
+std::string OutputNames(const TemporaryFolder& folder)
+{
+    std::string names;
+    for (const auto& [path, content] : Outputs(folder))
+    {
+        names += path + "\n";
+    }
+    return names;
+}
+
+const char* const kIndexJson = R"({
+    "pages": [
+        [
+            "a.html",
+            "Say \"A\"",
+            0
+        ],
+        [
+            "b.html",
+            "Ä/B",
+            1
+        ]
+    ],
+    "info": [
+        [
+            "About \"A\"",
+            0
+        ],
+        [
+            "b\n",
+            1
+        ]
+    ],
+    "common": {
+        "the": 1
+    },
+    "searchIndex": {
+        "say": [
+            0,
+            1
+        ],
+        "b": [
+            1
+        ]
+    }
+})";
+
+const char* const kTocJson = R"({
+    "link": "toc",
+    "title": "toc",
+    "children": [
+        {
+            "link": "a.html",
+            "title": "Say \"A\"",
+            "children": null,
+            "module": 0
+        },
+        {
+            "link": "null",
+            "title": "B",
+            "children": [
+                {
+                    "link": "b.html",
+                    "title": "",
+                    "children": [],
+                    "module": 1
+                }
+            ],
+            "module": 1
+        }
+    ],
+    "module": 0
+})";
+
+const char* const kIndexScript = R"(pages = [
+[p0 + "a.html", "Say \"A\""],
+[p1 + "b.html", "Ä/B"]
+];
+info = [["About \"A\"",0],["b\n",1]]
+common = {"the":1};
+searchIndex = {"say":[0,1],"b":[1]};
+)";
+
+const char* const kTocScript = R"(toc = {
+"link": "toc","title": "toc","children": [{"link": p0+"a.html","title": "Say \"A\"","children": null},{"link": "null","title": "B","children": [{"link": p1+"b.html","title": "","children": []}]}]};
+)";
+
+} // namespace
+
+TEST(DocumentationSet, EveryModuleReceivesAllFourFiles)
+{
+    const TemporaryFolder folder;
+    AddModule(folder, "docs/a/Manual", kIndexA, kTocA);
+    AddModule(folder, "docs/b/Manual", kIndexB, kTocB);
+    AddModule(folder, "docs/c/Manual", "{}", "{}"); // is skipped, but receives the files
+    WriteWholeFile(folder / "docs/a/Manual/docdata/global_toc.js",
+                   "of an earlier run, and longer than what follows");
+    WriteWholeFile(folder / "docs/b/Manual/docdata/global_index.js.tmp", "left behind");
+
+    EXPECT_EQ(R"(executing Pagemeld
+WARNING: #IndexCombiner:290 Pages is not an array or absent
+WARNING: #TocCombiner:372 Title is non-string or absent
+WARNING: #RapidJsonIoUtil:47 Unable to read @/docs/a/ScriptReference/docdata/index.json
+WARNING: #RapidJsonIoUtil:47 Unable to read @/docs/b/ScriptReference/docdata/index.json
+WARNING: #RapidJsonIoUtil:47 Unable to read @/docs/c/ScriptReference/docdata/index.json
+status 0
+)",
+              ReportOfRun(folder, {"-autopaths", "@\\docs"}));
+    std::map<std::string, std::string> expected;
+    const std::string prefixes[][2] = {
+        {"a", "var p0 = \"\";\nvar p1 = \"../../b/Manual/\";\n"},
+        {"b", "var p0 = \"../../a/Manual/\";\nvar p1 = \"\";\n"},
+        {"c", "var p0 = \"../../a/Manual/\";\nvar p1 = \"../../b/Manual/\";\n"}};
+    for (const auto& [module, lines] : prefixes)
+    {
+        const std::string docdata = "docs/" + module + "/Manual/docdata/";
+        expected[docdata + "global_index.json"] = kIndexJson;
+        expected[docdata + "global_index.js"] = lines + kIndexScript;
+        expected[docdata + "global_toc.json"] = kTocJson;
+        expected[docdata + "global_toc.js"] = lines + kTocScript;
+
+        const ProgramResult check = RunProgram(NODE_PROGRAM, {CHECK_SCRIPTS, folder / docdata});
+        EXPECT_EQ("2 pages, 2 terms\n", check.standardOutput) << check.standardError;
+    }
+    EXPECT_EQ(expected, Outputs(folder));
+}
+
+TEST(DocumentationSet, SetsAreIndependentAndPathsAreUsedAsGiven)
+{
+    const TemporaryFolder folder;
+    AddModule(folder, "a/Manual", kIndexA, "[]"); // no table of contents at all: the set is not written
+    AddModule(folder, "b/Manual", kIndexB, R"({"link":"l","title":"t"})");
+    AddModule(folder, "b/ScriptReference", kIndexB, kTocB);
+    WriteWholeFile(folder / "a/Manual/docdata/global_toc.js", "stale");
+    std::filesystem::create_directories(folder / "a/ScriptReference/docdata");
+    EXPECT_EQ(R"(executing Pagemeld
+WARNING: #TocCombiner:372 Title is non-string or absent
+WARNING: #TocCombiner:382 Children is not an array or null
+WARNING: #RapidJsonIoUtil:47 Unable to read @/a//ScriptReference/docdata/index.json
+WARNING: #RapidJsonIoUtil:47 Unable to read @/a//ScriptReference/docdata/toc.json
+status 0
+)",
+              ReportOfRun(folder, {"@/a/", "@/b"}));
+    EXPECT_EQ(R"(a/Manual/docdata/global_toc.js
+a/ScriptReference/docdata/global_index.js
+a/ScriptReference/docdata/global_index.json
+a/ScriptReference/docdata/global_toc.js
+a/ScriptReference/docdata/global_toc.json
+b/ScriptReference/docdata/global_index.js
+b/ScriptReference/docdata/global_index.json
+b/ScriptReference/docdata/global_toc.js
+b/ScriptReference/docdata/global_toc.json
+)",
+              OutputNames(folder));
+    EXPECT_EQ("stale", ReadWholeFile(folder / "a/Manual/docdata/global_toc.js"));
+    EXPECT_EQ(R"(var p0 = "../../../b/ScriptReference/";
+toc = {
+"link": "toc","title": "toc","children": [{"link": "null","title": "B","children": [{"link": p0+"b.html","title": "","children": []}]}]};
+)",
+              ReadWholeFile(folder / "a/ScriptReference/docdata/global_toc.js"));
+}
+
+TEST(DocumentationSet, UnwritableSearchIndexScriptEndsTheRun)
+{
+    const TemporaryFolder folder;
+    for (const char* modulePath : {"a/Manual", "c/Manual", "a/ScriptReference", "c/ScriptReference"})
+    {
+        AddModule(folder, modulePath, kIndexA, kTocA);
+    }
+    EXPECT_EQ(R"(executing Pagemeld
+WARNING: #RapidJsonIoUtil:47 Unable to read @/b/Manual/docdata/index.json
+WARNING: #RapidJsonIoUtil:47 Unable to read @/b/Manual/docdata/toc.json
+WARNING: #RapidJsonIoUtil:23 Failed to open @/b/Manual/docdata/global_index.json.tmp for writing
+CRITICAL: #IndexCombiner:176 Unable to open file @/b/Manual/docdata/global_index.js.tmp for writingstatus 255
+)",
+              ReportOfRun(folder, {"@/a", "@/b", "@/c"}));
+    EXPECT_EQ(R"(a/Manual/docdata/global_index.js
+a/Manual/docdata/global_index.json
+a/Manual/docdata/global_toc.js
+a/Manual/docdata/global_toc.json
+)",
+              OutputNames(folder));
+}

@@ -1,0 +1,105 @@
+#include "Tools/DocTools/VantorPagemeld/IndexCombiner.h"
+
+#include "tests/support/MergedModules.h"
+
+#include <gtest/gtest.h>
+
+#include <random>
+
+namespace
+{
+
+/// Returns a module of three infos whose few terms are often the same.
+std::string RandomModule(std::mt19937& random)
+{
+    const char* const names[] = {"",        "a",        "b",         "ab",
+                                 "\\u0000", "a\\u0000", "a\\u0000b", "not a short string"};
+    std::vector<std::string> terms;
+    for (auto i = random() % 20; i > 0; --i)
+    {
+        std::vector<std::string> numbers;
+        for (auto k = random() % 4; k > 0; --k)
+        {
+            numbers.push_back(std::to_string(random() % 3));
+        }
+        terms.push_back("\"" + std::string(names[random() % 8]) + "\":[" + Joined(numbers) + "]");
+    }
+    return R"({"pages":[["p","P"]],"info":[["t",0],["t",0],["t",0]],"common":{},"searchIndex":{)" +
+           Joined(terms) + "}}";
+}
+
+/// The merge as one would explain it: every term is searched for from the first to the last.
+void MergeTerms(rapidjson::Document& combined, const rapidjson::Value& terms, int infoOffset)
+{
+    auto& allocator = combined.GetAllocator();
+    for (const auto& term : terms.GetObject())
+    {
+        auto found = combined.MemberBegin();
+        while (found != combined.MemberEnd() && found->name != term.name)
+        {
+            ++found;
+        }
+        if (found == combined.MemberEnd())
+        {
+            combined.AddMember(rapidjson::Value(term.name, allocator),
+                               rapidjson::Value(rapidjson::kArrayType), allocator);
+            found = combined.MemberEnd() - 1;
+        }
+        for (const auto& number : term.value.GetArray())
+        {
+            found->value.PushBack(number.GetInt() + infoOffset, allocator);
+        }
+    }
+}
+
+} // namespace
+
+TEST(IndexCombiner, MergesModulesInTheirOrder)
+{
+    const struct
+    {
+        std::vector<std::string> modules;
+        const char* combined;
+    } cases[] = {
+        {{}, R"({"pages":[],"info":[],"common":{},"searchIndex":{}})"},
+        {{R"({"searchIndex":{"a":[1]},"x":1,"common":{"a":1},"info":[["A text",0]],"pages":[["A","A"]]})"},
+         R"({"pages":[["A","A",0]],"info":[["A text",0]],"common":{"a":1},"searchIndex":{"a":[1]}})"},
+        {{"{\"pages\":\n[[\"A\", \"A\"]],\n\"info\": \n[[\"A text\",0]],\n\"common\": "
+          "{\"a\":1},\n\"searchIndex\": "
+          "\n{\"a\":[1]}}\n",
+          "{\"pages\":\n[[\"B\", \"B\"]],\n\"info\": \n[[\"B text\",0]],\n\"common\": "
+          "{\"a\":1},\n\"searchIndex\": "
+          "\n{\"b\":[2]}}\n"},
+         R"({"pages":[["A","A",0],["B","B",1]],"info":[["A text",0],["B text",1]],"common":{"a":1},"searchIndex":{"a":[1],"b":[3]}})"},
+        {{R"({"pages":[["p","P"],["q","Q"]],"info":[["t",1],["u",0],["v",1]],"common":{},"searchIndex":{"a":[2,0,2],"b":[]}})",
+          R"({"pages":[],"info":[],"common":{"x":1},"searchIndex":{}})",
+          R"({"pages":[["r","R"]],"info":[["w",0]],"common":{"y":1},"searchIndex":{"c":[0],"a":[0,0],"b":[0],"c":[0]}})"},
+         R"({"pages":[["p","P",0],["q","Q",0],["r","R",2]],"info":[["t",1],["u",0],["v",1],["w",2]],"common":{"x":1},"searchIndex":{"a":[2,0,2,3,3],"b":[3],"c":[3,3]}})"},
+        {{R"({"pages":[],"info":[],"common":{"a":1},"searchIndex":{"a":[],"a\u0000":[]}})",
+          R"({"pages":[],"info":[],"common":{"b":1},"searchIndex":{"a\u0000b":[],"A":[]}})"},
+         R"({"pages":[],"info":[],"common":{"a":1},"searchIndex":{"a":[],"a\u0000":[],"a\u0000b":[],"A":[]}})"},
+    };
+    for (const auto& c : cases)
+    {
+        EXPECT_EQ(c.combined, MergedModules<IndexCombiner>(c.modules).Json());
+    }
+}
+
+TEST(IndexCombiner, MergesAsALinearSearchWould)
+{
+    for (unsigned seed = 0; seed < 200; ++seed)
+    {
+        std::mt19937 random(seed);
+        std::vector<std::string> modules;
+        rapidjson::Document expected = ParsedJson("{}");
+        for (int index = 0; index < 5; ++index)
+        {
+            modules.push_back(RandomModule(random));
+            MergeTerms(expected, ParsedJson(modules.back())["searchIndex"], 3 * index);
+        }
+        MergedModules<IndexCombiner> merged(modules);
+        EXPECT_EQ(RapidJsonIoUtil::OutputJsonValueToString(expected),
+                  RapidJsonIoUtil::OutputJsonValueToString(merged.Get().combinedDocument["searchIndex"]))
+            << "seed " << seed;
+    }
+}

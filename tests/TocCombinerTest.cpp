@@ -1,0 +1,159 @@
+#include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
+
+#include "tests/support/MergedModules.h"
+
+#include <gtest/gtest.h>
+#include <rapidjson/prettywriter.h>
+
+#include <cstring>
+#include <random>
+
+namespace
+{
+
+/// Returns a list of few different nodes, or null, with lists inside one another on so many levels.
+std::string RandomChildren(std::mt19937& random, int levels)
+{
+    const char* const texts[] = {"a", "b", "a\\u0000x", "", "\\u0000", "not a short string"};
+    if (levels == 0 || random() % 4 == 0)
+    {
+        return "null";
+    }
+    std::vector<std::string> nodes;
+    for (auto i = random() % 7; i > 0; --i)
+    {
+        const std::string link = texts[random() % 6];
+        const std::string title = texts[random() % 3];
+        nodes.push_back("{\"link\":\"" + link + "\",\"title\":\"" + title +
+                        "\",\"children\":" + RandomChildren(random, levels - 1) + "}");
+    }
+    return "[" + Joined(nodes) + "]";
+}
+
+bool IsSame(const rapidjson::Value& a, const rapidjson::Value& b)
+{
+    return std::strcmp(a["link"].GetString(), b["link"].GetString()) == 0 &&
+           std::strcmp(a["title"].GetString(), b["title"].GetString()) == 0;
+}
+
+/// The merge as one would explain it: every entry is searched for from the first to the last.
+void MergeChildren(rapidjson::Document& combined, rapidjson::Value& destination,
+                   const rapidjson::Value& source)
+{
+    if (source.IsNull())
+    {
+        return;
+    }
+    if (destination.IsNull())
+    {
+        destination.CopyFrom(source, combined.GetAllocator());
+        return;
+    }
+    for (const auto& entry : source.GetArray())
+    {
+        auto* found = destination.Begin();
+        while (found != destination.End() && !IsSame(*found, entry))
+        {
+            ++found;
+        }
+        if (found == destination.End())
+        {
+            destination.PushBack(rapidjson::Value(entry, combined.GetAllocator()), combined.GetAllocator());
+        }
+        else
+        {
+            MergeChildren(combined, (*found)["children"], entry["children"]);
+        }
+    }
+}
+
+} // namespace
+
+TEST(TocCombiner, MergesEntriesOfTheSameLinkAndTitle)
+{
+    const char* const trivial = R"({"link":"toc","title":"toc","children":null})";
+    const char* const simple =
+        "{\"link\":\"toc\",\"title\":\"toc\",\"children\":[\t{\"link\":\"null\",\"title\":"
+        "\"Classes\",\"children\":[\t\t{\"link\":\"A\",\"title\":\"A\",\"children\":null}\t]}]}";
+    const struct
+    {
+        std::vector<std::string> modules;
+        const char* combined;
+    } cases[] = {
+        {{}, "{}"},
+        {{trivial, simple},
+         R"({"link":"toc","title":"toc","children":[{"link":"null","title":"Classes","children":[{"link":"A","title":"A","children":null,"module":1}],"module":1}],"module":0})"},
+        {{trivial, simple,
+          R"({"link":"toc","title":"toc","children":[{"link":"null","title":"Classes","children":[{"link":"C","title":"C","children":null}]}]})"},
+         R"({"link":"toc","title":"toc","children":[{"link":"null","title":"Classes","children":[{"link":"A","title":"A","children":null,"module":1},{"link":"C","title":"C","children":null,"module":2}],"module":1}],"module":0})"},
+        {{R"({"more":{"children":[{}]},"children":[],"title":"t","link":"l"})", // the first root is taken
+                                                                                // over whole
+          R"({"link":"l","title":"t","less":1,"children":[{"link":"a","title":"a","children":null},{"link":"a","title":"a","x":1,"children":[{"link":"b","title":"b","children":null}]},{"link":"a","title":"A","children":[]}]})"},
+         R"({"more":{"children":[{}]},"children":[{"link":"a","title":"a","children":[{"link":"b","title":"b","children":null,"module":1}],"module":1},{"link":"a","title":"A","children":[],"module":1}],"title":"t","link":"l","module":0})"},
+        {{R"({"link":"l","title":"t","children":null})", // into a leaf, a list is copied as it is, twins and
+                                                         // all
+          R"({"link":"l","title":"t","children":[{"link":"a","title":"a","children":null},{"link":"a","title":"a","children":null}]})",
+          R"({"link":"l","title":"t","children":[{"link":"a","title":"a","children":[]},{"link":"b","title":"b","children":null}]})"},
+         R"({"link":"l","title":"t","children":[{"link":"a","title":"a","children":[],"module":1},{"link":"a","title":"a","children":null,"module":1},{"link":"b","title":"b","children":null,"module":2}],"module":0})"},
+        {{R"({"link":"l","title":"t","children":[]})", // other roots are dropped
+          R"({"link":"l","title":"T","children":[{"link":"a","title":"a","children":null}]})",
+          R"({"link":"t","title":"l","children":[{"link":"a","title":"a","children":null}]})",
+          R"({"link":"l","title":"t","children":null})"},
+         R"({"link":"l","title":"t","children":[],"module":0})"},
+        {{R"({"link":"l\u0000x","title":"t","children":[{"link":"a","title":"a\u0000y","children":[],"module":"old"}]})",
+          R"({"link":"l","title":"t\u0000z","children":[{"link":"a\u0000","title":"a","children":[{"link":"b","title":"b","children":null,"module":7}]}]})"},
+         R"({"link":"l\u0000x","title":"t","children":[{"link":"a","title":"a\u0000y","children":[{"link":"b","title":"b","children":null,"module":7,"module":1}],"module":"old","module":0}],"module":0})"},
+    };
+    for (const auto& c : cases)
+    {
+        EXPECT_EQ(c.combined, MergedModules<TocCombiner>(c.modules).Json());
+    }
+}
+
+TEST(TocCombiner, MergesAsALinearSearchWould)
+{
+    for (unsigned seed = 0; seed < 200; ++seed)
+    {
+        std::mt19937 random(seed);
+        std::vector<std::string> modules;
+        TocCombiner tagger; // owns the tags
+        rapidjson::Document expected =
+            ParsedJson(R"({"link":"toc","title":"toc","children":null,"module":0})");
+        for (int index = 0; index < 5; ++index)
+        {
+            modules.push_back(R"({"link":"toc","title":"toc","children":)" + RandomChildren(random, 4) + "}");
+            rapidjson::Document module = ParsedJson(modules.back());
+            tagger.AddModuleIndexToEachEntry(module, index);
+            MergeChildren(expected, expected["children"], module["children"]);
+        }
+        EXPECT_EQ(RapidJsonIoUtil::OutputJsonValueToString(expected),
+                  MergedModules<TocCombiner>(modules).Json())
+            << "seed " << seed;
+    }
+}
+
+TEST(TocCombiner, TreesAtTheDepthLimitPassThroughEveryStep)
+{
+    constexpr int kNodes = 5'000; // each an object and a list
+    std::string deep;
+    std::string ends;
+    for (int i = 0; i < kNodes; ++i)
+    {
+        deep += R"({"link":"l","title":"t","children":[)";
+        ends += "]}";
+    }
+    deep += ends;
+    // Into the second module's tree, which was copied into the leaf of the first, the third is merged.
+    MergedModules<TocCombiner> merged({R"({"link":"l","title":"t","children":null})", deep, deep});
+    EXPECT_TRUE(merged.Get().VerifyJSONStructure(merged.Get().combinedDocument));
+    EXPECT_EQ(deep.size() + kNodes * std::string(R"(,"module":0)").size(), merged.Json().size());
+    const auto text = merged.Get().RenderScript(merged.Get().combinedDocument);
+    EXPECT_NE(std::string::npos, TextOf(*text).find(R"(toc = {
+"link": "l","title": "t","children": [{"link": p1+"l","title": "t","children": [{"link": p1+)"));
+
+    // The pretty form without its blanks, which would be more than half a gigabyte.
+    RenderedText pretty;
+    rapidjson::PrettyWriter<RenderedText> writer(pretty);
+    writer.SetIndent(' ', 0);
+    EXPECT_TRUE(merged.Get().combinedDocument.Accept(writer));
+}

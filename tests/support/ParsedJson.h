@@ -1,0 +1,17 @@
+#pragma once
+
+#include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
+
+#include <stdexcept>
+#include <string>
+
+/// Returns the document of a JSON text, which a test holds to be valid.
+inline rapidjson::Document ParsedJson(const std::string& json)
+{
+    rapidjson::Document document;
+    if (!RapidJsonIoUtil::TryGetJsonDocFromString(json.c_str(), document))
+    {
+        throw std::runtime_error("not JSON: " + json);
+    }
+    return document;
+}

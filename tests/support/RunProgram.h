@@ -1,0 +1,23 @@
+#pragma once
+
+#include "tests/support/TemporaryFolder.h"
+
+#include <string>
+#include <vector>
+
+/// What a process left behind.
+struct ProgramResult
+{
+    int status; ///< exit status, or minus the number of the signal that ended it
+    std::string standardOutput;
+    std::string standardError;
+};
+
+/// Runs a program, found on the search path unless it has a slash, to its end.
+ProgramResult RunProgram(const std::string& program, const std::vector<std::string>& arguments);
+
+/// Runs the built pagemeld to its end, with @ in its arguments standing for the folder.
+///
+/// Returns its standard output, its standard error and a line that reads "status 0", with @ for the folder
+/// and PROGRAM for its own path.
+std::string ReportOfRun(const TemporaryFolder& folder, const std::vector<std::string>& arguments);

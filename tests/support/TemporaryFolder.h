@@ -1,0 +1,37 @@
+#pragma once
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <string>
+
+/// A new empty folder that is removed, with all that it holds, at the end of this object's life.
+class TemporaryFolder
+{
+public:
+    TemporaryFolder() : m_path(testing::TempDir() + "pagemeld-test-XXXXXX")
+    {
+        if (::mkdtemp(m_path.data()) == nullptr)
+        {
+            throw std::filesystem::filesystem_error("no temporary folder", m_path, {});
+        }
+    }
+
+    ~TemporaryFolder()
+    {
+        std::error_code ignored;
+        std::filesystem::remove_all(m_path, ignored);
+    }
+
+    TemporaryFolder(const TemporaryFolder&) = delete;
+    TemporaryFolder& operator=(const TemporaryFolder&) = delete;
+
+    [[nodiscard]] const std::string& Path() const { return m_path; }
+
+    /// Returns the path of something below the folder.
+    [[nodiscard]] std::string operator/(const std::string& name) const { return m_path + "/" + name; }
+
+private:
+    std::string m_path;
+};
