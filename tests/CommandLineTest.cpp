@@ -1,6 +1,4 @@
-#include "tests/support/ReplaceAll.h"
 #include "tests/support/RunProgram.h"
-#include "tests/support/TemporaryFolder.h"
 #include "tests/support/WholeFile.h"
 
 #include <gtest/gtest.h>
@@ -9,24 +7,6 @@
 
 namespace
 {
-
-void ExpectRun(const TemporaryFolder& folder, const std::vector<std::string>& arguments, int status,
-               const std::string& standardError)
-{
-    std::vector<std::string> fullArguments;
-    std::string shown;
-    for (const std::string& argument : arguments)
-    {
-        fullArguments.push_back(ReplaceAll(argument, "@", folder.Path()));
-        shown += " " + argument;
-    }
-    const ProgramResult result = RunPagemeld(fullArguments);
-    EXPECT_EQ(status, result.status) << "arguments:" << shown;
-    EXPECT_EQ("", result.standardOutput) << "arguments:" << shown;
-    EXPECT_EQ(standardError,
-              ReplaceAll(ReplaceAll(result.standardError, folder.Path(), "@"), PAGEMELD_PROGRAM, "PROGRAM"))
-        << "arguments:" << shown;
-}
 
 /// What a run over module roots reports that hold nothing.
 std::string NothingToRead(const std::vector<std::string>& roots)
@@ -40,7 +20,7 @@ std::string NothingToRead(const std::vector<std::string>& roots)
                      "/" + set + "/docdata/index.json\n";
         }
     }
-    return error;
+    return error + "status 0\n";
 }
 
 } // namespace
@@ -50,39 +30,36 @@ TEST(CommandLine, FirstArgumentAloneSelectsTheMode)
     const struct
     {
         std::vector<std::string> arguments;
-        int status;
-        std::string error;
+        std::string report;
     } cases[] = {
         {{},
-         255,
          "executing Pagemeld\nERROR: ./Tools/DocTools/VantorPagemeld/Main:173 Usage: PROGRAM <path1> <path2> "
-         "...\n or PROGRAM -autopaths <rootdir>\n"},
+         "...\n or PROGRAM -autopaths <rootdir>\nstatus 255\n"},
         {{"-autopaths"}, // the same text, but no failure: wanted
-         0,
          "executing Pagemeld\nERROR: ./Tools/DocTools/VantorPagemeld/Main:212 Usage: PROGRAM <path1> <path2> "
-         "...\n or PROGRAM -autopaths <rootdir>\n"},
+         "...\n or PROGRAM -autopaths <rootdir>\nstatus 0\n"},
         {{"-verify"},
-         255,
          "executing Pagemeld\nERROR: ./Tools/DocTools/VantorPagemeld/Main:192 Usage: PROGRAM -verify "
-         "<rootDocPath>\n"},
-        {{"-autopaths", "@/none", "ignored"}, 0, "executing Pagemeld\n"},
-        {{"@/a", "-verify", "@/b/"}, 0, NothingToRead({"@/a", "-verify", "@/b/"})},
-        {{"--help"}, 0, NothingToRead({"--help"})},
-        {{"-Verify"}, 0, NothingToRead({"-Verify"})},
-        {{""}, 0, NothingToRead({""})},
-        {{"@\\a"}, 0, NothingToRead({"@\\a"})}, // only the root of -autopaths has its backslashes converted
+         "<rootDocPath>\nstatus 255\n"},
+        {{"-autopaths", "@/none", "ignored"}, "executing Pagemeld\nstatus 0\n"},
+        {{"@/a", "-verify", "@/b/"}, NothingToRead({"@/a", "-verify", "@/b/"})},
+        {{"--help"}, NothingToRead({"--help"})},
+        {{"-Verify"}, NothingToRead({"-Verify"})},
+        {{""}, NothingToRead({""})},
+        {{"@\\a"}, NothingToRead({"@\\a"})}, // not converted in this form
     };
     const TemporaryFolder folder;
     for (const auto& c : cases)
     {
-        ExpectRun(folder, c.arguments, c.status, c.error);
+        EXPECT_EQ(c.report, ReportOfRun(folder, c.arguments));
     }
     EXPECT_TRUE(ReadTree(folder.Path()).empty());
 }
 
 TEST(CommandLine, SelfTestModeWritesNothingToStandardError)
 {
-    const ProgramResult result = RunPagemeld({"-runNativeTests", "no test has this name", "ignored"});
+    const ProgramResult result =
+        RunProgram(PAGEMELD_PROGRAM, {"-runNativeTests", "no test has this name", "ignored"});
     EXPECT_EQ(0, result.status);
     EXPECT_EQ("", result.standardError);
 }
@@ -101,24 +78,21 @@ TEST(CommandLine, VerificationStopsAtTheFirstFileThatFails)
     const struct
     {
         const char* contents[4]; ///< of the four files in their order; null for one that is missing
-        int status;
-        std::string error;
+        std::string report;
     } cases[] = {
         {{"[]", "7", " null\n", "\"x\""}, // any JSON will do
-         0,
          "Verifying " + manualToc + "Verifying " + manualIndex + "Verifying " + scriptToc + "Verifying " +
-             scriptIndex + passed},
+             scriptIndex + passed + "status 0\n"},
         {{nullptr, nullptr, nullptr, nullptr},
-         0,
          "Skipping " + manualToc + "Skipping " + manualIndex + "Skipping " + scriptToc + "Skipping " +
-             scriptIndex + passed},
+             scriptIndex + passed + "status 0\n"},
         {{"{\"a\":}", "{}", "{}", "{}"},
-         255,
-         "Verifying " + manualToc + noJson + "@/en/Manual/docdata/toc.json, error at offset: 5\n" + failed},
+         "Verifying " + manualToc + noJson + "@/en/Manual/docdata/toc.json, error at offset: 5\n" + failed +
+             "status 255\n"},
         {{nullptr, nullptr, "{}", "{\"a\":1"},
-         255,
          "Skipping " + manualToc + "Skipping " + manualIndex + "Verifying " + scriptToc + "Verifying " +
-             scriptIndex + noJson + "@/en/ScriptReference/docdata/index.json, error at offset: 6\n" + failed},
+             scriptIndex + noJson + "@/en/ScriptReference/docdata/index.json, error at offset: 6\n" + failed +
+             "status 255\n"},
     };
     const char* names[] = {"/en/Manual/docdata/toc.json", "/en/Manual/docdata/index.json",
                            "/en/ScriptReference/docdata/toc.json", "/en/ScriptReference/docdata/index.json"};
@@ -132,6 +106,6 @@ TEST(CommandLine, VerificationStopsAtTheFirstFileThatFails)
                 WriteWholeFile(folder.Path() + names[i], c.contents[i]);
             }
         }
-        ExpectRun(folder, {"-verify", "@", "ignored"}, c.status, start + c.error);
+        EXPECT_EQ(start + c.report, ReportOfRun(folder, {"-verify", "@", "ignored"}));
     }
 }

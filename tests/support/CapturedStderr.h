@@ -1,25 +1,26 @@
 #pragma once
 
-#include "Tools/DocTools/VantorPagemeld/Output/ScopedFile.h"
+#include <gtest/gtest.h>
 
 #include <string>
+#include <utility>
 
-/// Takes what is written to standard error from its construction until it is asked for the text, or dies.
+/// Takes what is written to standard error, until it is asked for the text or dies.
 class CapturedStderr
 {
 public:
-    CapturedStderr();
-    ~CapturedStderr();
+    CapturedStderr() { testing::internal::CaptureStderr(); }
+    ~CapturedStderr() { (void)Text(); }
 
     CapturedStderr(const CapturedStderr&) = delete;
     CapturedStderr& operator=(const CapturedStderr&) = delete;
 
-    /// Ends the capture, and returns all that was written. To be called once.
-    std::string Text();
+    /// Ends the capture, and returns all that was written; nothing the second time.
+    std::string Text()
+    {
+        return std::exchange(m_isCapturing, false) ? testing::internal::GetCapturedStderr() : "";
+    }
 
 private:
-    void Restore();
-
-    ScopedFile m_taken;
-    int m_standardError;
+    bool m_isCapturing = true;
 };

@@ -2,17 +2,20 @@
 
 #include "Tools/DocTools/VantorPagemeld/Output/ScopedFile.h"
 
-#include <cstddef>
+#include <algorithm>
 #include <string>
 
-/// A stream whose device takes so many bytes and is full then: writes beyond fail, as on a full disk.
+/// An unbuffered stream whose device takes so many bytes and is full then: writes beyond fail.
 class FullDevice
 {
 public:
-    explicit FullDevice(std::size_t capacity);
-
-    FullDevice(const FullDevice&) = delete;
-    FullDevice& operator=(const FullDevice&) = delete;
+    explicit FullDevice(std::size_t capacity) : m_capacity(capacity)
+    {
+        cookie_io_functions_t functions = {};
+        functions.write = &FullDevice::Write;
+        m_stream.reset(::fopencookie(this, "w", functions));
+        (void)std::setvbuf(m_stream.get(), nullptr, _IONBF, 0);
+    }
 
     [[nodiscard]] std::FILE* Stream() const { return m_stream.get(); }
 
@@ -20,9 +23,15 @@ public:
     [[nodiscard]] const std::string& Arrived() const { return m_arrived; }
 
 private:
-    static ssize_t Write(void* device, const char* bytes, std::size_t count);
+    static ssize_t Write(void* device, const char* bytes, std::size_t count)
+    {
+        auto& self = *static_cast<FullDevice*>(device);
+        const std::size_t taken = std::min(count, self.m_capacity - self.m_arrived.size());
+        self.m_arrived.append(bytes, taken);
+        return static_cast<ssize_t>(taken);
+    }
 
     std::size_t m_capacity;
     std::string m_arrived;
-    ScopedFile m_stream; // its end writes to m_arrived
+    ScopedFile m_stream; // its end may write to m_arrived
 };

@@ -1,6 +1,6 @@
 #include "tests/support/RunProgram.h"
 
-#include "tests/support/TemporaryFolder.h"
+#include "tests/support/ReplaceAll.h"
 #include "tests/support/WholeFile.h"
 
 #include <stdexcept>
@@ -40,7 +40,15 @@ ProgramResult RunProgram(const std::string& program, const std::vector<std::stri
             ReadWholeFile(error)};
 }
 
-ProgramResult RunPagemeld(const std::vector<std::string>& arguments)
+std::string ReportOfRun(const TemporaryFolder& folder, const std::vector<std::string>& arguments)
 {
-    return RunProgram(PAGEMELD_PROGRAM, arguments);
+    std::vector<std::string> fullArguments;
+    for (const std::string& argument : arguments)
+    {
+        fullArguments.push_back(ReplaceAll(argument, "@", folder.Path()));
+    }
+    const ProgramResult result = RunProgram(PAGEMELD_PROGRAM, fullArguments);
+    const std::string report =
+        result.standardOutput + result.standardError + "status " + std::to_string(result.status) + "\n";
+    return ReplaceAll(ReplaceAll(report, folder.Path(), "@"), PAGEMELD_PROGRAM, "PROGRAM");
 }

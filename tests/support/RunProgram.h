@@ -1,5 +1,7 @@
 #pragma once
 
+#include "tests/support/TemporaryFolder.h"
+
 #include <string>
 #include <vector>
 
@@ -14,5 +16,8 @@ struct ProgramResult
 /// Runs a program, found on the search path unless it has a slash, to its end.
 ProgramResult RunProgram(const std::string& program, const std::vector<std::string>& arguments);
 
-/// Runs the built pagemeld to its end.
-ProgramResult RunPagemeld(const std::vector<std::string>& arguments);
+/// Runs the built pagemeld to its end, with @ in its arguments standing for the folder.
+///
+/// Returns its standard output, its standard error and a line that reads "status 0", with @ for the folder
+/// and PROGRAM for its own path.
+std::string ReportOfRun(const TemporaryFolder& folder, const std::vector<std::string>& arguments);

@@ -1,13 +1,28 @@
 #pragma once
 
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <filesystem>
 #include <string>
 
 /// A new empty folder that is removed, with all that it holds, at the end of this object's life.
 class TemporaryFolder
 {
 public:
-    TemporaryFolder();
-    ~TemporaryFolder();
+    TemporaryFolder() : m_path(testing::TempDir() + "pagemeld-test-XXXXXX")
+    {
+        if (::mkdtemp(m_path.data()) == nullptr)
+        {
+            throw std::filesystem::filesystem_error("no temporary folder", m_path, {});
+        }
+    }
+
+    ~TemporaryFolder()
+    {
+        std::error_code ignored;
+        std::filesystem::remove_all(m_path, ignored);
+    }
 
     TemporaryFolder(const TemporaryFolder&) = delete;
     TemporaryFolder& operator=(const TemporaryFolder&) = delete;

@@ -85,8 +85,8 @@ rapidjson::ParseResult ParseJson(const char* text, rapidjson::Document& document
         return !reader.Parse(stream, builder).IsError();
     };
 
-    // A failed parse would leave the old value in place.
-    document.SetNull();
+    // A failed parse would leave an old value in place, and a good one an old error.
+    document.Parse("null");
     document.Populate(readText);
     if (!reader.HasParseError())
     {

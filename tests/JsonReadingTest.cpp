@@ -1,0 +1,161 @@
+#include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
+#include "tests/support/CapturedStderr.h"
+#include "tests/support/ParsedJson.h"
+#include "tests/support/ReplaceAll.h"
+#include "tests/support/TemporaryFolder.h"
+#include "tests/support/WholeFile.h"
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <fstream>
+
+#include <sys/stat.h>
+
+namespace
+{
+
+const std::string kTag = "./Tools/DocTools/VantorPagemeld/RapidJsonIoUtil:";
+
+std::string Repeated(const std::string& text, int count)
+{
+    std::string all;
+    for (int i = 0; i < count; ++i)
+    {
+        all += text;
+    }
+    return all;
+}
+
+/// Reads a file into a document, and returns what was reported, with @ for the path; "read" when it was
+/// accepted.
+std::string Read(const std::string& path, rapidjson::Document& document)
+{
+    CapturedStderr captured;
+    const bool wasRead = RapidJsonIoUtil::TryGetJsonDocFromFile(path.c_str(), document);
+    return (wasRead ? "read" : "") + ReplaceAll(captured.Text(), path, "@");
+}
+
+std::string ParseError(int offset)
+{
+    return "ERROR: " + kTag + "71 Failed to parse JSON file @, error at offset: " + std::to_string(offset) +
+           "\n";
+}
+
+} // namespace
+
+TEST(JsonReading, AcceptsOneRootOrNamesTheOffset)
+{
+    const struct
+    {
+        std::string text;
+        std::string report;
+    } cases[] = {
+        {"null", "read"},
+        {" \t\r\n7 \t\r\n", "read"},
+        {"\"x\"", "read"},
+        {"", ParseError(0)},
+        {" \n ", ParseError(3)},
+        {"[1] 2", ParseError(4)},
+        {"[1,]", ParseError(3)},
+        {"// no comments\n1", ParseError(0)},
+        {"[NaN]", ParseError(1)},
+        {"\xEF\xBB\xBF{}", ParseError(0)},
+        {std::string("[1]\0]", 5), "read"}, // what stands behind a NUL is not seen
+        {std::string("[1\0]", 4), ParseError(2)},
+        {"[\"\x1A\"]", ParseError(2)},
+        {"[\"\x1F\"]", ParseError(2)},
+        {"[1.7976931348623157e308,1e-400,18446744073709551616]", "read"},
+        {"[12, 1.8e308]", ParseError(5)}, // becomes an infinity
+        {"[12, -1e309, 1]", ParseError(5)},
+        {Repeated("[", 10'000) + Repeated("]", 10'000), "read"},
+        {Repeated("[", 10'001) + Repeated("]", 10'001), ParseError(10'001)},
+        {Repeated("{\"a\":", 10'000) + "1" + Repeated("}", 10'000), "read"},
+        {Repeated("{\"a\":", 10'001) + "1" + Repeated("}", 10'001), ParseError(50'001)},
+        {Repeated("[{\"a\":", 5'000) + "[" + Repeated("}]", 5'000), ParseError(30'001)},
+        {"[" + Repeated("[[{}]],", 10'000) + "1]", "read"}, // many, but not inside one another
+    };
+    const TemporaryFolder folder;
+    for (const auto& c : cases)
+    {
+        WriteWholeFile(folder / "file", c.text);
+        rapidjson::Document document;
+        EXPECT_EQ(c.report, Read(folder / "file", document)) << c.text.substr(0, 80);
+        EXPECT_EQ(c.report == "read", RapidJsonIoUtil::TryGetJsonDocFromString(c.text.c_str(), document))
+            << c.text.substr(0, 80);
+    }
+}
+
+TEST(JsonReading, WarnsOfWhatHasNoTextToRead)
+{
+    const TemporaryFolder folder;
+    std::filesystem::create_directory(folder / "folder");
+    ASSERT_EQ(0, ::mkfifo((folder / "pipe").c_str(), 0600));
+    std::ofstream(folder / "huge").put(' ');
+    std::filesystem::resize_file(folder / "huge", (std::uintmax_t(1) << 32) + 5);
+
+    const std::string unread = "WARNING: " + kTag + "60 Unable to read entire file @, requested ";
+    rapidjson::Document document = ParsedJson("[1]");
+    EXPECT_EQ("WARNING: " + kTag + "47 Unable to read @\n", Read(folder / "missing", document));
+    EXPECT_EQ(unread + "-1, got 0 bytes\n", Read(folder / "pipe", document));
+    EXPECT_EQ(unread + "5, got 0 bytes\n", Read(folder / "huge", document)); // in 32 bits
+    const std::string ofFolder = Read(folder / "folder", document); // the size is the file system's whim
+    EXPECT_EQ(unread, ofFolder.substr(0, unread.size()));
+    EXPECT_NE(std::string::npos, ofFolder.find(", got 0 bytes\n"));
+    EXPECT_EQ("[1]", RapidJsonIoUtil::OutputJsonValueToString(document))
+        << "an unread file leaves the document alone";
+}
+
+TEST(JsonReading, DocumentTellsTheOutcomeOfTheLastParse)
+{
+    rapidjson::Document document = ParsedJson("{\"old\":[1,\"text that is not short\"]}");
+    EXPECT_FALSE(RapidJsonIoUtil::TryGetJsonDocFromString("[[1,2,\"x\"], oops", document));
+    EXPECT_TRUE(document.IsNull());
+    EXPECT_TRUE(document.HasParseError());
+    EXPECT_EQ(12U, document.GetErrorOffset());
+    EXPECT_TRUE(RapidJsonIoUtil::TryGetJsonDocFromString("[2]", document));
+    EXPECT_FALSE(document.HasParseError());
+    EXPECT_EQ("[2]", RapidJsonIoUtil::OutputJsonValueToString(document));
+}
+
+TEST(JsonReading, EveryTruncationIsAParseError)
+{
+    const std::string texts[] = {
+        R"({"pages":[["a.html","\u00c4 \"A\""],["b","B"]],"info":[["t",0],["u",1]],"common":{"a":1},"searchIndex":{"a":[0,1]}})",
+        R"({"link":"toc","title":"t","children":[{"link":"null","title":"G","children":[{"link":"a","title":"\\","children":null}]}]})",
+    };
+    const TemporaryFolder folder;
+    rapidjson::Document document;
+    for (const std::string& text : texts)
+    {
+        for (std::size_t length = 0; length < text.size(); ++length)
+        {
+            WriteWholeFile(folder / "file", text.substr(0, length));
+            const std::string report = Read(folder / "file", document);
+            EXPECT_EQ(0U, report.find("ERROR: " + kTag + "71 Failed to parse JSON file @, error at offset: "))
+                << text.substr(0, length) << report;
+        }
+        EXPECT_TRUE(RapidJsonIoUtil::TryGetJsonDocFromString(text.c_str(), document));
+    }
+}
+
+TEST(JsonReading, PublicSuiteHasTheExpectedOutcomes)
+{
+    const char* const ownPlace = std::getenv("PAGEMELD_JSON_SUITE");
+    const std::string suite = ownPlace != nullptr ? ownPlace : PAGEMELD_JSON_SUITE;
+    std::ifstream expected(suite + "/expected.tsv");
+    if (!expected)
+    {
+        GTEST_SKIP() << "no suite in " << suite;
+    }
+    int count = 0;
+    std::string outcome;
+    int offset = 0;
+    for (std::string name; expected >> name >> outcome >> offset; ++count)
+    {
+        rapidjson::Document document;
+        EXPECT_EQ(outcome == "accept" ? "read" : ParseError(offset), Read(suite + "/" + name, document))
+            << name;
+    }
+    EXPECT_EQ(318, count);
+}
