@@ -9,7 +9,6 @@
 
 #include <cstdint>
 #include <memory>
-#include <new>
 
 #include <fcntl.h>
 #include <unistd.h>
@@ -61,15 +60,12 @@ FileText ReadWhole(std::FILE* file, const char* path)
     if (size >= 0 && size <= kMaxFileSize)
     {
         const auto bytesWanted = static_cast<std::size_t>(size);
-        FileText text(new (std::nothrow) char[bytesWanted + 1]);
-        if (text != nullptr)
+        FileText text(new char[bytesWanted + 1]);
+        bytesRead = std::fread(text.get(), 1, bytesWanted, file);
+        if (bytesRead == bytesWanted && std::ferror(file) == 0)
         {
-            bytesRead = std::fread(text.get(), 1, bytesWanted, file);
-            if (bytesRead == bytesWanted && std::ferror(file) == 0)
-            {
-                text[bytesRead] = '\0';
-                return text;
-            }
+            text[bytesRead] = '\0';
+            return text;
         }
     }
     kDiagnostics.Warning(60, "Unable to read entire file %s, requested %d, got %d bytes\n", path,
