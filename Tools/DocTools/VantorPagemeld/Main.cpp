@@ -1,4 +1,5 @@
 #include "Runtime/Testing/RunNativeTests.h"
+#include "Runtime/Utilities/CommandLine.h"
 #include "Tools/DocTools/VantorPagemeld/DocumentationSet.h"
 #include "Tools/DocTools/VantorPagemeld/ModuleDiscovery.h"
 #include "Tools/DocTools/VantorPagemeld/Output/Diagnostics.h"
@@ -65,6 +66,7 @@ int main(int argc, char* argv[])
 
     if (mode == "-runNativeTests")
     {
+        SetCommandLine(argc, argv); // the self-tests look for switches in all of it
         (void)RunNativeTests(argument == nullptr ? "" : argument);
         return kSuccess;
     }

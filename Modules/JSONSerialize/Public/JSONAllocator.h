@@ -1,0 +1,22 @@
+#pragma once
+
+#include "Runtime/Allocator/LabelledAllocation.h"
+
+/// Gives the JSON library's values the runtime's labelled memory. Every value frees its own.
+class JSONAllocator
+{
+public:
+    static constexpr bool kNeedFree = true;
+
+    void* Malloc(std::size_t size) { return AllocateLabelled(MemoryLabel::Json, size); }
+
+    void* Realloc(void* memory, std::size_t /*oldSize*/, std::size_t newSize)
+    {
+        return ReallocateLabelled(MemoryLabel::Json, memory, newSize);
+    }
+
+    static void Free(void* memory) { FreeLabelled(MemoryLabel::Json, memory); }
+
+    bool operator==(const JSONAllocator& /*other*/) const { return true; }
+    bool operator!=(const JSONAllocator& /*other*/) const { return false; }
+};

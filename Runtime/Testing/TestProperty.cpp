@@ -1,0 +1,15 @@
+#include "Runtime/Testing/TestProperty.h"
+
+#include "Runtime/Testing/MemoryOutStream.h"
+
+namespace UnitTest
+{
+
+core::string TestProperty::AsString() const
+{
+    MemoryOutStream stream;
+    std::visit([&stream](const auto& value) { stream << value; }, m_value);
+    return stream.GetText();
+}
+
+} // namespace UnitTest

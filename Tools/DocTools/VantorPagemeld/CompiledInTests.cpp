@@ -1,0 +1,10 @@
+#include "Runtime/Testing/UnitTestMacros.h"
+
+// The self-tests of the program, in the order in which they run.
+
+REGISTER_UNIT_TEST(IndexCombiner, TryGetJsonDocFromString_ValidString_ReturnsTrue)
+REGISTER_UNIT_TEST(IndexCombiner, AppendJsonDocument_OneValueJson_ProducesThatJson)
+REGISTER_UNIT_TEST(IndexCombiner, AppendJsonDocument_TwoValidJsons_ProducesCombinedJson)
+REGISTER_UNIT_TEST(TocCombiner, TryGetJsonDocFromString_ValidString_ReturnsTrue)
+REGISTER_UNIT_TEST(TocCombiner, AppendJsonDocument_OneValueJson_ProducesThatJson)
+REGISTER_UNIT_TEST(TocCombiner, AppendJsonDocument_TrivialAndSimpleJson_ProducesSimpleJson)
