@@ -63,7 +63,7 @@ void ExpectWholeOrRemoved(JsonCombiner& combiner, const std::string& script)
     const std::string path = folder / "script";
     std::filesystem::create_symlink("/dev/full", path);
     EXPECT_FALSE(WriteScriptFile(combiner, path)) << "its bytes wait in a buffer until it is flushed";
-    EXPECT_FALSE(std::filesystem::is_symlink(path));
+    ASSERT_FALSE(std::filesystem::is_symlink(path)) << "a failed file is removed";
     EXPECT_TRUE(WriteScriptFile(combiner, path));
     EXPECT_EQ(script, ReadWholeFile(path));
 }
@@ -78,6 +78,8 @@ void ExpectEachFailedWriteToCount(Combiner& combiner, const RenderedText& text, 
         EXPECT_EQ(bytes == script.size(), combiner.WriteScript("/r/A/Manual", text, device.Stream()))
             << bytes;
         EXPECT_EQ(script.substr(0, bytes), device.Arrived());
+        FullDevice deviceOfPrefixes(bytes);
+        EXPECT_EQ(bytes >= 41, combiner.OutputPrefixVars("/r/A/Manual", deviceOfPrefixes.Stream())) << bytes;
     }
 }
 

@@ -50,5 +50,5 @@ std::string ReportOfRun(const TemporaryFolder& folder, const std::vector<std::st
     const ProgramResult result = RunProgram(PAGEMELD_PROGRAM, fullArguments);
     const std::string report =
         result.standardOutput + result.standardError + "status " + std::to_string(result.status) + "\n";
-    return ReplaceAll(ReplaceAll(report, folder.Path(), "@"), PAGEMELD_PROGRAM, "PROGRAM");
+    return ReplaceAll(Neutral(report, folder), PAGEMELD_PROGRAM, "PROGRAM");
 }

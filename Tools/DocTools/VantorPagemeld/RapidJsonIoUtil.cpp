@@ -11,6 +11,7 @@
 #include <memory>
 
 #include <fcntl.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 namespace
@@ -40,10 +41,13 @@ ScopedFile OpenForReading(const char* path)
     return file;
 }
 
-/// Returns the size in bytes, or -1 for what has none, such as a pipe. Leaves the stream at its start.
+/// Returns the size in bytes, or -1 for what has none: a folder, whatever its file system says, or a pipe.
+/// Leaves the stream at its start.
 long SizeOf(std::FILE* file)
 {
-    if (std::fseek(file, 0, SEEK_END) != 0)
+    struct stat status = {};
+    if (::fstat(::fileno(file), &status) != 0 || S_ISDIR(status.st_mode) ||
+        std::fseek(file, 0, SEEK_END) != 0)
     {
         return -1;
     }
@@ -62,7 +66,7 @@ FileText ReadWhole(std::FILE* file, const char* path)
         const auto bytesWanted = static_cast<std::size_t>(size);
         FileText text(new char[bytesWanted + 1]);
         bytesRead = std::fread(text.get(), 1, bytesWanted, file);
-        if (bytesRead == bytesWanted && std::ferror(file) == 0)
+        if (bytesRead == bytesWanted)
         {
             text[bytesRead] = '\0';
             return text;

@@ -61,10 +61,9 @@ void AppendLink(RenderedText& script, const rapidjson::Value& node, const TocScr
     AppendLineBreak(script, layout);
 }
 
-void AppendChildren(RenderedText& script, const rapidjson::Value& node, int indent,
+void AppendChildren(RenderedText& script, const rapidjson::Value& children, int indent,
                     const TocScriptLayout& layout)
 {
-    const rapidjson::Value& children = node["children"];
     if (children.IsNull())
     {
         AppendText(script, "null");
@@ -80,7 +79,10 @@ void AppendChildren(RenderedText& script, const rapidjson::Value& node, int inde
     AppendLineBreak(script, layout);
 }
 
-void AppendNode(RenderedText& script, const rapidjson::Value& node, int indent, const TocScriptLayout& layout)
+/// Appends a node up to its children. Never inlined: its many locals would stand in the stack frame of the
+/// recursion, and a table of contents may be thousands of levels deep.
+[[gnu::noinline]] void AppendNodeStart(RenderedText& script, const rapidjson::Value& node, int indent,
+                                       const TocScriptLayout& layout)
 {
     AppendIndent(script, indent, layout);
     AppendText(script, "{");
@@ -90,7 +92,12 @@ void AppendNode(RenderedText& script, const rapidjson::Value& node, int indent, 
     AppendTocString(script, "title", ": ", indent + 1, false, layout);
     AppendTocString(script, CStringOf(node["title"]), ",", 0, layout.lineBreaks, layout);
     AppendTocString(script, "children", ": ", indent + 1, false, layout);
-    AppendChildren(script, node, indent, layout);
+}
+
+void AppendNode(RenderedText& script, const rapidjson::Value& node, int indent, const TocScriptLayout& layout)
+{
+    AppendNodeStart(script, node, indent, layout);
+    AppendChildren(script, node["children"], indent, layout);
     AppendIndent(script, indent, layout);
     AppendText(script, "}");
     AppendLineBreak(script, layout);
