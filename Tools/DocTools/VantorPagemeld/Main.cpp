@@ -3,6 +3,7 @@
 #include "Tools/DocTools/VantorPagemeld/DocumentationSet.h"
 #include "Tools/DocTools/VantorPagemeld/ModuleDiscovery.h"
 #include "Tools/DocTools/VantorPagemeld/Output/Diagnostics.h"
+#include "Tools/DocTools/VantorPagemeld/Output/StandardStreams.h"
 #include "Tools/DocTools/VantorPagemeld/Verification.h"
 
 #include <algorithm>
@@ -58,6 +59,7 @@ int RunDiscoveryAndCombining(std::string rootDirectory)
 /// Chooses the run mode by the first argument alone, and turns its outcome into the exit status.
 int main(int argc, char* argv[])
 {
+    SecureStandardStreams();
     const char* const program = argc > 0 ? argv[0] : "";
     const std::string_view mode = argc > 1 ? argv[1] : "";
     const char* const argument = argc > 2 ? argv[2] : nullptr;

@@ -8,7 +8,6 @@
 #include <rapidjson/writer.h>
 
 #include <cstdint>
-#include <cstdlib>
 #include <memory>
 
 #include <fcntl.h>
@@ -23,11 +22,7 @@ constexpr Diagnostics kDiagnostics("./Tools/DocTools/VantorPagemeld/RapidJsonIoU
 /// The parser counts in 32 bits.
 constexpr long kMaxFileSize = UINT32_MAX;
 
-struct FreeDeleter
-{
-    void operator()(void* memory) const { std::free(memory); }
-};
-using FileText = std::unique_ptr<char, FreeDeleter>;
+using FileText = std::unique_ptr<char[]>;
 
 /// Opens for reading without waiting: a named pipe that nobody writes to would otherwise hold up the build
 /// for ever.
@@ -69,15 +64,12 @@ FileText ReadWhole(std::FILE* file, const char* path)
     if (size >= 0 && size <= kMaxFileSize)
     {
         const auto bytesWanted = static_cast<std::size_t>(size);
-        FileText text(static_cast<char*>(std::malloc(bytesWanted + 1)));
-        if (text != nullptr)
+        FileText text(new char[bytesWanted + 1]);
+        bytesRead = std::fread(text.get(), 1, bytesWanted, file);
+        if (bytesRead == bytesWanted)
         {
-            bytesRead = std::fread(text.get(), 1, bytesWanted, file);
-            if (bytesRead == bytesWanted)
-            {
-                text.get()[bytesRead] = '\0';
-                return text;
-            }
+            text[bytesRead] = '\0';
+            return text;
         }
     }
     kDiagnostics.Warning(60, "Unable to read entire file %s, requested %d, got %d bytes\n", path,

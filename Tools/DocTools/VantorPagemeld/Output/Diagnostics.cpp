@@ -7,7 +7,8 @@
 namespace
 {
 
-void Report(const char* level, const char* sourceFile, int number, const char* format, std::va_list arguments)
+__attribute__((format(printf, 4, 0))) void Report(const char* level, const char* sourceFile, int number,
+                                                  const char* format, std::va_list arguments)
 {
     std::fprintf(stderr, "%s: %s:%d ", level, sourceFile, number);
     std::vfprintf(stderr, format, arguments);

@@ -1,0 +1,148 @@
+#include "tests/support/ExampleDocs.h"
+#include "tests/support/RunProgram.h"
+#include "tests/support/WholeFile.h"
+
+#include <gtest/gtest.h>
+
+#include <csignal>
+#include <cstring>
+#include <filesystem>
+#include <regex>
+
+#include <unistd.h>
+
+namespace
+{
+
+namespace fs = std::filesystem;
+
+/// A command that runs another one with its streams redirected.
+std::vector<std::string> WithStreams(const std::string& redirections)
+{
+    return {"sh", "-c", "exec \"$0\" \"$@\" " + redirections};
+}
+
+} // namespace
+
+TEST(Environment, OutputsNeverTakeTheDescriptorsOfMessages)
+{
+    const ExampleDocs docs;
+    for (const char* redirections : {"2>&-", ">&-", "<&-", ">&- 2>&-", "<&- >&- 2>&-", "2>/dev/full"})
+    {
+        std::vector<std::string> command = {
+            "strace", "-E", "ASAN_OPTIONS=detect_leaks=0", "-o", docs / "trace", "-e", "trace=openat"};
+        const std::vector<std::string> shell = WithStreams(redirections);
+        command.insert(command.end(), shell.begin(), shell.end());
+        EXPECT_EQ(0, docs.Run(command).status) << redirections;
+        EXPECT_EQ("NNNN NNNN", docs.Describe()) << redirections;
+        const std::string trace = ReadWholeFile(docs / "trace");
+        EXPECT_TRUE(std::regex_search(trace, std::regex("global_toc.js.tmp.* = [0-9]+\n"))) << trace;
+        EXPECT_FALSE(std::regex_search(trace, std::regex("global_.* = [012]\n"))) << redirections << trace;
+        docs.Restore();
+    }
+}
+
+TEST(Environment, StandardErrorThatNobodyReadsCostsNoOutput)
+{
+    const ExampleDocs docs;
+    int ends[2] = {};
+    ASSERT_EQ(0, ::pipe(ends));
+    ::close(ends[0]);
+    ASSERT_EQ(9, ::dup2(ends[1], 9));
+    EXPECT_EQ(0, docs.Run(WithStreams("2>&9")).status);
+    EXPECT_EQ("NNNN NNNN", docs.Describe());
+    ::close(9);
+    ::close(ends[1]);
+}
+
+TEST(Environment, WantOfMemoryEndsTheRunBeforeItsFirstOutput)
+{
+#ifdef __SANITIZE_ADDRESS__
+    GTEST_SKIP() << "the sanitizer reserves more than any limit";
+#endif
+    const ExampleDocs docs;
+    const std::string input = docs / "b/Manual/docdata/index.json";
+    std::string ignored = "\"ignored\":[0";
+    for (int i = 0; i < 500'000; ++i)
+    {
+        ignored += ",0";
+    }
+    WriteWholeFile(input, ReadWholeFile(input).insert(1, ignored + "],"));
+
+    int ended = 0;
+    for (int megabytes = 6;; ++megabytes)
+    {
+        ASSERT_LT(megabytes, 100);
+        const int status = docs.Run({"prlimit", "--as=" + std::to_string(megabytes << 20)}).status;
+        if (status == 0)
+        {
+            break;
+        }
+        EXPECT_TRUE(status == -SIGABRT || status == 127) << status; // 127 is the loader's
+        EXPECT_EQ("OOOO OOOO", docs.Describe()) << megabytes;
+        ended += status == -SIGABRT ? 1 : 0;
+    }
+    EXPECT_GT(ended, 5);
+    EXPECT_EQ("NNNN NNNN", docs.Describe());
+}
+
+TEST(Environment, SymbolicLinksAreFollowedButForOutputs)
+{
+    const struct
+    {
+        const char* link;
+        const char* elsewhere; ///< what a linked output holds afterwards
+    } cases[] = {
+        {"a", nullptr},
+        {"a/Manual", nullptr},
+        {"a/Manual/docdata", nullptr},
+        {"a/Manual/docdata/index.json", nullptr},
+        {"a/Manual/docdata/global_index.json", "the earlier output"},
+        {"a/Manual/docdata/global_toc.js", "the earlier output"},
+        // What stands at a temporary name is opened as it is.
+        {"a/Manual/docdata/global_toc.js.tmp", "var p0"},
+    };
+    for (const auto& c : cases)
+    {
+        const ExampleDocs docs;
+        WriteWholeFile(docs / "a/Manual/docdata/global_toc.js.tmp", "stale");
+        fs::rename(docs / c.link, docs / "elsewhere");
+        fs::create_symlink(docs / "elsewhere", docs / c.link);
+        EXPECT_EQ(0, docs.Run().status) << c.link;
+        EXPECT_EQ("NNNN NNNN", docs.Describe()) << c.link;
+        if (c.elsewhere != nullptr)
+        {
+            const std::string bytes = ReadWholeFile(docs / "elsewhere");
+            EXPECT_EQ(c.elsewhere, bytes.substr(0, std::strlen(c.elsewhere))) << c.link;
+        }
+    }
+}
+
+TEST(Environment, AnyNameIsUsedAsItIs)
+{
+    for (const std::string name :
+         {"two words", "\"quoted\"", "new\nline", "back\\slash", "\xff\xfe", "$(x);'"})
+    {
+        const ExampleDocs docs;
+        fs::rename(docs / "b", docs / name);
+        EXPECT_EQ(0, RunProgram(PAGEMELD_PROGRAM, {docs / "a", docs / name}).status) << name;
+        const std::string script = ReadWholeFile(docs / "a/Manual/docdata/global_toc.js");
+        const std::string prefixes = "var p0 = \"\";\nvar p1 = \"../../" + name + "/Manual/\";\ntoc = {\n";
+        EXPECT_EQ(prefixes, script.substr(0, prefixes.size()));
+        EXPECT_NE("the earlier output", ReadWholeFile(docs / name + "/Manual/docdata/global_toc.js"));
+    }
+}
+
+TEST(Environment, PathsTooLongEndTheRunBehindTheGoodModules)
+{
+    for (const std::string& tooLong : {std::string(300, 'x'), std::string(5'000, '/')})
+    {
+        const ExampleDocs docs;
+        const std::string bad = docs / tooLong;
+        const ProgramResult result = RunProgram(PAGEMELD_PROGRAM, {docs / "a", docs / "b", bad});
+        EXPECT_EQ(255, result.status);
+        EXPECT_EQ("NNNN NNNN", docs.Describe());
+        EXPECT_NE(std::string::npos,
+                  result.standardError.find("IndexCombiner:176 Unable to open file " + bad));
+    }
+}

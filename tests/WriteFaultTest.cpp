@@ -1,0 +1,204 @@
+#include "tests/support/ExampleDocs.h"
+#include "tests/support/WholeFile.h"
+
+#include <gtest/gtest.h>
+
+#include <csignal>
+#include <filesystem>
+#include <functional>
+
+#include <sys/resource.h>
+#include <unistd.h>
+
+// What a run leaves on the disk when writing fails, or when it is killed. A script is whole and new, or whole
+// and earlier; a JSON file may be cut short, which is wanted. See docs/ROBUSTNESS.md.
+
+namespace
+{
+
+namespace fs = std::filesystem;
+
+/// Runs pagemeld as a user who may not write where nobody may.
+ProgramResult RunAsOrdinaryUser(const ExampleDocs& docs)
+{
+    return ::geteuid() == 0 ? docs.Run({"setpriv", "--bounding-set=-dac_override"}) : docs.Run();
+}
+
+/// Lets no process started from here write beyond so many bytes of a file, and has such writes fail.
+class FileSizeLimit
+{
+public:
+    explicit FileSizeLimit(std::size_t bytes) : m_handler(std::signal(SIGXFSZ, SIG_IGN))
+    {
+        ::getrlimit(RLIMIT_FSIZE, &m_before);
+        const rlimit limit = {bytes, m_before.rlim_max};
+        ::setrlimit(RLIMIT_FSIZE, &limit);
+    }
+
+    ~FileSizeLimit()
+    {
+        ::setrlimit(RLIMIT_FSIZE, &m_before);
+        (void)std::signal(SIGXFSZ, m_handler);
+    }
+
+    FileSizeLimit(const FileSizeLimit&) = delete;
+    FileSizeLimit& operator=(const FileSizeLimit&) = delete;
+
+private:
+    rlimit m_before = {};
+    void (*m_handler)(int);
+};
+
+std::string CutAt(std::size_t limit, const std::vector<ExampleDocs::Output>& outputs)
+{
+    std::string description;
+    for (const ExampleDocs::Output& output : outputs)
+    {
+        const char cut = limit == 0 ? 'E' : 'C';
+        const char failed = output.isScript ? 'O' : cut;
+        description += output.newBytes.size() <= limit ? 'N' : failed;
+    }
+    return description.insert(4, " ");
+}
+
+} // namespace
+
+TEST(WriteFault, FileSizeLimitAtAnyByteLeavesWholeScripts)
+{
+    const ExampleDocs docs;
+    const std::size_t longest = docs.Outputs()[3].newBytes.size();
+    ASSERT_GT(longest, docs.Outputs()[1].newBytes.size());
+    for (std::size_t limit = 0; limit <= longest; ++limit)
+    {
+        docs.Restore();
+        {
+            const FileSizeLimit fileSizeLimit(limit);
+            EXPECT_EQ(0, docs.Run().status);
+        }
+        EXPECT_EQ(CutAt(limit, docs.Outputs()), docs.Describe()) << "at a limit of " << limit << " bytes";
+    }
+}
+
+TEST(WriteFault, FullFileSystemLeavesWholeScripts)
+{
+    if (RunProgram("unshare", {"-rm", "true"}).status != 0)
+    {
+        GTEST_SKIP() << "no mounts here";
+    }
+    // Runs over copies of the modules on a file system with so many free pages, and copies back what it left.
+    // The mount goes with the shell.
+    constexpr const char* kScript = R"(set -e; cd "$0"; mkdir disk; mount -t tmpfs -o size=256k tmpfs disk
+cp -r a b disk; [ "$1" = kept ] || find disk -name 'global_*' -delete; rm -r a b
+head -c $(( ($(stat -f -c %f disk) - $2) * $(stat -f -c %s disk) )) /dev/zero > disk/filling
+"$3" disk/a disk/b; cp -r disk/a disk/b .)";
+    // Every output takes one page. A JSON file that is cut to nothing frees the page of the earlier one by
+    // its rename, so that the next file finds room.
+    const struct
+    {
+        const char* earlier;
+        const char* freePages;
+        const char* outputs;
+    } cases[] = {
+        {"kept", "0", "ENNN NNNN"},    {"kept", "1", "NNNN NNNN"},    {"removed", "0", "E-E- E-E-"},
+        {"removed", "1", "N-E- E-E-"}, {"removed", "6", "NNNN NNE-"}, {"removed", "8", "NNNN NNNN"},
+    };
+    for (const auto& c : cases)
+    {
+        const ExampleDocs docs;
+        EXPECT_EQ(
+            0, docs.Run({"unshare", "-rm", "sh", "-c", kScript, docs / ".", c.earlier, c.freePages}).status);
+        EXPECT_EQ(c.outputs, docs.Describe())
+            << "earlier outputs " << c.earlier << ", " << c.freePages << " pages free";
+    }
+}
+
+TEST(WriteFault, ObstaclesLeaveWhatTheyMust)
+{
+    const auto blockWithFolder = [](const char* name)
+    {
+        return [name](const ExampleDocs& docs)
+        {
+            fs::remove(docs / name);
+            fs::create_directory(docs / name);
+        };
+    };
+    const struct
+    {
+        const char* obstacle;
+        std::function<void(const ExampleDocs&)> prepare;
+        int status;
+        const char* outputs;
+    } cases[] = {
+        {"none", [](const ExampleDocs&) {}, 0, "NNNN NNNN"},
+        {"stale temporary files",
+         [](const ExampleDocs& docs)
+         {
+             for (const auto& output : docs.Outputs())
+             {
+                 WriteWholeFile(docs / output.path + ".tmp", std::string(10'000, 'x'));
+             }
+         },
+         0, "NNNN NNNN"},
+        {"read-only folder a",
+         [](const ExampleDocs& docs)
+         { fs::permissions(docs / "a/Manual/docdata", fs::perms::owner_read | fs::perms::owner_exec); },
+         255, "OOOO OOOO"},
+        {"read-only folder b",
+         [](const ExampleDocs& docs)
+         { fs::permissions(docs / "b/Manual/docdata", fs::perms::owner_read | fs::perms::owner_exec); },
+         255, "NNNN OOOO"},
+        {"folder global_index.json.tmp", blockWithFolder("a/Manual/docdata/global_index.json.tmp"), 0,
+         "O[D]NNN NNNN"},
+        {"folder global_index.js.tmp", blockWithFolder("a/Manual/docdata/global_index.js.tmp"), 255,
+         "NO[D]OO OOOO"},
+        {"folder global_toc.json.tmp", blockWithFolder("a/Manual/docdata/global_toc.json.tmp"), 0,
+         "NNO[D]N NNNN"},
+        {"folder global_toc.js.tmp", blockWithFolder("a/Manual/docdata/global_toc.js.tmp"), 0,
+         "NNNO[D] NNNN"},
+        // A rename on to a folder fails, and is not reported.
+        {"folder global_index.json", blockWithFolder("a/Manual/docdata/global_index.json"), 0,
+         "D[N]NNN NNNN"},
+        {"folder global_index.js", blockWithFolder("a/Manual/docdata/global_index.js"), 0, "ND[N]NN NNNN"},
+        {"folder global_toc.json", blockWithFolder("a/Manual/docdata/global_toc.json"), 0, "NND[N]N NNNN"},
+        {"folder global_toc.js", blockWithFolder("a/Manual/docdata/global_toc.js"), 0, "NNND[N] NNNN"},
+    };
+    const ExampleDocs docs;
+    for (const auto& c : cases)
+    {
+        c.prepare(docs);
+        EXPECT_EQ(c.status, RunAsOrdinaryUser(docs).status) << c.obstacle;
+        EXPECT_EQ(c.outputs, docs.Describe()) << c.obstacle;
+        docs.Restore();
+    }
+}
+
+TEST(WriteFault, KilledRunLeavesWholeOutputsAndTheNextOneMendsThem)
+{
+    const ExampleDocs docs;
+    int runs = 0;
+    for (const char* operation : {"openat", "write", "close", "rename"})
+    {
+        for (int count = 1;; ++count, ++runs)
+        {
+            docs.Restore();
+            const std::string kill =
+                std::string("inject=") + operation + ":signal=KILL:when=" + std::to_string(count);
+            const int status =
+                docs.Run({"strace", "-qq", "-E", "ASAN_OPTIONS=detect_leaks=0", "-e", kill}).status;
+            if (status == 0)
+            {
+                break; // the run has no more of these operations
+            }
+            ASSERT_EQ(-9, status);
+            for (const ExampleDocs::Output& output : docs.Outputs())
+            {
+                const std::string bytes = ReadWholeFile(docs / output.path);
+                EXPECT_TRUE(bytes == output.newBytes || bytes == "the earlier output")
+                    << output.path << ", killed at " << operation << ' ' << count;
+            }
+            (void)docs.Run();
+            EXPECT_EQ("NNNN NNNN", docs.Describe()) << "after a run killed at " << operation << ' ' << count;
+        }
+    }
+    EXPECT_GT(runs, 30);
+}
