@@ -36,9 +36,9 @@ void WriteAndRename(const std::string& modulePath, const Output& output)
 void WriteOutputs(const std::list<std::string>& modulePaths, const IndexCombiner& index,
                   const TocCombiner& toc)
 {
-    const RenderedText indexJson = RapidJsonIoUtil::RenderPrettyJson(index.combinedDocument);
+    RepeatedText indexJson(RapidJsonIoUtil::RenderPrettyJson(index.combinedDocument));
     const RenderedText indexScript = RenderIndexScript(index.combinedDocument);
-    const RenderedText tocJson = RapidJsonIoUtil::RenderPrettyJson(toc.combinedDocument);
+    RepeatedText tocJson(RapidJsonIoUtil::RenderPrettyJson(toc.combinedDocument));
     const std::optional<RenderedText> tocScript = toc.RenderScript(toc.combinedDocument);
 
     const Output outputs[] = {

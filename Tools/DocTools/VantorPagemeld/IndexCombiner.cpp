@@ -55,7 +55,7 @@ void IndexCombiner::AppendJsonDocument(rapidjson::Document& document)
     rapidjson::Value& info = combinedDocument["info"];
     const auto pageOffset = static_cast<int>(pages.Size());
     const auto infoOffset = static_cast<int>(info.Size());
-    MoveElements(pages, document["pages"]);
+    m_lists.MoveElements(pages, document["pages"], combinedDocument.GetAllocator());
     CombineInfoJson(info, document["info"], pageOffset);
     CombineSearchIndexJson(combinedDocument["searchIndex"], document["searchIndex"], infoOffset);
 }
@@ -92,7 +92,7 @@ void IndexCombiner::CombineInfoJson(rapidjson::Value& combined, rapidjson::Value
     {
         Rebase(entry[1], pageOffset);
     }
-    MoveElements(combined, input);
+    m_lists.MoveElements(combined, input, combinedDocument.GetAllocator());
 }
 
 void IndexCombiner::CombineSearchIndexJson(rapidjson::Value& combined, rapidjson::Value& input,
@@ -107,15 +107,7 @@ void IndexCombiner::CombineSearchIndexJson(rapidjson::Value& combined, rapidjson
         }
         if (rapidjson::Value* known = m_terms.FindOrAppend(term, combinedDocument.GetAllocator()))
         {
-            MoveElements(*known, term.value);
+            m_lists.MoveElements(*known, term.value, combinedDocument.GetAllocator());
         }
-    }
-}
-
-void IndexCombiner::MoveElements(rapidjson::Value& combined, rapidjson::Value& input)
-{
-    for (rapidjson::Value& element : input.GetArray())
-    {
-        combined.PushBack(element, combinedDocument.GetAllocator());
     }
 }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "Tools/DocTools/VantorPagemeld/Json/SpareLists.h"
 #include "Tools/DocTools/VantorPagemeld/JsonCombiner.h"
 #include "Tools/DocTools/VantorPagemeld/Lookup/TermIndex.h"
 
@@ -36,7 +37,6 @@ public:
     void CombineSearchIndexJson(rapidjson::Value& combined, rapidjson::Value& input, int infoOffset);
 
 private:
-    void MoveElements(rapidjson::Value& combined, rapidjson::Value& input);
-
     TermIndex m_terms;
+    SpareLists m_lists;
 };

@@ -9,6 +9,7 @@
 
 #include <cstdint>
 #include <memory>
+#include <utility>
 
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -140,19 +141,19 @@ void AppendCompactJson(RenderedText& text, const rapidjson::Value& value)
 
 bool OutputJsonValueToFile(const rapidjson::Value& value, const char* path)
 {
-    return OutputJsonTextToFile(RenderPrettyJson(value), path);
+    RepeatedText json(RenderPrettyJson(value));
+    return OutputJsonTextToFile(json, path);
 }
 
-bool OutputJsonTextToFile(const RenderedText& json, const char* path)
+bool OutputJsonTextToFile(RepeatedText& json, const char* path)
 {
-    const ScopedFile file(std::fopen(path, "w+b"));
+    ScopedFile file(std::fopen(path, "w+b"));
     if (file == nullptr)
     {
         kDiagnostics.Warning(23, "Failed to open %s for writing\n", path);
         return false;
     }
-    // Whether every byte arrived is deliberately not asked.
-    (void)WriteText(file.get(), TextOf(json));
+    json.WriteTo(std::move(file));
     return true;
 }
 

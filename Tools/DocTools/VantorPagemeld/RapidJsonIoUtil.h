@@ -1,6 +1,7 @@
 #pragma once
 
 #include "Tools/DocTools/VantorPagemeld/Output/RenderedText.h"
+#include "Tools/DocTools/VantorPagemeld/Output/RepeatedText.h"
 
 #include <rapidjson/document.h>
 
@@ -37,6 +38,6 @@ void AppendCompactJson(RenderedText& text, const rapidjson::Value& value);
 bool OutputJsonValueToFile(const rapidjson::Value& value, const char* path);
 
 /// Writes a JSON text that is rendered already; otherwise as OutputJsonValueToFile.
-bool OutputJsonTextToFile(const RenderedText& json, const char* path);
+bool OutputJsonTextToFile(RepeatedText& json, const char* path);
 
 } // namespace RapidJsonIoUtil
