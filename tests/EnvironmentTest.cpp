@@ -67,13 +67,20 @@ TEST(Environment, WantOfMemoryEndsTheRunBeforeItsFirstOutput)
     {
         ignored += ",0";
     }
-    WriteWholeFile(input, ReadWholeFile(input).insert(1, ignored + "],"));
+    const std::string largeInput = ReadWholeFile(input).insert(1, ignored + "],");
 
     int ended = 0;
     for (int megabytes = 6;; ++megabytes)
     {
         ASSERT_LT(megabytes, 100);
-        const int status = docs.Run({"prlimit", "--as=" + std::to_string(megabytes << 20)}).status;
+        WriteWholeFile(input, largeInput);
+        const ProgramResult result = docs.Run({"prlimit", "--as=" + std::to_string(megabytes << 20)});
+        if (result.standardError.find("RapidJsonIoUtil:60 Unable to read entire file") != std::string::npos)
+        {
+            docs.Restore(); // no room for the text of a file: its module is skipped
+            continue;
+        }
+        const int status = result.status;
         if (status == 0)
         {
             break;

@@ -9,6 +9,7 @@
 
 #include <cstdint>
 #include <memory>
+#include <new>
 #include <utility>
 
 #include <fcntl.h>
@@ -57,25 +58,29 @@ long SizeOf(std::FILE* file)
     return size;
 }
 
+/// Returns size + 1 bytes that are not set yet, or null when the size is out of bounds or there is no memory.
+FileText AllocateText(long size)
+{
+    return FileText(size >= 0 && size <= kMaxFileSize
+                        ? new (std::nothrow) char[static_cast<std::size_t>(size) + 1]
+                        : nullptr);
+}
+
 /// Returns the whole of an open file with a NUL behind it, or null, after a warning, when it can't be had.
 FileText ReadWhole(std::FILE* file, const char* path)
 {
     const long size = SizeOf(file);
-    std::size_t bytesRead = 0;
-    if (size >= 0 && size <= kMaxFileSize)
+    FileText text = AllocateText(size);
+    const std::size_t bytesRead =
+        text == nullptr ? 0 : std::fread(text.get(), 1, static_cast<std::size_t>(size), file);
+    if (text == nullptr || bytesRead != static_cast<std::size_t>(size))
     {
-        const auto bytesWanted = static_cast<std::size_t>(size);
-        FileText text(new char[bytesWanted + 1]);
-        bytesRead = std::fread(text.get(), 1, bytesWanted, file);
-        if (bytesRead == bytesWanted)
-        {
-            text[bytesRead] = '\0';
-            return text;
-        }
+        kDiagnostics.Warning(60, "Unable to read entire file %s, requested %d, got %d bytes\n", path,
+                             static_cast<int>(size), static_cast<int>(bytesRead));
+        return nullptr;
     }
-    kDiagnostics.Warning(60, "Unable to read entire file %s, requested %d, got %d bytes\n", path,
-                         static_cast<int>(size), static_cast<int>(bytesRead));
-    return nullptr;
+    text[bytesRead] = '\0';
+    return text;
 }
 
 /// Returns the whole of the file at path with a NUL behind it, or null, after a warning, when it can't be
