@@ -15,6 +15,8 @@
 
 #include <gtest/gtest.h>
 
+#include <unistd.h>
+
 using UnitTest::CheckAt;
 using UnitTest::CheckEqual;
 using UnitTest::CheckEqualAt;
@@ -260,6 +262,19 @@ TEST(TestRunner, RunsTheWantedTestsOfASuiteAndReturnsTheFailures)
     EXPECT_EQ("[Own]  Fails  FAIL!!!!\n\tCHECK FAILURE: wrong (file:1)\n"
               "Ran 1 tests with 1 failures in N seconds\n\tFAILED: Fails [Own]\n",
               TextOf(console));
+}
+
+TEST(TestRunner, ReportsTimesInSeconds)
+{
+    const DescribedTests tests({{"S", "T", "Unit", [] { (void)::usleep(20'000); }}});
+    const auto all = [](const UnitTest::Test*) { return true; };
+    const CapturedConsole console;
+    ConsoleTestReporter reporter;
+    static float reported;
+    reporter.intraTestHandler = [](const UnitTest::TestDetails&, float seconds) { reported = seconds; };
+    UnitTest::TestRunner(reporter).RunTestsIf(tests.list, nullptr, all);
+    EXPECT_LE(0.019F, reported);
+    EXPECT_GT(15.0F, reported);
 }
 
 TEST(TestResults, CountWithoutAReporterToo)
