@@ -1,9 +1,12 @@
 #include "Runtime/Testing/NativeTestRun.h"
 
+#include "Runtime/Testing/AutomationTestReporter.h"
 #include "Runtime/Testing/Checks.h"
+#include "Runtime/Testing/ConsoleTestReporter.h"
 #include "Runtime/Testing/CurrentTest.h"
 #include "Runtime/Testing/RunNativeTests.h"
 #include "Runtime/Testing/TestResults.h"
+#include "Runtime/Testing/TestRunner.h"
 #include "Runtime/Testing/TestingGlobals.h"
 #include "Runtime/Testing/TimerImplPosix.h"
 #include "Runtime/Utilities/CommandLine.h"
@@ -11,6 +14,8 @@
 #include "tests/support/DescribedTests.h"
 
 #include <gtest/gtest.h>
+
+#include <unistd.h>
 
 using UnitTest::CheckAt;
 using UnitTest::CheckEqual;
@@ -104,6 +109,7 @@ std::vector<TestDescription> MakeDescriptions()
             {"Own", "Fails", "Performance", FailInManyPlaces},
             {"Own", "HasNoCategory", nullptr, [] { FAIL() << "only the substitute may run"; }},
             {"Own", "DISABLED_ByName"},
+            {"Own", "DISABLED_X", nullptr}, // and so is its substitute
             {"Own", "Broken", "Unit", [] { FAIL(); }, {&kBroken}},
             {"Own", "BrokenToo", "Unit", [] { FAIL(); }, {&kBroken}},
             {"OwnOther", "Conditional", "", [] { FAIL(); }, {&kCondition}}};
@@ -130,9 +136,11 @@ TEST(NativeTestRun, ReportsFailedIgnoredAndUngroupedTests)
                   "\tFAILED: Fails [Own]\n"
                   "\tFAILED: HasNoCategory [Own]\n"
                   "\tFAILED: Conditional [OwnOther]\n"
-                  "\n4 tests were IGNORED!\n"
+                  "\n6 tests were IGNORED!\n"
                   "[Own] Broken and 1 other test was ignored: broken (case 12)\n"
                   "[OwnOther] Conditional: not here \n"
+                  "[Own] DISABLED_X: No reason given\n"
+                  "[Own] DISABLED_X: No reason given\n"
                   "[Own] DISABLED_ByName: No reason given\n",
               outcome.text);
     EXPECT_TRUE(Testing::g_IsRunningNativeTests);
@@ -155,6 +163,40 @@ TEST(NativeTestRun, WritesStatusLinesForTheSwitchAutomated)
 ##qzm:{"type":"TestStatus","version":2,"phase":"End","time":N,"processId":N,"name":"S.T","state":4,"message":"","fileName":"file","lineNumber":7,"durationMicroseconds":N,"duration":N}
 )text",
         RunAndCapture(tests.list).text);
+}
+
+TEST(NativeTestRun, WantsPerformanceDataUnlessASwitchOrTheCategoriesForbidIt)
+{
+    static bool isWanted;
+    const auto note = []
+    {
+        isWanted =
+            dynamic_cast<const AutomationTestReporter&>(*Testing::g_TestReporter).ReportsPerformanceData();
+    };
+    const struct
+    {
+        std::vector<const char*> arguments;
+        std::vector<std::string> categoryPrefixes;
+        bool expected;
+    } cases[] = {
+        {{"-automated"}, {}, true},
+        {{"--DontReportPerformanceData", "filter", "-automated"}, {}, false},
+        {{"dontReportPerformanceData", "-automated"}, {}, true},
+        {{"-automated"}, {"un"}, false},
+        {{"-automated"}, {"un", "perf"}, true},
+        {{"-automated"}, {"performances"}, false},
+    };
+    for (const auto& c : cases)
+    {
+        const Arguments arguments(c.arguments);
+        const CapturedConsole console;
+        DescribedTests tests({{"S", "T", "Unit", note}, {"S", "T", "Performances", note}});
+        TestFilter filter;
+        filter.categoryPrefixes = c.categoryPrefixes;
+        isWanted = !c.expected;
+        RunNativeTests(filter, tests.list);
+        EXPECT_EQ(c.expected, isWanted) << "case " << &c - cases;
+    }
 }
 
 TEST(NativeTestRun, WidensItsColumnsUpToTheLongestSelectedNameButNotBeyond64)
@@ -203,6 +245,60 @@ TEST(NativeTestRun, RunsTheCompiledInTestsThatCategoryAndNameSelect)
         EXPECT_EQ(0, RunNativeTests(c.categoryFilter, c.nameFilter));
         EXPECT_EQ(c.expected, TextOf(console)) << c.categoryFilter << "|" << c.nameFilter;
     }
+}
+
+TEST(TestRunner, RunsTheWantedTestsOfASuiteAndReturnsTheFailures)
+{
+    const auto failTwice = []
+    {
+        CheckAt(1, false, "wrong");
+        CheckAt(1, false, "wrong");
+    };
+    const DescribedTests tests({{"Own", "Fails", "Unit", failTwice}, {"Own", ""}, {"OwnOther", "Passes"}});
+    const auto hasName = [](const UnitTest::Test* test) { return *test->m_details.testName != '\0'; };
+    const CapturedConsole console;
+    ConsoleTestReporter reporter;
+    EXPECT_EQ(2, UnitTest::TestRunner(reporter).RunTestsIf(tests.list, "Own", hasName));
+    EXPECT_EQ("[Own]  Fails  FAIL!!!!\n\tCHECK FAILURE: wrong (file:1)\n"
+              "Ran 1 tests with 1 failures in N seconds\n\tFAILED: Fails [Own]\n",
+              TextOf(console));
+}
+
+TEST(TestRunner, ReportsTimesInSeconds)
+{
+    const DescribedTests tests({{"S", "T", "Unit", [] { (void)::usleep(20'000); }}});
+    const auto all = [](const UnitTest::Test*) { return true; };
+    const CapturedConsole console;
+    ConsoleTestReporter reporter;
+    static float reported;
+    reporter.intraTestHandler = [](const UnitTest::TestDetails&, float seconds) { reported = seconds; };
+    UnitTest::TestRunner(reporter).RunTestsIf(tests.list, nullptr, all);
+    EXPECT_LE(0.019F, reported);
+    EXPECT_GT(15.0F, reported);
+}
+
+TEST(TestResults, CountWithoutAReporterToo)
+{
+    UnitTest::TestResults results(nullptr);
+    const UnitTest::TestDetails details;
+    for (int test = 0; test < 3; ++test)
+    {
+        results.OnTestStart(details);
+        results.OnTestFailure(details, "wrong");
+        results.OnTestFailure(details, "wrong again");
+        results.OnTestFinish(details, 0);
+    }
+    results.OnTestStart(details);
+    EXPECT_EQ(4, results.GetTotalTestCount());
+    EXPECT_EQ(3, results.GetFailedTestCount());
+    EXPECT_EQ(6, results.GetFailureCount());
+}
+
+TEST(TestingGlobals, CountQuestionsForExpectedAssertionsAndExpectNone)
+{
+    const int before = Testing::g_AssertCountBeforeTests;
+    EXPECT_FALSE(IsNativeTestExpectingAssertionFailure("any text"));
+    EXPECT_EQ(before + 1, Testing::g_AssertCountBeforeTests);
 }
 
 TEST(TestList, HoldsTheCompiledInTestsInTheirOrder)

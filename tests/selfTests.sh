@@ -18,7 +18,8 @@ expect() {
     diff /dev/null "$output/errors"
 }
 
-expect <<'END'
+expect_all() {
+    expect "$@" <<'END'
 [IndexCombiner]  TryGetJsonDocFromString_ValidString_ReturnsTrue             PASS(Nms)
 [IndexCombiner]  AppendJsonDocument_OneValueJson_ProducesThatJson            PASS(Nms)
 [IndexCombiner]  AppendJsonDocument_TwoValidJsons_ProducesCombinedJson       PASS(Nms)
@@ -26,6 +27,24 @@ expect <<'END'
 [TocCombiner]    AppendJsonDocument_OneValueJson_ProducesThatJson            PASS(Nms)
 [TocCombiner]    AppendJsonDocument_TrivialAndSimpleJson_ProducesSimpleJson  PASS(Nms)
 Ran 6 tests with 0 failures in N seconds
+END
+}
+
+expect_all
+expect_all ""
+expect_all .
+
+expect valid <<'END'
+[IndexCombiner]  TryGetJsonDocFromString_ValidString_ReturnsTrue        PASS(Nms)
+[IndexCombiner]  AppendJsonDocument_TwoValidJsons_ProducesCombinedJson  PASS(Nms)
+[TocCombiner]    TryGetJsonDocFromString_ValidString_ReturnsTrue        PASS(Nms)
+Ran 3 tests with 0 failures in N seconds
+END
+
+expect indexcombiner.append <<'END'
+[IndexCombiner]  AppendJsonDocument_OneValueJson_ProducesThatJson       PASS(Nms)
+[IndexCombiner]  AppendJsonDocument_TwoValidJsons_ProducesCombinedJson  PASS(Nms)
+Ran 2 tests with 0 failures in N seconds
 END
 
 expect TOCCOMBINER extra <<'END'
@@ -38,6 +57,10 @@ END
 expect .trivial --Automated <<'END'
 ##qzm:{"type":"TestStatus","version":2,"phase":"Begin","time":N,"processId":N,"name":"TocCombiner.AppendJsonDocument_TrivialAndSimpleJson_ProducesSimpleJson","state":0}
 ##qzm:{"type":"TestStatus","version":2,"phase":"End","time":N,"processId":N,"name":"TocCombiner.AppendJsonDocument_TrivialAndSimpleJson_ProducesSimpleJson","state":4,"message":"","fileName":"./Tools/DocTools/VantorPagemeld/TocCombinerTests","lineNumber":57,"durationMicroseconds":N,"duration":N}
+END
+
+expect "no such test" <<'END'
+Ran 0 tests with 0 failures in N seconds
 END
 
 # The switch stands in the filter's place here, and so is the filter too.

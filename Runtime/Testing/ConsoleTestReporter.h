@@ -15,7 +15,8 @@ public:
 protected:
     void ReportTestNameOnTestStart(const UnitTest::TestDetails& details) override;
 
-    /// A negative time is reported on standard error and shown as 0.
+    /// Shows the time of a test that passed in whole milliseconds: in single precision, the rest cut off. A
+    /// negative one is reported on standard error and shown as 0.
     void ReportTestStatusOnFinish(const UnitTest::TestDetails& details, float seconds) override;
 
 private:

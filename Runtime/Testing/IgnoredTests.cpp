@@ -20,12 +20,12 @@ bool ShareLine(const DisabledTestInfo& a, const DisabledTestInfo& b)
 /// The blank behind a reason is wanted even if no case number follows.
 core::string DescribeReason(const DisabledTestInfo& info)
 {
-    if (info.caseNumber == 0 && info.reason.empty())
+    core::string text = info.reason.empty() ? "" : info.reason + " ";
+    if (info.caseNumber != 0)
     {
-        return "No reason given";
+        text += Format("(case %i)", info.caseNumber);
     }
-    return (info.reason.empty() ? core::string() : info.reason + " ") +
-           (info.caseNumber == 0 ? core::string() : Format("(case %i)", info.caseNumber));
+    return text.empty() ? "No reason given" : text;
 }
 
 core::string DescribeGroup(const DisabledTestInfo& first, std::size_t otherCount)

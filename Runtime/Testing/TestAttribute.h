@@ -3,13 +3,13 @@
 namespace UnitTest
 {
 
-/// A mark that a test may carry. Only the types below have a meaning.
+/// A mark that a test may carry. Other types than these don't keep a test from running; reporters look for
+/// some of them.
 struct TestAttribute
 {
-    // The first three make a test ignored: always (with a case number), always, if the predicate holds.
-    static constexpr int kIgnored = 0;
-    static constexpr int kIgnoredAlways = 1;
-    static constexpr int kIgnoredIf = 2;
+    static constexpr int kIgnoredForCase = 0; ///< the only one whose case number is reported
+    static constexpr int kIgnored = 1;
+    static constexpr int kIgnoredIf = 2; ///< if the predicate is set and holds
 
     int type;
     int caseNumber;

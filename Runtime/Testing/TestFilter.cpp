@@ -54,8 +54,8 @@ bool IsConditionThatHolds(const TestAttribute* attribute)
 
 bool IsIgnoredByAttribute(const TestDetails& details)
 {
-    return FindAttribute(details, TestAttribute::kIgnored) != nullptr ||
-           FindAttribute(details, TestAttribute::kIgnoredAlways) != nullptr ||
+    return FindAttribute(details, TestAttribute::kIgnoredForCase) != nullptr ||
+           FindAttribute(details, TestAttribute::kIgnored) != nullptr ||
            (details.attributes != nullptr &&
             std::any_of(details.attributes->begin(), details.attributes->end(), IsConditionThatHolds));
 }
@@ -75,12 +75,12 @@ DisabledTestInfo DescribeIgnored(const TestDetails& details)
 {
     DisabledTestInfo info;
     info.details = details;
-    if (const TestAttribute* attribute = FindAttribute(details, TestAttribute::kIgnored))
+    if (const TestAttribute* attribute = FindAttribute(details, TestAttribute::kIgnoredForCase))
     {
         SetReason(info, *attribute);
         info.caseNumber = attribute->caseNumber;
     }
-    if (const TestAttribute* attribute = FindAttribute(details, TestAttribute::kIgnoredAlways))
+    if (const TestAttribute* attribute = FindAttribute(details, TestAttribute::kIgnored))
     {
         SetReason(info, *attribute);
     }

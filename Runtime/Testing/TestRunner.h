@@ -32,7 +32,7 @@ public:
 
 private:
     TestReporter& m_reporter;
-    std::unique_ptr<TestResults> m_results;
+    std::unique_ptr<TestResults> m_results; ///< a pointer, since the operations that count are const
     TimerImplPosix m_timer;
 };
 

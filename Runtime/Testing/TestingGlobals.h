@@ -7,7 +7,7 @@ namespace Testing
 
 extern bool g_IsRunningNativeTests;        ///< set when a run starts, and never cleared
 extern NativeTestReporter* g_TestReporter; ///< that of the current run; null outside a run
-extern int g_AssertCountBeforeTests;
+extern int g_AssertCountBeforeTests;       ///< calls of IsNativeTestExpectingAssertionFailure
 
 } // namespace Testing
 

@@ -3,8 +3,9 @@
 #include "Runtime/Testing/TestCategories.h"
 #include "Runtime/Testing/TestList.h"
 
-/// Defines a test of the category "Unit"; its body follows in braces. File and line are what the test is
-/// reported with: declared ones, which stay the same when the code moves.
+/// Defines a test of the category "Unit"; its body follows in braces. Without a REGISTER_UNIT_TEST it is
+/// never run. File and line are what the test is reported with: declared ones, which stay the same when the
+/// code moves.
 #define UNIT_TEST(suite, name, file, line)                                                                   \
     namespace Suite##suite##kUnitTestCategory                                                                \
     {                                                                                                        \

@@ -16,7 +16,4 @@ public:
     }
 
     static void Free(void* memory) { FreeLabelled(MemoryLabel::Json, memory); }
-
-    bool operator==(const JSONAllocator& /*other*/) const { return true; }
-    bool operator!=(const JSONAllocator& /*other*/) const { return false; }
 };
