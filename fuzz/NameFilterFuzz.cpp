@@ -95,11 +95,11 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     texts.resize(3);
     const std::string& suite = texts[1];
     const std::string& test = texts[2];
-    const std::string shown(ConvertNonPrintableCharsToHex(test.c_str()).c_str());
+    const std::string shown(ConvertNonPrintableCharsToHex(test.c_str()));
     Require(shown == ShownByDefinition(test), "a name is shown as defined");
 
     TestFilter filter;
-    filter.nameFilters.emplace_back(Lower(texts[0]).c_str());
+    filter.nameFilters.emplace_back(Lower(texts[0]));
     const UnitTest::Test subject(
         UnitTest::TestDetails(test.c_str(), suite.c_str(), Testing::kUnitTestCategory, "", 1, nullptr));
     Require(filter.Filter(&subject) == SelectsByDefinition(Lower(texts[0]), Lower(suite), Lower(shown)),

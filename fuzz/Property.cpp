@@ -4,9 +4,9 @@
 #include "Tools/DocTools/VantorPagemeld/Json/JsonValue.h"
 
 #include <algorithm>
+#include <cmath>
 #include <cstdio>
 #include <cstdlib>
-#include <cstring>
 
 namespace
 {
@@ -17,7 +17,7 @@ bool IsSameNumber(const rapidjson::Value& a, const rapidjson::Value& b)
     {
         const double left = a.GetDouble();
         const double right = b.GetDouble();
-        return a.IsDouble() && b.IsDouble() && std::memcmp(&left, &right, sizeof left) == 0;
+        return a.IsDouble() && b.IsDouble() && left == right && std::signbit(left) == std::signbit(right);
     }
     return a == b;
 }

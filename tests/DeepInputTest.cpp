@@ -83,8 +83,7 @@ TEST(DeepInput, ArraysAndObjectsAreReadCopiedAndWritten)
             {
                 rapidjson::Document document;
                 ASSERT_TRUE(RapidJsonIoUtil::TryGetJsonDocFromString(text.c_str(), document));
-                rapidjson::Document copy;
-                copy.CopyFrom(document, copy.GetAllocator());
+                const rapidjson::Value copy(document, document.GetAllocator());
                 EXPECT_EQ(text, RapidJsonIoUtil::OutputJsonValueToString(copy));
             });
     }

@@ -19,7 +19,7 @@ namespace fs = std::filesystem;
 /// A command that runs another one with its streams redirected.
 std::vector<std::string> WithStreams(const std::string& redirections)
 {
-    return {"sh", "-c", "exec \"$0\" \"$@\" " + redirections};
+    return {"sh", "-c", R"(exec "$0" "$@" )" + redirections};
 }
 
 } // namespace

@@ -2,17 +2,16 @@
 #include <new>
 
 // The JSON library uses what malloc and realloc return without a look, so that it would write through null
-// when memory runs out. The linker redirects these two, for our objects only, to the functions here
-// (--wrap), and want of memory ends the process there as it does everywhere else: by std::bad_alloc, which
-// nobody catches.
+// when memory runs out. The linker redirects these two, for our objects only, to the functions here (--wrap),
+// and want of memory ends the process there as it does everywhere else: by std::bad_alloc, which nobody
+// catches.
 
-// NOLINTBEGIN(bugprone-reserved-identifier): the linker's names
 extern "C"
 {
-    void* __real_malloc(std::size_t size);
-    void* __real_realloc(void* memory, std::size_t size);
-    void* __wrap_malloc(std::size_t size) noexcept;
-    void* __wrap_realloc(void* memory, std::size_t size) noexcept;
+    void* RealMalloc(std::size_t size) __asm__("__real_malloc");
+    void* RealRealloc(void* memory, std::size_t size) __asm__("__real_realloc");
+    void* MallocOrEnd(std::size_t size) noexcept __asm__("__wrap_malloc");
+    void* ReallocOrEnd(void* memory, std::size_t size) noexcept __asm__("__wrap_realloc");
 }
 
 namespace
@@ -29,13 +28,12 @@ void* EndIfNull(void* memory)
 
 } // namespace
 
-void* __wrap_malloc(std::size_t size) noexcept
+void* MallocOrEnd(std::size_t size) noexcept
 {
-    return EndIfNull(__real_malloc(size));
+    return EndIfNull(RealMalloc(size));
 }
 
-void* __wrap_realloc(void* memory, std::size_t size) noexcept
+void* ReallocOrEnd(void* memory, std::size_t size) noexcept
 {
-    return EndIfNull(__real_realloc(memory, size));
+    return EndIfNull(RealRealloc(memory, size));
 }
-// NOLINTEND(bugprone-reserved-identifier)
