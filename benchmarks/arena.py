@@ -10,6 +10,7 @@ from pathlib import Path
 import corpus
 import measurement
 
+BLOCK = 1 << 20
 ALTERNATIVES = Path(__file__).parent / "alternatives"
 INPUTS = ("index.json", "toc.json")
 INDEX_OUTPUT = "global_index.json"
@@ -81,7 +82,9 @@ class Arena:
         for root in self.roots:
             for set_name in corpus.SETS:
                 for output in outputs:
-                    digest.update((root / set_name / "docdata" / output).read_bytes())
+                    with open(root / set_name / "docdata" / output, "rb") as file:
+                        for block in iter(lambda stream=file: stream.read(BLOCK), b""):
+                            digest.update(block)
         return digest.hexdigest()
 
     def memory_goal(self):

@@ -1,5 +1,6 @@
 #include "Tools/DocTools/VantorPagemeld/Output/RenderedText.h"
 
+#include <algorithm>
 #include <cstring>
 
 void AppendText(RenderedText& destination, std::string_view text)
@@ -17,5 +18,15 @@ std::string_view TextOf(const RenderedText& text)
 
 bool WriteText(std::FILE* stream, std::string_view text)
 {
-    return std::fwrite(text.data(), 1, text.size(), stream) == text.size();
+    // One write of all makes the kernel look for long runs of fresh memory, which took ext4 twice the time.
+    constexpr std::size_t kBlockSize = 64 * 1024;
+    for (; !text.empty(); text.remove_prefix(std::min(kBlockSize, text.size())))
+    {
+        const std::string_view block = text.substr(0, kBlockSize);
+        if (std::fwrite(block.data(), 1, block.size(), stream) != block.size())
+        {
+            return false;
+        }
+    }
+    return true;
 }

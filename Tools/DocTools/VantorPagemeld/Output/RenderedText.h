@@ -17,5 +17,5 @@ void AppendText(RenderedText& destination, std::string_view text);
 /// The bytes composed so far, valid until the next append.
 [[nodiscard]] std::string_view TextOf(const RenderedText& text);
 
-/// Writes all of text to the stream with one call. Returns false when the stream took less.
+/// Writes all of text to the stream, block by block. Returns false when the stream took less.
 bool WriteText(std::FILE* stream, std::string_view text);
