@@ -7,6 +7,8 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdlib>
+#include <cstring>
 #include <filesystem>
 #include <fstream>
 
@@ -115,6 +117,18 @@ TEST(JsonReading, DocumentTellsTheOutcomeOfTheLastParse)
     EXPECT_TRUE(RapidJsonIoUtil::TryGetJsonDocFromString("[2]", document));
     EXPECT_FALSE(document.HasParseError());
     EXPECT_EQ("[2]", RapidJsonIoUtil::OutputJsonValueToString(document));
+}
+
+TEST(JsonReading, LongExponentsOverflowNothing)
+{
+    const char* const text =
+        R"([0.00000000001e-2147483639,-1.5E-99999999999,"\"0.00000000001e-2147483639",2.5e-00000000001,x)";
+    rapidjson::Document document;
+    EXPECT_FALSE(RapidJsonIoUtil::TryGetJsonDocFromString(text, document));
+    EXPECT_EQ(std::strlen(text) - 1, document.GetErrorOffset());
+    EXPECT_TRUE(RapidJsonIoUtil::TryGetJsonDocFromString(ReplaceAll(text, ",x", "]").c_str(), document));
+    EXPECT_EQ(R"([0.0,-0.0,"\"0.00000000001e-2147483639",0.25])",
+              RapidJsonIoUtil::OutputJsonValueToString(document));
 }
 
 TEST(JsonReading, EveryTruncationIsAParseError)

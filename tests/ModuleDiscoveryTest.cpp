@@ -8,6 +8,8 @@
 
 #include <filesystem>
 
+#include <sys/stat.h>
+
 TEST(ModuleDiscovery, WalksInByteOrderAndStopsAtModules)
 {
     const TemporaryFolder folder;
@@ -21,6 +23,8 @@ TEST(ModuleDiscovery, WalksInByteOrderAndStopsAtModules)
     }
     WriteWholeFile(folder / "file/Manual/docdata", "");
     WriteWholeFile(folder / "regular", "");
+    std::filesystem::create_directories(folder / "socket/Manual");
+    ASSERT_EQ(0, ::mknod((folder / "socket/Manual/docdata").c_str(), S_IFSOCK | 0600, 0));
     std::filesystem::create_directory_symlink(folder / "a", folder / "link");
     std::filesystem::create_directory_symlink(folder / "x/y", folder / "scripts/link");
     std::filesystem::create_directory_symlink(folder / "a", folder / "linked/Manual/docdata");
@@ -34,8 +38,9 @@ TEST(ModuleDiscovery, WalksInByteOrderAndStopsAtModules)
     {
         text += ReplaceAll(path, folder.Path(), "@") + "\n";
     }
-    // The folder itself is no candidate, though it has a Manual/docdata; a linked docdata counts.
-    EXPECT_EQ(
-        "kept\n@//Zeta\n@//a\n@//b\n@//deep/er/m\n@//deep/er/m-1\n@//deep-er\n@//file/n\n@//linked\n@//x\n",
-        text);
+    // The folder itself is no candidate, though it has a Manual/docdata; a linked docdata counts, and a
+    // socket, which has a folder's bit.
+    EXPECT_EQ("kept\n@//Zeta\n@//a\n@//b\n@//deep/er/m\n@//deep/er/m-1\n@//deep-er\n@//file/n\n@//linked\n"
+              "@//socket\n@//x\n",
+              text);
 }

@@ -52,7 +52,8 @@ bool IsModuleRoot(const std::string& path)
 {
     const std::string probe = path + "/Manual/docdata";
     struct stat status = {};
-    return ::stat(probe.c_str(), &status) == 0 && S_ISDIR(status.st_mode);
+    // The bit alone is asked for, which sockets and block devices have too; this is kept.
+    return ::stat(probe.c_str(), &status) == 0 && (status.st_mode & S_IFDIR) != 0;
 }
 
 } // namespace

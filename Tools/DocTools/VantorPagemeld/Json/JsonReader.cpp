@@ -1,5 +1,7 @@
 #include "Tools/DocTools/VantorPagemeld/Json/JsonReader.h"
 
+#include "Tools/DocTools/VantorPagemeld/Json/ExponentLimit.h"
+
 #include <rapidjson/reader.h>
 
 #include <cmath>
@@ -77,10 +79,11 @@ struct FailedStream
 
 rapidjson::ParseResult ParseJson(const char* text, rapidjson::Document& document)
 {
+    const std::optional<std::string> limitedText = LimitExponents(text);
     rapidjson::Reader reader;
     const auto readText = [&](rapidjson::Document& target)
     {
-        rapidjson::StringStream stream(text);
+        rapidjson::StringStream stream(limitedText ? limitedText->c_str() : text);
         LimitedDocumentBuilder builder(target);
         return !reader.Parse(stream, builder).IsError();
     };
