@@ -14,18 +14,21 @@ std::size_t CountDigits(const char* text)
     return std::strspn(text, "0123456789");
 }
 
+/// Whether the minus at that position stands behind an exponent mark.
+bool IsExponentSign(const char* text, std::size_t minus)
+{
+    return minus > 0 && (text[minus - 1] == 'e' || text[minus - 1] == 'E');
+}
+
 /// A fast look that nearly every text passes; it takes strings for numbers.
 bool MayHaveLongExponent(const char* text)
 {
-    for (const char* mark : {"e-", "E-"})
+    for (const char* minus = std::strchr(text, '-'); minus != nullptr; minus = std::strchr(minus + 1, '-'))
     {
-        for (const char* found = std::strstr(text, mark); found != nullptr;
-             found = std::strstr(found + 2, mark))
+        if (IsExponentSign(text, static_cast<std::size_t>(minus - text)) &&
+            CountDigits(minus + 1) > kMaxDigits)
         {
-            if (CountDigits(found + 2) > kMaxDigits)
-            {
-                return true;
-            }
+            return true;
         }
     }
     return false;
@@ -40,11 +43,6 @@ std::size_t FindStringEnd(const std::string& text, std::size_t start)
         i += text[i] == '\\' ? 2 : 1;
     }
     return std::min(i, text.size());
-}
-
-bool IsExponentSign(const std::string& text, std::size_t i)
-{
-    return text[i] == '-' && i > 0 && (text[i - 1] == 'e' || text[i - 1] == 'E');
 }
 
 void LimitDigits(std::string& text, std::size_t start, std::size_t count)
@@ -77,7 +75,7 @@ std::optional<std::string> LimitExponents(const char* text)
         {
             i = FindStringEnd(limited, i);
         }
-        else if (IsExponentSign(limited, i))
+        else if (limited[i] == '-' && IsExponentSign(limited.c_str(), i))
         {
             LimitDigits(limited, i + 1, CountDigits(limited.c_str() + i + 1));
         }
