@@ -124,6 +124,7 @@ const std::string& TextOfModule(int module)
     static const std::vector<std::string> texts = []
     {
         std::vector<std::string> made;
+        made.reserve(kModules);
         for (int i = 0; i < kModules; ++i)
         {
             made.push_back(Texts<Combiner>::Make(i));
@@ -192,7 +193,7 @@ const Combined<Combiner>& AllModules()
 template <class Combiner>
 void Parse(benchmark::State& state)
 {
-    for (auto _ : state)
+    while (state.KeepRunning())
     {
         rapidjson::Document document;
         ParseModule<Combiner>(0, document);
@@ -207,7 +208,7 @@ void Validate(benchmark::State& state)
     rapidjson::Document document;
     ParseModule<Combiner>(0, document);
     Combiner combiner;
-    for (auto _ : state)
+    while (state.KeepRunning())
     {
         if (!combiner.VerifyJSONStructure(document))
         {
@@ -221,7 +222,7 @@ void Validate(benchmark::State& state)
 template <class Combiner>
 void Tag(benchmark::State& state)
 {
-    for (auto _ : state)
+    while (state.KeepRunning())
     {
         state.PauseTiming();
         {
@@ -241,7 +242,7 @@ template <class Combiner>
 void Merge(benchmark::State& state)
 {
     std::size_t bytes = 0;
-    for (auto _ : state)
+    while (state.KeepRunning())
     {
         state.PauseTiming();
         {
@@ -262,7 +263,7 @@ void RenderJson(benchmark::State& state)
 {
     const rapidjson::Document& document = AllModules<Combiner>().combiner.combinedDocument;
     std::size_t bytes = 0;
-    for (auto _ : state)
+    while (state.KeepRunning())
     {
         bytes = TextOf(RapidJsonIoUtil::RenderPrettyJson(document)).size();
     }
@@ -273,7 +274,7 @@ void RenderIndexScriptText(benchmark::State& state)
 {
     const rapidjson::Document& document = AllModules<IndexCombiner>().combiner.combinedDocument;
     std::size_t bytes = 0;
-    for (auto _ : state)
+    while (state.KeepRunning())
     {
         bytes = TextOf(RenderIndexScript(document)).size();
     }
@@ -284,7 +285,7 @@ void RenderTocScriptText(benchmark::State& state)
 {
     const TocCombiner& combiner = AllModules<TocCombiner>().combiner;
     std::size_t bytes = 0;
-    for (auto _ : state)
+    while (state.KeepRunning())
     {
         bytes = TextOf(combiner.RenderScript(combiner.combinedDocument).value()).size();
     }
@@ -295,7 +296,7 @@ void Prefix(benchmark::State& state)
 {
     const std::string from = "/home/builder/product/documentation/en/module-one/ScriptReference";
     const std::string to = "/home/builder/product/documentation/en/module-two/ScriptReference/";
-    for (auto _ : state)
+    while (state.KeepRunning())
     {
         benchmark::DoNotOptimize(RelativePrefix(from, to));
     }

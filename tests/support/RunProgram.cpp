@@ -43,6 +43,7 @@ ProgramResult RunProgram(const std::string& program, const std::vector<std::stri
 std::string ReportOfRun(const TemporaryFolder& folder, const std::vector<std::string>& arguments)
 {
     std::vector<std::string> fullArguments;
+    fullArguments.reserve(arguments.size());
     for (const std::string& argument : arguments)
     {
         fullArguments.push_back(ReplaceAll(argument, "@", folder.Path()));

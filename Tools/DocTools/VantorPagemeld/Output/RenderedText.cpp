@@ -20,7 +20,7 @@ bool WriteText(std::FILE* stream, std::string_view text)
 {
     // One write of all makes the kernel look for long runs of fresh memory, which takes ext4 two to four
     // times as long; blocks of 64 KB cost more calls.
-    constexpr std::size_t kBlockSize = 1024 * 1024;
+    constexpr std::size_t kBlockSize = std::size_t{1} << 20;
     for (; !text.empty(); text.remove_prefix(std::min(kBlockSize, text.size())))
     {
         const std::string_view block = text.substr(0, kBlockSize);
