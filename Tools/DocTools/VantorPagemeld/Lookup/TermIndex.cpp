@@ -3,6 +3,12 @@
 #include "Tools/DocTools/VantorPagemeld/Json/JsonValue.h"
 #include "Tools/DocTools/VantorPagemeld/Lookup/KeyedHash.h"
 
+TermIndex::TermIndex()
+{
+    // A pool without memory crashes when it is to grow what another one allocated.
+    (void)m_memberAllocator.Malloc(1);
+}
+
 void TermIndex::Follow(rapidjson::Value& object)
 {
     const bool known = m_object == &object && m_memberCount == object.MemberCount() &&
@@ -24,8 +30,7 @@ void TermIndex::Follow(rapidjson::Value& object)
     }
 }
 
-rapidjson::Value* TermIndex::FindOrAppend(rapidjson::Value::Member& member,
-                                          rapidjson::Document::AllocatorType& allocator)
+rapidjson::Value* TermIndex::FindOrAppend(rapidjson::Value::Member& member)
 {
     const std::uint64_t hash = KeyedHash(BytesOf(member.name));
     const std::uint32_t position = PositionOf(member.name, hash);
@@ -34,7 +39,7 @@ rapidjson::Value* TermIndex::FindOrAppend(rapidjson::Value::Member& member,
         return &m_members[position].value;
     }
     m_positions.Add(hash, m_memberCount);
-    m_object->AddMember(member.name, member.value, allocator);
+    m_object->AddMember(member.name, member.value, m_memberAllocator);
     NoteStorage();
     return nullptr;
 }
