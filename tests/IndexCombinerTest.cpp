@@ -103,3 +103,28 @@ TEST(IndexCombiner, MergesAsALinearSearchWould)
             << "seed " << seed;
     }
 }
+
+TEST(IndexCombiner, ManyTermsKeepTheirOrderAndNumbers)
+{
+    constexpr int kTerms =
+        100'000; // of each module, half of them in both; the object changes its memory between
+    std::vector<std::string> modules;
+    for (const int first : {0, kTerms / 2})
+    {
+        std::vector<std::string> terms;
+        for (int i = first; i < first + kTerms; ++i)
+        {
+            terms.push_back("\"t" + std::to_string(i) + "\":[0]");
+        }
+        modules.push_back(R"({"pages":[["p","P"]],"info":[["i",0]],"common":{},"searchIndex":{)" +
+                          Joined(terms) + "}}");
+    }
+    std::vector<std::string> expected;
+    for (int i = 0; i < kTerms + kTerms / 2; ++i)
+    {
+        const char* const numbers = i < kTerms / 2 ? "[0]" : i < kTerms ? "[0,1]" : "[1]";
+        expected.push_back("\"t" + std::to_string(i) + "\":" + numbers);
+    }
+    const std::string json = MergedModules<IndexCombiner>(modules).Json();
+    EXPECT_TRUE(json.find("\"searchIndex\":{" + Joined(expected) + "}}") != std::string::npos);
+}

@@ -105,7 +105,7 @@ void IndexCombiner::CombineSearchIndexJson(rapidjson::Value& combined, rapidjson
         {
             Rebase(infoNumber, infoOffset);
         }
-        if (rapidjson::Value* known = m_terms.FindOrAppend(term))
+        if (rapidjson::Value* known = m_terms.FindOrAppend(term, combinedDocument.GetAllocator()))
         {
             m_lists.MoveElements(*known, term.value, combinedDocument.GetAllocator());
         }

@@ -3,12 +3,6 @@
 #include "Tools/DocTools/VantorPagemeld/Json/JsonValue.h"
 #include "Tools/DocTools/VantorPagemeld/Lookup/KeyedHash.h"
 
-TermIndex::TermIndex()
-{
-    // A pool without memory crashes when it is to grow what another one allocated.
-    (void)m_memberAllocator.Malloc(1);
-}
-
 void TermIndex::Follow(rapidjson::Value& object)
 {
     const bool known = m_object == &object && m_memberCount == object.MemberCount() &&
@@ -30,7 +24,7 @@ void TermIndex::Follow(rapidjson::Value& object)
     }
 }
 
-rapidjson::Value* TermIndex::FindOrAppend(rapidjson::Value::Member& member)
+rapidjson::Value* TermIndex::FindOrAppend(rapidjson::Value::Member& member, Allocator& allocator)
 {
     const std::uint64_t hash = KeyedHash(BytesOf(member.name));
     const std::uint32_t position = PositionOf(member.name, hash);
@@ -39,7 +33,7 @@ rapidjson::Value* TermIndex::FindOrAppend(rapidjson::Value::Member& member)
         return &m_members[position].value;
     }
     m_positions.Add(hash, m_memberCount);
-    m_object->AddMember(member.name, member.value, m_memberAllocator);
+    m_object->AddMember(member.name, member.value, AllocatorForGrowth(allocator));
     NoteStorage();
     return nullptr;
 }
@@ -48,6 +42,21 @@ std::uint32_t TermIndex::PositionOf(const rapidjson::Value& name, std::uint64_t 
 {
     return m_positions.Find(hash,
                             [&](std::uint32_t i) { return BytesOf(m_members[i].name) == BytesOf(name); });
+}
+
+TermIndex::Allocator& TermIndex::AllocatorForGrowth(Allocator& allocator)
+{
+    constexpr rapidjson::SizeType kLargeObject = 1 << 16;
+    if (m_memberCount < kLargeObject)
+    {
+        return allocator;
+    }
+    if (m_largeObjectAllocator.Capacity() == 0)
+    {
+        // A pool without memory crashes when it is to grow what another one allocated.
+        (void)m_largeObjectAllocator.Malloc(1);
+    }
+    return m_largeObjectAllocator;
 }
 
 void TermIndex::NoteStorage()
