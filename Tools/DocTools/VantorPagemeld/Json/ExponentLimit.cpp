@@ -3,11 +3,13 @@
 #include <algorithm>
 #include <cstddef>
 #include <cstring>
+#include <string_view>
 
 namespace
 {
 
 constexpr std::size_t kMaxDigits = 9;
+constexpr std::size_t kMaxDecimals = 1'000'000'000;
 
 std::size_t CountDigits(const char* text)
 {
@@ -32,6 +34,25 @@ bool MayHaveLongExponent(const char* text)
         }
     }
     return false;
+}
+
+/// Returns the start of the first run of more than kMaxDecimals digits, or npos, as in nearly every text.
+std::size_t FindEndlessDigits(std::string_view text)
+{
+    if (text.size() <= kMaxDecimals)
+    {
+        return std::string_view::npos;
+    }
+    for (std::size_t i = 0; i < text.size();)
+    {
+        const std::size_t digits = CountDigits(text.data() + i);
+        if (digits > kMaxDecimals)
+        {
+            return i;
+        }
+        i += digits + 1;
+    }
+    return std::string_view::npos;
 }
 
 /// Returns the position of the quote that ends the string begun at start, or the end of the text.
@@ -64,6 +85,12 @@ void LimitDigits(std::string& text, std::size_t start, std::size_t count)
 
 std::optional<std::string> LimitExponents(const char* text)
 {
+    const std::size_t endlessDigits = FindEndlessDigits(text);
+    if (endlessDigits != std::string_view::npos)
+    {
+        return LimitExponents(std::string(text, endlessDigits).c_str())
+            .value_or(std::string(text, endlessDigits));
+    }
     if (!MayHaveLongExponent(text))
     {
         return std::nullopt;
