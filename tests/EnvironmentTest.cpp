@@ -9,6 +9,7 @@
 #include <cstring>
 #include <filesystem>
 
+#include <sys/stat.h>
 #include <unistd.h>
 
 namespace
@@ -123,6 +124,16 @@ TEST(Environment, SymbolicLinksAreFollowedButForOutputs)
             EXPECT_EQ(c.elsewhere, bytes.substr(0, std::strlen(c.elsewhere))) << c.link;
         }
     }
+}
+
+TEST(Environment, APipeAtATemporaryNameIsNotWrittenTo)
+{
+    const ExampleDocs docs;
+    const std::string script = docs / "a/Manual/docdata/global_index.js";
+    ASSERT_EQ(0, ::mkfifo((script + ".tmp").c_str(), 0666));
+    EXPECT_EQ(255, docs.Run().status);
+    ASSERT_TRUE(fs::is_regular_file(script));
+    EXPECT_EQ("the earlier output", ReadWholeFile(script));
 }
 
 TEST(Environment, AnyNameIsUsedAsItIs)

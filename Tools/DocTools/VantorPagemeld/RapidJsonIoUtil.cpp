@@ -12,9 +12,7 @@
 #include <new>
 #include <utility>
 
-#include <fcntl.h>
 #include <sys/stat.h>
-#include <unistd.h>
 
 namespace
 {
@@ -25,23 +23,6 @@ constexpr Diagnostics kDiagnostics("./Tools/DocTools/VantorPagemeld/RapidJsonIoU
 constexpr long kMaxFileSize = UINT32_MAX;
 
 using FileText = std::unique_ptr<char[]>;
-
-/// Opens for reading without waiting: a named pipe that nobody writes to would otherwise hold up the build
-/// for ever.
-ScopedFile OpenForReading(const char* path)
-{
-    const int descriptor = ::open(path, O_RDONLY | O_NONBLOCK | O_CLOEXEC);
-    if (descriptor < 0)
-    {
-        return nullptr;
-    }
-    ScopedFile file(::fdopen(descriptor, "rb"));
-    if (file == nullptr)
-    {
-        (void)::close(descriptor);
-    }
-    return file;
-}
 
 /// Returns the size in bytes, or -1 for what has none: a folder, whatever its file system says, or a pipe.
 /// Leaves the stream at its start.
@@ -152,7 +133,7 @@ bool OutputJsonValueToFile(const rapidjson::Value& value, const char* path)
 
 bool OutputJsonTextToFile(RepeatedText& json, const char* path)
 {
-    ScopedFile file(std::fopen(path, "w+b"));
+    ScopedFile file = OpenForWriting(path);
     if (file == nullptr)
     {
         kDiagnostics.Warning(23, "Failed to open %s for writing\n", path);

@@ -2,7 +2,7 @@
 
 #include <unistd.h>
 
-OutputFile::OutputFile(const char* path) : m_path(path), m_file(std::fopen(path, "w+b")) {}
+OutputFile::OutputFile(const char* path) : m_path(path), m_file(OpenForWriting(path)) {}
 
 OutputFile::~OutputFile()
 {

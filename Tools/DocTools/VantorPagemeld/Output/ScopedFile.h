@@ -14,3 +14,12 @@ struct FileCloser
 
 /// Owns an open C stream, or nothing when the open failed.
 using ScopedFile = std::unique_ptr<std::FILE, FileCloser>;
+
+/// Opens a file for reading. Returns nothing when that fails.
+///
+/// Waits for nobody: a named pipe that nobody writes to would otherwise hold up the build for ever.
+[[nodiscard]] ScopedFile OpenForReading(const char* path);
+
+/// Opens a file for writing and reading, created if it is missing and emptied if it is there. Returns nothing
+/// when that fails, or when a named pipe stands there, which keeps nothing and makes its writer wait.
+[[nodiscard]] ScopedFile OpenForWriting(const char* path);
