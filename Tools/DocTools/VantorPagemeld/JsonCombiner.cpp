@@ -3,6 +3,15 @@
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "Tools/DocTools/VantorPagemeld/Script/RelativePrefix.h"
 
+namespace
+{
+
+/// In bytes. The library's own choice of 64 KB is more than all that a small module holds, and there may be
+/// hundreds.
+constexpr std::size_t kPoolChunkSize = std::size_t{8} << 10;
+
+} // namespace
+
 JsonCombiner::JsonCombiner() : defaultJson("{}") {}
 
 JsonCombiner::~JsonCombiner()
@@ -23,8 +32,8 @@ bool JsonCombiner::CombineJson(const std::list<std::string>& modulePaths, const 
     int nextModuleIndex = 0;
     for (const std::string& modulePath : modulePaths)
     {
-        rapidjson::Document& document =
-            *moduleDocuments.emplace_back(std::make_unique<rapidjson::Document>());
+        rapidjson::Document& document = *moduleDocuments.emplace_back(
+            std::make_unique<rapidjson::Document>(&modulePools.emplace_back(kPoolChunkSize)));
         const std::string filePath = modulePath + "/" + fileName;
         if (!RapidJsonIoUtil::TryGetJsonDocFromFile(filePath.c_str(), document) ||
             !VerifyJSONStructure(document))

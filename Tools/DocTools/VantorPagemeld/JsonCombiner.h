@@ -5,6 +5,7 @@
 #include <rapidjson/document.h>
 
 #include <cstdio>
+#include <deque>
 #include <list>
 #include <map>
 #include <memory>
@@ -67,6 +68,7 @@ protected:
 
     std::map<int, std::string> modulePathTable;
     std::string defaultJson;
+    std::deque<rapidjson::Document::AllocatorType> modulePools; ///< one for each of the module documents
     std::vector<std::unique_ptr<rapidjson::Document>>
         moduleDocuments; ///< every one that CombineJson tried to read
 
