@@ -1,6 +1,7 @@
 #include "Runtime/Testing/RunNativeTests.h"
 #include "Runtime/Utilities/CommandLine.h"
 #include "Tools/DocTools/VantorPagemeld/DocumentationSet.h"
+#include "Tools/DocTools/VantorPagemeld/Memory/Heap.h"
 #include "Tools/DocTools/VantorPagemeld/ModuleDiscovery.h"
 #include "Tools/DocTools/VantorPagemeld/Output/Diagnostics.h"
 #include "Tools/DocTools/VantorPagemeld/Output/StandardStreams.h"
@@ -60,6 +61,7 @@ int RunDiscoveryAndCombining(std::string rootDirectory)
 int main(int argc, char* argv[])
 {
     SecureStandardStreams();
+    PrepareHeap();
     const char* const program = argc > 0 ? argv[0] : "";
     const std::string_view mode = argc > 1 ? argv[1] : "";
     const char* const argument = argc > 2 ? argv[2] : nullptr;

@@ -1,0 +1,10 @@
+#pragma once
+
+/// Fits the heap to a run that fills it with a few large documents and texts and then ends. To be called
+/// once, before those.
+///
+/// All memory comes from one region that only grows, and the first gigabyte of it lies in huge pages where
+/// the system grants them: that saves nearly all page faults, and the kernel writes out of huge pages faster.
+/// Memory is taken from the system as it is used; where the gigabyte of address space can't be had, the heap
+/// grows in small pages.
+void PrepareHeap();
