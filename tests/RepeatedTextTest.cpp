@@ -1,0 +1,86 @@
+#include "Tools/DocTools/VantorPagemeld/Output/RepeatedText.h"
+
+#include "tests/support/TemporaryFolder.h"
+#include "tests/support/WholeFile.h"
+
+#include <gtest/gtest.h>
+
+#include <cerrno>
+#include <filesystem>
+
+#include <sys/stat.h>
+#include <unistd.h>
+
+// The linker redirects ioctl to the function here (--wrap), which clones on every file system.
+
+namespace
+{
+
+int s_refusal = EOPNOTSUPP;            ///< the error that clones end with, or 0 for clones that succeed
+std::vector<std::size_t> s_cloneSizes; ///< of all clones that succeeded
+
+int Fail(int error)
+{
+    errno = error;
+    return -1;
+}
+
+} // namespace
+
+extern "C" int Clone(int file, unsigned long request, int original) __asm__("__wrap_ioctl");
+
+int Clone(int file, unsigned long /*request*/, int original)
+{
+    struct stat status = {};
+    if (s_refusal != 0 || ::fstat(original, &status) != 0)
+    {
+        return Fail(s_refusal);
+    }
+    std::string bytes(static_cast<std::size_t>(status.st_size), '\0');
+    const ssize_t size = status.st_size;
+    if (::pread(original, bytes.data(), bytes.size(), 0) != size ||
+        ::pwrite(file, bytes.data(), bytes.size(), 0) != size)
+    {
+        return Fail(EINVAL);
+    }
+    s_cloneSizes.push_back(bytes.size());
+    return 0;
+}
+
+TEST(RepeatedText, EveryFileIsWholeAndAsManyAsCanBeAreClones)
+{
+    constexpr std::size_t kSize = (std::size_t{1} << 20) + 1;
+    const struct
+    {
+        const char* what;
+        std::vector<const char*> names;
+        int refusal;
+        std::vector<std::size_t> cloneSizes;
+    } cases[] = {
+        {"clones", {"a", "b", "c"}, 0, {kSize, kSize}},
+        {"refused", {"a", "b", "c"}, EXDEV, {}},
+        {"the original is opened again, which empties it", {"a", "a", "b"}, 0, {0, kSize}},
+        {"the first device is full", {"full", "a", "b"}, 0, {kSize}},
+        {"a later device is full", {"a", "full", "b"}, 0, {kSize}},
+    };
+    for (const auto& c : cases)
+    {
+        const TemporaryFolder folder;
+        std::filesystem::create_symlink("/dev/full", folder / "full");
+        std::string text(kSize, 'x');
+        text.front() = '[';
+        text.back() = ']';
+        RenderedText rendered;
+        AppendText(rendered, text);
+        RepeatedText repeated(std::move(rendered));
+        s_refusal = c.refusal;
+        s_cloneSizes.clear();
+        for (const std::string name : c.names)
+        {
+            repeated.WriteTo(ScopedFile(std::fopen((folder / name).c_str(), "w+b")));
+            EXPECT_TRUE(name == "full" || ReadWholeFile(folder / name) == text) << name << ": " << c.what;
+        }
+        s_refusal = EOPNOTSUPP;
+        EXPECT_EQ(c.cloneSizes, s_cloneSizes) << c.what;
+    }
+}
