@@ -131,6 +131,18 @@ TEST(JsonReading, LongExponentsOverflowNothing)
               RapidJsonIoUtil::OutputJsonValueToString(document));
 }
 
+TEST(JsonReading, MoreThanABillionDigitsAreRefusedWhereTheyBegin)
+{
+#ifdef __SANITIZE_ADDRESS__
+    GTEST_SKIP() << "the sanitizer would take seconds for a text so long";
+#endif
+    std::string text = "0.";
+    text.resize(1'000'000'003, '0');
+    rapidjson::Document document;
+    EXPECT_FALSE(RapidJsonIoUtil::TryGetJsonDocFromString(text.c_str(), document));
+    EXPECT_EQ(2U, document.GetErrorOffset());
+}
+
 TEST(JsonReading, EveryTruncationIsAParseError)
 {
     const std::string texts[] = {
