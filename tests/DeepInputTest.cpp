@@ -1,8 +1,10 @@
 #include "Tools/DocTools/VantorPagemeld/Json/JsonReader.h"
-#include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
+#include "tests/support/MergedModules.h"
+#include "tests/support/Repeated.h"
 
 #include <gtest/gtest.h>
+#include <rapidjson/prettywriter.h>
 
 #include <functional>
 
@@ -13,25 +15,18 @@
 namespace
 {
 
-std::string Repeat(const std::string& text, std::size_t times)
-{
-    std::string all;
-    for (std::size_t i = 0; i < times; ++i)
-    {
-        all += text;
-    }
-    return all;
-}
+#if defined(__SANITIZE_ADDRESS__) || !defined(__OPTIMIZE__)
+constexpr std::size_t kStackBytes = 64 << 20; // the frames of this build are larger
+#else
+constexpr std::size_t kStackBytes = 2 << 20;
+#endif
 
-/// Calls the function on a thread with a stack of 2 MiB, and waits for it.
+/// Calls the function on a thread with a small stack, and waits for it.
 void RunOnSmallStack(std::function<void()> function)
 {
-#if defined(__SANITIZE_ADDRESS__) || !defined(__OPTIMIZE__)
-    GTEST_SKIP() << "the frames of this build are larger";
-#endif
     pthread_attr_t attributes;
     ASSERT_EQ(0, ::pthread_attr_init(&attributes));
-    ASSERT_EQ(0, ::pthread_attr_setstacksize(&attributes, 2 << 20));
+    ASSERT_EQ(0, ::pthread_attr_setstacksize(&attributes, kStackBytes));
     pthread_t thread = {};
     const auto call = [](void* callee) -> void*
     {
@@ -43,28 +38,30 @@ void RunOnSmallStack(std::function<void()> function)
     ::pthread_attr_destroy(&attributes);
 }
 
+/// Returns the indented form without its blanks, which can be more than half a gigabyte.
+std::string Lines(const rapidjson::Value& value)
+{
+    RenderedText text;
+    rapidjson::PrettyWriter<RenderedText> writer(text);
+    writer.SetIndent(' ', 0);
+    EXPECT_TRUE(value.Accept(writer));
+    return text.GetString();
+}
+
 void MergeDeepTocs()
 {
     constexpr std::size_t kLevels = kMaxNestingDepth / 2;
-    const std::string deep =
-        Repeat(R"({"link":"l","title":"t","children":[)", kLevels) + Repeat("]}", kLevels);
-    TocCombiner combiner;
-    rapidjson::Document documents[3];
+    const std::string node = R"({"link":"l","title":"t","children":[)";
+    const std::string deep = Repeated(node, kLevels) + Repeated("]}", kLevels);
     // The second is copied below the first, the third merged with it level by level.
-    const std::string texts[] = {R"({"link":"l","title":"t","children":null})", deep, deep};
-    for (int i = 0; i < 3; ++i)
-    {
-        ASSERT_TRUE(RapidJsonIoUtil::TryGetJsonDocFromString(texts[i].c_str(), documents[i]));
-        ASSERT_TRUE(combiner.VerifyJSONStructure(documents[i]));
-        combiner.AddModuleIndexToEachEntry(documents[i], i);
-        combiner.AppendJsonDocument(documents[i]);
-    }
-    EXPECT_EQ(Repeat(R"({"link":"l","title":"t","children":[)", kLevels) +
-                  Repeat(R"(],"module":1})", kLevels - 1) + R"(],"module":0})",
-              RapidJsonIoUtil::OutputJsonValueToString(combiner.combinedDocument));
+    MergedModules<TocCombiner> merged({R"({"link":"l","title":"t","children":null})", deep, deep});
+    TocCombiner& combiner = merged.Get();
+    EXPECT_TRUE(combiner.VerifyJSONStructure(combiner.combinedDocument));
+    EXPECT_EQ(Repeated(node, kLevels) + Repeated(R"(],"module":1})", kLevels - 1) + R"(],"module":0})",
+              merged.Json());
     EXPECT_EQ("toc = {\n\"link\": \"l\",\"title\": \"t\",\"children\": [" +
-                  Repeat(R"({"link": p1+"l","title": "t","children": [)", kLevels - 1) +
-                  Repeat("]}", kLevels - 1) + "]};\n",
+                  Repeated(R"({"link": p1+"l","title": "t","children": [)", kLevels - 1) +
+                  Repeated("]}", kLevels - 1) + "]};\n",
               TextOf(*combiner.RenderScript(combiner.combinedDocument)));
 }
 
@@ -72,19 +69,26 @@ void MergeDeepTocs()
 
 TEST(DeepInput, ArraysAndObjectsAreReadCopiedAndWritten)
 {
-    const std::string texts[] = {
-        Repeat("[", kMaxNestingDepth) + Repeat("]", kMaxNestingDepth),
-        Repeat("{\"a\":", kMaxNestingDepth - 1) + "{}" + Repeat("}", kMaxNestingDepth - 1),
+    const struct
+    {
+        std::string text;
+        std::string lines;
+    } cases[] = {
+        {Repeated("[", kMaxNestingDepth) + Repeated("]", kMaxNestingDepth),
+         Repeated("[\n", kMaxNestingDepth - 1) + "[]" + Repeated("\n]", kMaxNestingDepth - 1)},
+        {Repeated("{\"a\":", kMaxNestingDepth - 1) + "{}" + Repeated("}", kMaxNestingDepth - 1),
+         Repeated("{\n\"a\": ", kMaxNestingDepth - 1) + "{}" + Repeated("\n}", kMaxNestingDepth - 1)},
     };
-    for (const std::string& text : texts)
+    for (const auto& c : cases)
     {
         RunOnSmallStack(
             [&]
             {
-                rapidjson::Document document;
-                ASSERT_TRUE(RapidJsonIoUtil::TryGetJsonDocFromString(text.c_str(), document));
-                const rapidjson::Value copy(document, document.GetAllocator());
-                EXPECT_EQ(text, RapidJsonIoUtil::OutputJsonValueToString(copy));
+                const rapidjson::Document document = ParsedJson(c.text);
+                rapidjson::Document::AllocatorType allocator;
+                const rapidjson::Value copy(document, allocator);
+                EXPECT_EQ(c.text, RapidJsonIoUtil::OutputJsonValueToString(copy));
+                EXPECT_EQ(c.lines, Lines(copy));
             });
     }
 }

@@ -1,3 +1,4 @@
+#include "tests/support/ParsedJson.h"
 #include "tests/support/RunProgram.h"
 #include "tests/support/WholeFile.h"
 
@@ -52,69 +53,16 @@ std::string OutputNames(const TemporaryFolder& folder)
     return names;
 }
 
-const char* const kIndexJson = R"({
-    "pages": [
-        [
-            "a.html",
-            "Say \"A\"",
-            0
-        ],
-        [
-            "b.html",
-            "Ä/B",
-            1
-        ]
-    ],
-    "info": [
-        [
-            "About \"A\"",
-            0
-        ],
-        [
-            "b\n",
-            1
-        ]
-    ],
-    "common": {
-        "the": 1
-    },
-    "searchIndex": {
-        "say": [
-            0,
-            1
-        ],
-        "b": [
-            1
-        ]
-    }
-})";
+/// Returns the indented form of a JSON text.
+std::string Pretty(const std::string& json)
+{
+    return RapidJsonIoUtil::RenderPrettyJson(ParsedJson(json)).GetString();
+}
 
-const char* const kTocJson = R"({
-    "link": "toc",
-    "title": "toc",
-    "children": [
-        {
-            "link": "a.html",
-            "title": "Say \"A\"",
-            "children": null,
-            "module": 0
-        },
-        {
-            "link": "null",
-            "title": "B",
-            "children": [
-                {
-                    "link": "b.html",
-                    "title": "",
-                    "children": [],
-                    "module": 1
-                }
-            ],
-            "module": 1
-        }
-    ],
-    "module": 0
-})";
+const char* const kIndexJson =
+    R"({"pages":[["a.html","Say \"A\"",0],["b.html","Ä/B",1]],"info":[["About \"A\"",0],["b\n",1]],"common":{"the":1},"searchIndex":{"say":[0,1],"b":[1]}})";
+const char* const kTocJson =
+    R"({"link":"toc","title":"toc","children":[{"link":"a.html","title":"Say \"A\"","children":null,"module":0},{"link":"null","title":"B","children":[{"link":"b.html","title":"","children":[],"module":1}],"module":1}],"module":0})";
 
 const char* const kIndexScript = R"(pages = [
 [p0 + "a.html", "Say \"A\""],
@@ -158,9 +106,9 @@ status 0
     for (const auto& [module, lines] : prefixes)
     {
         const std::string docdata = "docs/" + module + "/Manual/docdata/";
-        expected[docdata + "global_index.json"] = kIndexJson;
+        expected[docdata + "global_index.json"] = Pretty(kIndexJson);
         expected[docdata + "global_index.js"] = lines + kIndexScript;
-        expected[docdata + "global_toc.json"] = kTocJson;
+        expected[docdata + "global_toc.json"] = Pretty(kTocJson);
         expected[docdata + "global_toc.js"] = lines + kTocScript;
 
         const ProgramResult check = RunProgram(NODE_PROGRAM, {CHECK_SCRIPTS, folder / docdata});

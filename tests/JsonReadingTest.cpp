@@ -1,6 +1,7 @@
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "tests/support/CapturedStderr.h"
 #include "tests/support/ParsedJson.h"
+#include "tests/support/Repeated.h"
 #include "tests/support/ReplaceAll.h"
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/WholeFile.h"
@@ -18,16 +19,6 @@ namespace
 {
 
 const std::string kTag = "./Tools/DocTools/VantorPagemeld/RapidJsonIoUtil:";
-
-std::string Repeated(const std::string& text, int count)
-{
-    std::string all;
-    for (int i = 0; i < count; ++i)
-    {
-        all += text;
-    }
-    return all;
-}
 
 /// Reads a file into a document, and returns what was reported, with @ for the path; "read" when it was
 /// accepted.
@@ -141,27 +132,6 @@ TEST(JsonReading, MoreThanABillionDigitsAreRefusedWhereTheyBegin)
     rapidjson::Document document;
     EXPECT_FALSE(RapidJsonIoUtil::TryGetJsonDocFromString(text.c_str(), document));
     EXPECT_EQ(2U, document.GetErrorOffset());
-}
-
-TEST(JsonReading, EveryTruncationIsAParseError)
-{
-    const std::string texts[] = {
-        R"({"pages":[["a.html","\u00c4 \"A\""],["b","B"]],"info":[["t",0],["u",1]],"common":{"a":1},"searchIndex":{"a":[0,1]}})",
-        R"({"link":"toc","title":"t","children":[{"link":"null","title":"G","children":[{"link":"a","title":"\\","children":null}]}]})",
-    };
-    const TemporaryFolder folder;
-    rapidjson::Document document;
-    for (const std::string& text : texts)
-    {
-        for (std::size_t length = 0; length < text.size(); ++length)
-        {
-            WriteWholeFile(folder / "file", text.substr(0, length));
-            const std::string report = Read(folder / "file", document);
-            EXPECT_EQ(0U, report.find("ERROR: " + kTag + "71 Failed to parse JSON file @, error at offset: "))
-                << text.substr(0, length) << report;
-        }
-        EXPECT_TRUE(RapidJsonIoUtil::TryGetJsonDocFromString(text.c_str(), document));
-    }
 }
 
 TEST(JsonReading, PublicSuiteHasTheExpectedOutcomes)

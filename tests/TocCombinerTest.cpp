@@ -3,7 +3,6 @@
 #include "tests/support/MergedModules.h"
 
 #include <gtest/gtest.h>
-#include <rapidjson/prettywriter.h>
 
 #include <cstring>
 #include <random>
@@ -130,30 +129,4 @@ TEST(TocCombiner, MergesAsALinearSearchWould)
                   MergedModules<TocCombiner>(modules).Json())
             << "seed " << seed;
     }
-}
-
-TEST(TocCombiner, TreesAtTheDepthLimitPassThroughEveryStep)
-{
-    constexpr int kNodes = 5'000; // each an object and a list
-    std::string deep;
-    std::string ends;
-    for (int i = 0; i < kNodes; ++i)
-    {
-        deep += R"({"link":"l","title":"t","children":[)";
-        ends += "]}";
-    }
-    deep += ends;
-    // Into the second module's tree, which was copied into the leaf of the first, the third is merged.
-    MergedModules<TocCombiner> merged({R"({"link":"l","title":"t","children":null})", deep, deep});
-    EXPECT_TRUE(merged.Get().VerifyJSONStructure(merged.Get().combinedDocument));
-    EXPECT_EQ(deep.size() + kNodes * std::string(R"(,"module":0)").size(), merged.Json().size());
-    const auto text = merged.Get().RenderScript(merged.Get().combinedDocument);
-    EXPECT_NE(std::string::npos, TextOf(*text).find(R"(toc = {
-"link": "l","title": "t","children": [{"link": p1+"l","title": "t","children": [{"link": p1+)"));
-
-    // The pretty form without its blanks, which would be more than half a gigabyte.
-    RenderedText pretty;
-    rapidjson::PrettyWriter<RenderedText> writer(pretty);
-    writer.SetIndent(' ', 0);
-    EXPECT_TRUE(merged.Get().combinedDocument.Accept(writer));
 }

@@ -3,11 +3,8 @@
 
 #include <gtest/gtest.h>
 
-#include <csignal>
 #include <filesystem>
-#include <functional>
 
-#include <sys/resource.h>
 #include <unistd.h>
 
 // What a run leaves on the disk when writing fails, or when it is killed. A script is whole and new, or whole
@@ -23,31 +20,6 @@ ProgramResult RunAsOrdinaryUser(const ExampleDocs& docs)
 {
     return ::geteuid() == 0 ? docs.Run({"setpriv", "--bounding-set=-dac_override"}) : docs.Run();
 }
-
-/// Lets no process started from here write beyond so many bytes of a file, and has such writes fail.
-class FileSizeLimit
-{
-public:
-    explicit FileSizeLimit(std::size_t bytes) : m_handler(std::signal(SIGXFSZ, SIG_IGN))
-    {
-        ::getrlimit(RLIMIT_FSIZE, &m_before);
-        const rlimit limit = {bytes, m_before.rlim_max};
-        ::setrlimit(RLIMIT_FSIZE, &limit);
-    }
-
-    ~FileSizeLimit()
-    {
-        ::setrlimit(RLIMIT_FSIZE, &m_before);
-        (void)std::signal(SIGXFSZ, m_handler);
-    }
-
-    FileSizeLimit(const FileSizeLimit&) = delete;
-    FileSizeLimit& operator=(const FileSizeLimit&) = delete;
-
-private:
-    rlimit m_before = {};
-    void (*m_handler)(int);
-};
 
 std::string CutAt(std::size_t limit, const std::vector<ExampleDocs::Output>& outputs)
 {
@@ -71,10 +43,8 @@ TEST(WriteFault, FileSizeLimitAtAnyByteLeavesWholeScripts)
     for (std::size_t limit = 0; limit <= longest; ++limit)
     {
         docs.Restore();
-        {
-            const FileSizeLimit fileSizeLimit(limit);
-            EXPECT_EQ(0, docs.Run().status);
-        }
+        const std::string option = "--fsize=" + std::to_string(limit);
+        EXPECT_EQ(0, docs.Run({"env", "--ignore-signal=XFSZ", "prlimit", option}).status);
         EXPECT_EQ(CutAt(limit, docs.Outputs()), docs.Describe()) << "at a limit of " << limit << " bytes";
     }
 }
@@ -114,60 +84,43 @@ head -c $(( ($(stat -f -c %f disk) - $2) * $(stat -f -c %s disk) )) /dev/zero > 
 
 TEST(WriteFault, ObstaclesLeaveWhatTheyMust)
 {
-    const auto blockWithFolder = [](const char* name)
+    using Prepare = void (*)(const std::string& path);
+    const Prepare putFolder = [](const std::string& path)
     {
-        return [name](const ExampleDocs& docs)
-        {
-            fs::remove(docs / name);
-            fs::create_directory(docs / name);
-        };
+        fs::remove(path);
+        fs::create_directory(path);
     };
+    const Prepare putStaleFile = [](const std::string& path)
+    { WriteWholeFile(path, std::string(10'000, 'x')); };
+    const Prepare forbidWriting = [](const std::string& path)
+    { fs::permissions(path, fs::perms::owner_read | fs::perms::owner_exec); };
     const struct
     {
-        const char* obstacle;
-        std::function<void(const ExampleDocs&)> prepare;
+        Prepare prepare;
+        const char* name;
         int status;
         const char* outputs;
     } cases[] = {
-        {"none", [](const ExampleDocs&) {}, 0, "NNNN NNNN"},
-        {"stale temporary files",
-         [](const ExampleDocs& docs)
-         {
-             for (const auto& output : docs.Outputs())
-             {
-                 WriteWholeFile(docs / output.path + ".tmp", std::string(10'000, 'x'));
-             }
-         },
-         0, "NNNN NNNN"},
-        {"read-only folder a",
-         [](const ExampleDocs& docs)
-         { fs::permissions(docs / "a/Manual/docdata", fs::perms::owner_read | fs::perms::owner_exec); },
-         255, "OOOO OOOO"},
-        {"read-only folder b",
-         [](const ExampleDocs& docs)
-         { fs::permissions(docs / "b/Manual/docdata", fs::perms::owner_read | fs::perms::owner_exec); },
-         255, "NNNN OOOO"},
-        {"folder global_index.json.tmp", blockWithFolder("a/Manual/docdata/global_index.json.tmp"), 0,
-         "O[D]NNN NNNN"},
-        {"folder global_index.js.tmp", blockWithFolder("a/Manual/docdata/global_index.js.tmp"), 255,
-         "NO[D]OO OOOO"},
-        {"folder global_toc.json.tmp", blockWithFolder("a/Manual/docdata/global_toc.json.tmp"), 0,
-         "NNO[D]N NNNN"},
-        {"folder global_toc.js.tmp", blockWithFolder("a/Manual/docdata/global_toc.js.tmp"), 0,
-         "NNNO[D] NNNN"},
+        {putStaleFile, "a/Manual/docdata/global_index.json.tmp", 0, "NNNN NNNN"},
+        {putStaleFile, "a/Manual/docdata/global_toc.js.tmp", 0, "NNNN NNNN"},
+        {forbidWriting, "a/Manual/docdata", 255, "OOOO OOOO"},
+        {forbidWriting, "b/Manual/docdata", 255, "NNNN OOOO"},
+        {putFolder, "a/Manual/docdata/global_index.json.tmp", 0, "O[D]NNN NNNN"},
+        {putFolder, "a/Manual/docdata/global_index.js.tmp", 255, "NO[D]OO OOOO"},
+        {putFolder, "a/Manual/docdata/global_toc.json.tmp", 0, "NNO[D]N NNNN"},
+        {putFolder, "a/Manual/docdata/global_toc.js.tmp", 0, "NNNO[D] NNNN"},
         // A rename on to a folder fails, and is not reported.
-        {"folder global_index.json", blockWithFolder("a/Manual/docdata/global_index.json"), 0,
-         "D[N]NNN NNNN"},
-        {"folder global_index.js", blockWithFolder("a/Manual/docdata/global_index.js"), 0, "ND[N]NN NNNN"},
-        {"folder global_toc.json", blockWithFolder("a/Manual/docdata/global_toc.json"), 0, "NND[N]N NNNN"},
-        {"folder global_toc.js", blockWithFolder("a/Manual/docdata/global_toc.js"), 0, "NNND[N] NNNN"},
+        {putFolder, "a/Manual/docdata/global_index.json", 0, "D[N]NNN NNNN"},
+        {putFolder, "a/Manual/docdata/global_index.js", 0, "ND[N]NN NNNN"},
+        {putFolder, "a/Manual/docdata/global_toc.json", 0, "NND[N]N NNNN"},
+        {putFolder, "a/Manual/docdata/global_toc.js", 0, "NNND[N] NNNN"},
     };
     const ExampleDocs docs;
     for (const auto& c : cases)
     {
-        c.prepare(docs);
-        EXPECT_EQ(c.status, RunAsOrdinaryUser(docs).status) << c.obstacle;
-        EXPECT_EQ(c.outputs, docs.Describe()) << c.obstacle;
+        c.prepare(docs / c.name);
+        EXPECT_EQ(c.status, RunAsOrdinaryUser(docs).status) << c.name;
+        EXPECT_EQ(c.outputs, docs.Describe()) << c.name;
         docs.Restore();
     }
 }
