@@ -1,9 +1,9 @@
 #include "Tools/DocTools/VantorPagemeld/IndexCombiner.h"
 #include "Tools/DocTools/VantorPagemeld/Json/JsonReader.h"
-#include "Tools/DocTools/VantorPagemeld/Json/JsonValue.h"
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "Tools/DocTools/VantorPagemeld/Script/IndexScript.h"
 #include "Tools/DocTools/VantorPagemeld/Structure/IndexStructure.h"
+#include "fuzz/PlainMerge.h"
 #include "fuzz/Property.h"
 #include "fuzz/ScriptForm.h"
 
@@ -20,71 +20,6 @@ using rapidjson::Value;
 constexpr const char* kFirstModule = R"({"pages":[["a.html","A \"quoted\" \\ title"],["b\"c\\.html",""]],)"
                                      R"("info":[["text",0],["",1]],"common":{},)"
                                      R"("searchIndex":{"a":[0,1],"b":[1],"":[],"b":[0]}})";
-
-/// The merge as the format words it: every term is searched for from the first on, every value copied.
-class PlainMerge
-{
-public:
-    PlainMerge() { m_merged.Parse(R"({"pages":[],"info":[],"common":{},"searchIndex":{}})"); }
-
-    [[nodiscard]] const Value& Merged() const { return m_merged; }
-
-    void Append(const Value& input, int moduleIndex)
-    {
-        const auto pageOffset = static_cast<int>(m_merged["pages"].Size());
-        const auto infoOffset = static_cast<int>(m_merged["info"].Size());
-        if (m_merged["common"].ObjectEmpty())
-        {
-            m_merged["common"].CopyFrom(input["common"], m_merged.GetAllocator());
-        }
-        for (const Value& page : input["pages"].GetArray())
-        {
-            Push(m_merged["pages"], page).PushBack(moduleIndex, m_merged.GetAllocator());
-        }
-        for (const Value& info : input["info"].GetArray())
-        {
-            Raise(Push(m_merged["info"], info)[1], pageOffset, input["pages"].Size());
-        }
-        for (const auto& term : input["searchIndex"].GetObject())
-        {
-            Value& postings = PostingsOf(term.name);
-            for (const Value& number : term.value.GetArray())
-            {
-                Raise(Push(postings, number), infoOffset, input["info"].Size());
-            }
-        }
-    }
-
-private:
-    Value& Push(Value& list, const Value& element)
-    {
-        list.PushBack(Value(element, m_merged.GetAllocator()), m_merged.GetAllocator());
-        return list[list.Size() - 1];
-    }
-
-    static void Raise(Value& number, int offset, rapidjson::SizeType count)
-    {
-        Require(number.GetInt() >= 0 && number.GetUint() < count, "a checked number is in its bounds");
-        number = number.GetInt() + offset;
-    }
-
-    Value& PostingsOf(const Value& term)
-    {
-        Value& terms = m_merged["searchIndex"];
-        for (auto& known : terms.GetObject())
-        {
-            if (BytesOf(known.name) == BytesOf(term))
-            {
-                return known.value;
-            }
-        }
-        terms.AddMember(Value(term, m_merged.GetAllocator()), Value(rapidjson::kArrayType),
-                        m_merged.GetAllocator());
-        return (terms.MemberEnd() - 1)->value;
-    }
-
-    rapidjson::Document m_merged;
-};
 
 bool IsSound(const Value& document)
 {
@@ -113,7 +48,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
 
     std::list<rapidjson::Document> documents; // they hold the values of the merged one
     IndexCombiner combiner;
-    PlainMerge plain;
+    PlainIndexMerge plain;
     int moduleIndex = 0;
     for (const std::string& text : texts)
     {

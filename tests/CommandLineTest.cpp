@@ -1,3 +1,4 @@
+#include "tests/support/ReplaceAll.h"
 #include "tests/support/RunProgram.h"
 #include "tests/support/WholeFile.h"
 
@@ -50,12 +51,55 @@ status 0
     EXPECT_TRUE(ReadTree(folder.Path()).empty());
 }
 
-TEST(CommandLine, SelfTestModeWritesNothingToStandardError)
+TEST(CommandLine, SelfTestModeRunsTheTestsThatTheFilterNames)
 {
-    const ProgramResult result =
-        RunProgram(PAGEMELD_PROGRAM, {"-runNativeTests", "no test has this name", "ignored"});
-    EXPECT_EQ(0, result.status);
-    EXPECT_EQ("", result.standardError);
+    const char* const all =
+        R"([IndexCombiner]  TryGetJsonDocFromString_ValidString_ReturnsTrue             PASS(Nms)
+[IndexCombiner]  AppendJsonDocument_OneValueJson_ProducesThatJson            PASS(Nms)
+[IndexCombiner]  AppendJsonDocument_TwoValidJsons_ProducesCombinedJson       PASS(Nms)
+[TocCombiner]    TryGetJsonDocFromString_ValidString_ReturnsTrue             PASS(Nms)
+[TocCombiner]    AppendJsonDocument_OneValueJson_ProducesThatJson            PASS(Nms)
+[TocCombiner]    AppendJsonDocument_TrivialAndSimpleJson_ProducesSimpleJson  PASS(Nms)
+Ran 6 tests with 0 failures in N seconds
+status 0
+)";
+    const struct
+    {
+        std::vector<std::string> arguments;
+        const char* report;
+    } cases[] = {
+        {{}, all},
+        {{""}, all},
+        {{"."}, all},
+        {{"valid"}, R"([IndexCombiner]  TryGetJsonDocFromString_ValidString_ReturnsTrue        PASS(Nms)
+[IndexCombiner]  AppendJsonDocument_TwoValidJsons_ProducesCombinedJson  PASS(Nms)
+[TocCombiner]    TryGetJsonDocFromString_ValidString_ReturnsTrue        PASS(Nms)
+Ran 3 tests with 0 failures in N seconds
+status 0
+)"},
+        {{"TOCCOMBINER", "extra"},
+         R"([TocCombiner]  TryGetJsonDocFromString_ValidString_ReturnsTrue             PASS(Nms)
+[TocCombiner]  AppendJsonDocument_OneValueJson_ProducesThatJson            PASS(Nms)
+[TocCombiner]  AppendJsonDocument_TrivialAndSimpleJson_ProducesSimpleJson  PASS(Nms)
+Ran 3 tests with 0 failures in N seconds
+status 0
+)"},
+        {{".trivial", "--Automated"},
+         R"text(##qzm:{"type":"TestStatus","version":2,"phase":"Begin","time":N,"processId":N,"name":"TocCombiner.AppendJsonDocument_TrivialAndSimpleJson_ProducesSimpleJson","state":0}
+##qzm:{"type":"TestStatus","version":2,"phase":"End","time":N,"processId":N,"name":"TocCombiner.AppendJsonDocument_TrivialAndSimpleJson_ProducesSimpleJson","state":4,"message":"","fileName":"#TocCombinerTests","lineNumber":57,"durationMicroseconds":N,"duration":N}
+status 0
+)text"},
+        {{"no such test"}, R"(Ran 0 tests with 0 failures in N seconds
+status 0
+)"},
+        {{"-automated"}, "status 0\n"}, // the switch stands in the filter's place, and so is the filter too
+    };
+    for (const auto& c : cases)
+    {
+        std::vector<std::string> arguments = {"-runNativeTests"};
+        arguments.insert(arguments.end(), c.arguments.begin(), c.arguments.end());
+        EXPECT_EQ(c.report, WithoutNumbers(ReportOfRun(TemporaryFolder(), arguments)));
+    }
 }
 
 TEST(CommandLine, VerificationStopsAtTheFirstFileThatFails)

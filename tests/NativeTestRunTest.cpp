@@ -12,6 +12,7 @@
 #include "Runtime/Utilities/CommandLine.h"
 #include "tests/support/CapturedConsole.h"
 #include "tests/support/DescribedTests.h"
+#include "tests/support/ReplaceAll.h"
 
 #include <gtest/gtest.h>
 
@@ -48,13 +49,6 @@ private:
     std::vector<const char*> m_commandLine;
 };
 
-/// Returns what a run printed, with times and the like, which differ from run to run, as N.
-std::string TextOf(const CapturedConsole& console)
-{
-    return console.GetTextWithoutNumbers({"PASS(", "failures in ", R"("time":)", R"("processId":)",
-                                          R"("durationMicroseconds":)", R"("duration":)"});
-}
-
 /// What a run returned and printed.
 struct Outcome
 {
@@ -67,7 +61,7 @@ Outcome RunAndCapture(UnitTest::TestList& tests)
     const CapturedConsole console;
     TestFilter filter;
     const int failedTestCount = RunNativeTests(filter, tests);
-    return {failedTestCount, TextOf(console)};
+    return {failedTestCount, WithoutNumbers(console.GetText())};
 }
 
 bool Holds()
@@ -243,7 +237,7 @@ TEST(NativeTestRun, RunsTheCompiledInTestsThatCategoryAndNameSelect)
     {
         const CapturedConsole console;
         EXPECT_EQ(0, RunNativeTests(c.categoryFilter, c.nameFilter));
-        EXPECT_EQ(c.expected, TextOf(console)) << c.categoryFilter << "|" << c.nameFilter;
+        EXPECT_EQ(c.expected, WithoutNumbers(console.GetText())) << c.categoryFilter << "|" << c.nameFilter;
     }
 }
 
@@ -261,7 +255,7 @@ TEST(TestRunner, RunsTheWantedTestsOfASuiteAndReturnsTheFailures)
     EXPECT_EQ(2, UnitTest::TestRunner(reporter).RunTestsIf(tests.list, "Own", hasName));
     EXPECT_EQ("[Own]  Fails  FAIL!!!!\n\tCHECK FAILURE: wrong (file:1)\n"
               "Ran 1 tests with 1 failures in N seconds\n\tFAILED: Fails [Own]\n",
-              TextOf(console));
+              WithoutNumbers(console.GetText()));
 }
 
 TEST(TestRunner, ReportsTimesInSeconds)

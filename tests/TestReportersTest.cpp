@@ -3,6 +3,7 @@
 #include "Runtime/Testing/IgnoredTests.h"
 #include "Runtime/Utilities/NonPrintableChars.h"
 #include "tests/support/CapturedConsole.h"
+#include "tests/support/ReplaceAll.h"
 
 #include <gtest/gtest.h>
 
@@ -108,7 +109,7 @@ CHECK FAILURE:
 ##qzm:{"type":"TestStatus","version":2,"phase":"Begin","time":N,"processId":N,"name":"Suite.Test","state":0}
 ##qzm:{"type":"TestStatus","version":2,"phase":"End","time":N,"processId":N,"name":"Suite.Test","state":4,"message":"","fileName":"file","lineNumber":7,"durationMicroseconds":18446744073709051616,"duration":18446744073709051}
 )text",
-        console.GetTextWithoutNumbers({R"("time":)", R"("processId":)"}));
+        WithoutNumbers(console.GetText(), {R"("time":)", R"("processId":)"}));
 }
 
 TEST(IgnoredTests, AreSortedAndGroupedByCaseAndReason)

@@ -1,10 +1,10 @@
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
 
+#include "fuzz/PlainMerge.h"
 #include "tests/support/MergedModules.h"
 
 #include <gtest/gtest.h>
 
-#include <cstring>
 #include <random>
 
 namespace
@@ -27,43 +27,6 @@ std::string RandomChildren(std::mt19937& random, int levels)
                         "\",\"children\":" + RandomChildren(random, levels - 1) + "}");
     }
     return "[" + Joined(nodes) + "]";
-}
-
-bool IsSame(const rapidjson::Value& a, const rapidjson::Value& b)
-{
-    return std::strcmp(a["link"].GetString(), b["link"].GetString()) == 0 &&
-           std::strcmp(a["title"].GetString(), b["title"].GetString()) == 0;
-}
-
-/// The merge as one would explain it: every entry is searched for from the first to the last.
-void MergeChildren(rapidjson::Document& combined, rapidjson::Value& destination,
-                   const rapidjson::Value& source)
-{
-    if (source.IsNull())
-    {
-        return;
-    }
-    if (destination.IsNull())
-    {
-        destination.CopyFrom(source, combined.GetAllocator());
-        return;
-    }
-    for (const auto& entry : source.GetArray())
-    {
-        auto* found = destination.Begin();
-        while (found != destination.End() && !IsSame(*found, entry))
-        {
-            ++found;
-        }
-        if (found == destination.End())
-        {
-            destination.PushBack(rapidjson::Value(entry, combined.GetAllocator()), combined.GetAllocator());
-        }
-        else
-        {
-            MergeChildren(combined, (*found)["children"], entry["children"]);
-        }
-    }
 }
 
 } // namespace
@@ -115,17 +78,13 @@ TEST(TocCombiner, MergesAsALinearSearchWould)
     {
         std::mt19937 random(seed);
         std::vector<std::string> modules;
-        TocCombiner tagger; // owns the tags
-        rapidjson::Document expected =
-            ParsedJson(R"({"link":"toc","title":"toc","children":null,"module":0})");
+        PlainTocMerge plain;
         for (int index = 0; index < 5; ++index)
         {
             modules.push_back(R"({"link":"toc","title":"toc","children":)" + RandomChildren(random, 4) + "}");
-            rapidjson::Document module = ParsedJson(modules.back());
-            tagger.AddModuleIndexToEachEntry(module, index);
-            MergeChildren(expected, expected["children"], module["children"]);
+            plain.Append(ParsedJson(modules.back()), index);
         }
-        EXPECT_EQ(RapidJsonIoUtil::OutputJsonValueToString(expected),
+        EXPECT_EQ(RapidJsonIoUtil::OutputJsonValueToString(plain.Merged()),
                   MergedModules<TocCombiner>(modules).Json())
             << "seed " << seed;
     }

@@ -2,6 +2,8 @@
 
 #include "tests/support/TemporaryFolder.h"
 
+#include <vector>
+
 /// Returns text with every occurrence of from replaced by to: paths that differ from run to run by a sign
 /// that stands in a literal.
 inline std::string ReplaceAll(std::string text, const std::string& from, const std::string& to)
@@ -17,4 +19,22 @@ inline std::string ReplaceAll(std::string text, const std::string& from, const s
 inline std::string Neutral(const std::string& report, const TemporaryFolder& folder)
 {
     return ReplaceAll(ReplaceAll(report, folder.Path(), "@"), "./Tools/DocTools/VantorPagemeld/", "#");
+}
+
+/// Returns the output of self-tests with N for the numbers that differ from run to run: those behind the
+/// labels.
+inline std::string WithoutNumbers(std::string text,
+                                  const std::vector<std::string>& labels = {
+                                      "PASS(", "failures in ", R"("time":)", R"("processId":)",
+                                      R"("durationMicroseconds":)", R"("duration":)"})
+{
+    for (const std::string& label : labels)
+    {
+        for (std::size_t at = text.find(label); at != std::string::npos; at = text.find(label, at + 1))
+        {
+            const std::size_t start = at + label.size();
+            text.replace(start, text.find_first_not_of("0123456789.", start) - start, "N");
+        }
+    }
+    return text;
 }
