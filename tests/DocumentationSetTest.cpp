@@ -151,25 +151,3 @@ toc = {
 )",
               ReadWholeFile(folder / "a/ScriptReference/docdata/global_toc.js"));
 }
-
-TEST(DocumentationSet, UnwritableSearchIndexScriptEndsTheRun)
-{
-    const TemporaryFolder folder;
-    for (const char* modulePath : {"a/Manual", "c/Manual", "a/ScriptReference", "c/ScriptReference"})
-    {
-        AddModule(folder, modulePath, kIndexA, kTocA);
-    }
-    EXPECT_EQ(R"(executing Pagemeld
-WARNING: #RapidJsonIoUtil:47 Unable to read @/b/Manual/docdata/index.json
-WARNING: #RapidJsonIoUtil:47 Unable to read @/b/Manual/docdata/toc.json
-WARNING: #RapidJsonIoUtil:23 Failed to open @/b/Manual/docdata/global_index.json.tmp for writing
-CRITICAL: #IndexCombiner:176 Unable to open file @/b/Manual/docdata/global_index.js.tmp for writingstatus 255
-)",
-              ReportOfRun(folder, {"@/a", "@/b", "@/c"}));
-    EXPECT_EQ(R"(a/Manual/docdata/global_index.js
-a/Manual/docdata/global_index.json
-a/Manual/docdata/global_toc.js
-a/Manual/docdata/global_toc.json
-)",
-              OutputNames(folder));
-}
