@@ -41,13 +41,6 @@ TEST(IndexCombiner, MergesModulesInTheirOrder)
         {{}, R"({"pages":[],"info":[],"common":{},"searchIndex":{}})"},
         {{R"({"searchIndex":{"a":[1]},"x":1,"common":{"a":1},"info":[["A text",0]],"pages":[["A","A"]]})"},
          R"({"pages":[["A","A",0]],"info":[["A text",0]],"common":{"a":1},"searchIndex":{"a":[1]}})"},
-        {{"{\"pages\":\n[[\"A\", \"A\"]],\n\"info\": \n[[\"A text\",0]],\n\"common\": "
-          "{\"a\":1},\n\"searchIndex\": "
-          "\n{\"a\":[1]}}\n",
-          "{\"pages\":\n[[\"B\", \"B\"]],\n\"info\": \n[[\"B text\",0]],\n\"common\": "
-          "{\"a\":1},\n\"searchIndex\": "
-          "\n{\"b\":[2]}}\n"},
-         R"({"pages":[["A","A",0],["B","B",1]],"info":[["A text",0],["B text",1]],"common":{"a":1},"searchIndex":{"a":[1],"b":[3]}})"},
         {{R"({"pages":[["p","P"],["q","Q"]],"info":[["t",1],["u",0],["v",1]],"common":{},"searchIndex":{"a":[2,0,2],"b":[]}})",
           R"({"pages":[],"info":[],"common":{"x":1},"searchIndex":{}})",
           R"({"pages":[["r","R"]],"info":[["w",0]],"common":{"y":1},"searchIndex":{"c":[0],"a":[0,0],"b":[0],"c":[0]}})"},

@@ -43,8 +43,6 @@ TEST(TocCombiner, MergesEntriesOfTheSameLinkAndTitle)
         const char* combined;
     } cases[] = {
         {{}, "{}"},
-        {{trivial, simple},
-         R"({"link":"toc","title":"toc","children":[{"link":"null","title":"Classes","children":[{"link":"A","title":"A","children":null,"module":1}],"module":1}],"module":0})"},
         {{trivial, simple,
           R"({"link":"toc","title":"toc","children":[{"link":"null","title":"Classes","children":[{"link":"C","title":"C","children":null}]}]})"},
          R"({"link":"toc","title":"toc","children":[{"link":"null","title":"Classes","children":[{"link":"A","title":"A","children":null,"module":1},{"link":"C","title":"C","children":null,"module":2}],"module":1}],"module":0})"},
