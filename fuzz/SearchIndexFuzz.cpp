@@ -3,9 +3,9 @@
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "Tools/DocTools/VantorPagemeld/Script/IndexScript.h"
 #include "Tools/DocTools/VantorPagemeld/Structure/IndexStructure.h"
-#include "fuzz/PlainMerge.h"
 #include "fuzz/Property.h"
 #include "fuzz/ScriptForm.h"
+#include "tests/support/PlainMerge.h"
 
 #include <list>
 

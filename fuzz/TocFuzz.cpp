@@ -2,9 +2,9 @@
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "Tools/DocTools/VantorPagemeld/Structure/TocStructure.h"
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
-#include "fuzz/PlainMerge.h"
 #include "fuzz/Property.h"
 #include "fuzz/ScriptForm.h"
+#include "tests/support/PlainMerge.h"
 
 #include <list>
 

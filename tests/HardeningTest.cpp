@@ -1,3 +1,4 @@
+#include "tests/support/HasMatch.h"
 #include "tests/support/RunProgram.h"
 
 #include <gtest/gtest.h>
@@ -29,6 +30,6 @@ TEST(Hardening, IsInTheProgram)
         RunProgram("objdump", {"--disassemble=main", program}).standardOutput;
     for (const auto& c : cases)
     {
-        EXPECT_TRUE(testing::internal::RE::PartialMatch(shown, c.pattern)) << c.protection;
+        EXPECT_TRUE(HasMatch(shown, c.pattern)) << c.protection;
     }
 }

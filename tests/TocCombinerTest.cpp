@@ -1,7 +1,7 @@
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
 
-#include "fuzz/PlainMerge.h"
 #include "tests/support/MergedModules.h"
+#include "tests/support/PlainMerge.h"
 
 #include <gtest/gtest.h>
 

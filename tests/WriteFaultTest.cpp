@@ -5,6 +5,7 @@
 
 #include <filesystem>
 
+#include <sys/stat.h>
 #include <unistd.h>
 
 // What a run leaves on the disk when writing fails, or when it is killed. A script is whole and new, or whole
@@ -90,6 +91,7 @@ TEST(WriteFault, ObstaclesLeaveWhatTheyMust)
         fs::remove(path);
         fs::create_directory(path);
     };
+    const Prepare putPipe = [](const std::string& path) { EXPECT_EQ(0, ::mkfifo(path.c_str(), 0666)); };
     const Prepare putStaleFile = [](const std::string& path)
     { WriteWholeFile(path, std::string(10'000, 'x')); };
     const Prepare forbidWriting = [](const std::string& path)
@@ -109,6 +111,9 @@ TEST(WriteFault, ObstaclesLeaveWhatTheyMust)
         {putFolder, "a/Manual/docdata/global_index.js.tmp", 255, "NO[D]OO OOOO"},
         {putFolder, "a/Manual/docdata/global_toc.json.tmp", 0, "NNO[D]N NNNN"},
         {putFolder, "a/Manual/docdata/global_toc.js.tmp", 0, "NNNO[D] NNNN"},
+        {putPipe, "a/Manual/docdata/global_index.json.tmp", 0, "O[-]NNN NNNN"},
+        {putPipe, "a/Manual/docdata/global_index.js.tmp", 255, "NO[-]OO OOOO"},
+        {putPipe, "a/Manual/docdata/global_toc.js.tmp", 0, "NNNO[-] NNNN"},
         // A rename on to a folder fails, and is not reported.
         {putFolder, "a/Manual/docdata/global_index.json", 0, "D[N]NNN NNNN"},
         {putFolder, "a/Manual/docdata/global_index.js", 0, "ND[N]NN NNNN"},
