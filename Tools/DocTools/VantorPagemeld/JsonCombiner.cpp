@@ -3,15 +3,6 @@
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "Tools/DocTools/VantorPagemeld/Script/RelativePrefix.h"
 
-namespace
-{
-
-/// In bytes. The library's own choice of 64 KB is more than all that a small module holds, and there may be
-/// hundreds.
-constexpr std::size_t kPoolChunkSize = std::size_t{8} << 10;
-
-} // namespace
-
 JsonCombiner::JsonCombiner() : defaultJson("{}") {}
 
 JsonCombiner::~JsonCombiner()
@@ -33,7 +24,7 @@ bool JsonCombiner::CombineJson(const std::list<std::string>& modulePaths, const 
     for (const std::string& modulePath : modulePaths)
     {
         rapidjson::Document& document = *moduleDocuments.emplace_back(
-            std::make_unique<rapidjson::Document>(&modulePools.emplace_back(kPoolChunkSize)));
+            std::make_unique<rapidjson::Document>(&modulePools.emplace_back().allocator));
         const std::string filePath = modulePath + "/" + fileName;
         if (!RapidJsonIoUtil::TryGetJsonDocFromFile(filePath.c_str(), document) ||
             !VerifyJSONStructure(document))

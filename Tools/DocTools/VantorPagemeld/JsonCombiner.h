@@ -1,5 +1,6 @@
 #pragma once
 
+#include "Tools/DocTools/VantorPagemeld/Json/PoolWithSmallStart.h"
 #include "Tools/DocTools/VantorPagemeld/Output/RenderedText.h"
 
 #include <rapidjson/document.h>
@@ -28,8 +29,8 @@ public:
     /// nothing.
     virtual bool VerifyJSONStructure(const rapidjson::Value& document) = 0;
 
-    /// Merges a verified and tagged document into combinedDocument. Values are moved, so document must live
-    /// as long as this object.
+    /// Merges a verified and tagged document into combinedDocument. Values are moved, so the memory of
+    /// document must live as long as this object.
     virtual void AppendJsonDocument(rapidjson::Document& document) = 0;
 
     /// Tags the entries of a document with the index of the module that it comes from.
@@ -68,11 +69,12 @@ protected:
 
     std::map<int, std::string> modulePathTable;
     std::string defaultJson;
-    std::deque<rapidjson::Document::AllocatorType> modulePools; ///< one for each of the module documents
+    std::deque<PoolWithSmallStart>
+        modulePools; ///< one for each of the module documents, whose values it holds
     std::vector<std::unique_ptr<rapidjson::Document>>
         moduleDocuments; ///< every one that CombineJson tried to read
 
 public:
-    /// The merged result, to be read only. Its values lie in the module documents too.
+    /// The merged result, to be read only. Its values lie in the module documents' pools too.
     rapidjson::Document combinedDocument;
 };
