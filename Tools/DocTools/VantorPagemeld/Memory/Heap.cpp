@@ -1,12 +1,12 @@
 #include "Tools/DocTools/VantorPagemeld/Memory/Heap.h"
 
-#include <climits>
 #include <cstddef>
 #include <cstdint>
 #include <new>
 
 #include <malloc.h>
 #include <sys/mman.h>
+#include <sys/resource.h>
 #include <unistd.h>
 
 namespace
@@ -14,6 +14,14 @@ namespace
 
 constexpr int kReserve = 1 << 30;
 constexpr int kOrdinaryTopPad = 128 << 10; // what the C library begins with
+constexpr int kNever = -1;
+
+/// Where the address space is limited, the reserve would take it from the stack.
+bool IsAddressSpaceLimited()
+{
+    rlimit limit = {};
+    return ::getrlimit(RLIMIT_AS, &limit) != 0 || limit.rlim_cur != RLIM_INFINITY;
+}
 
 /// The advice takes whole pages.
 void AdviseHugePages(void* memory, std::size_t size)
@@ -23,23 +31,32 @@ void AdviseHugePages(void* memory, std::size_t size)
     (void)::madvise(static_cast<char*>(memory) + offset, size - offset, MADV_HUGEPAGE);
 }
 
-} // namespace
-
-void PrepareHeap()
+/// Has the heap grow for a block, with the reserve behind it. The block is free again afterwards; the heap
+/// gives nothing back.
+void AddReserve()
 {
-    (void)::mallopt(M_ARENA_MAX, 1);
-    (void)::mallopt(M_MMAP_MAX, 0);
-    (void)::mallopt(M_TRIM_THRESHOLD, INT_MAX);
-
-    // A block that the heap has to grow for, and the reserve behind it. The block is free again afterwards;
-    // the heap gives nothing back.
     constexpr std::size_t kLargerThanTheHeap = 1 << 20;
-    (void)::mallopt(M_TOP_PAD, kReserve);
+    if (::mallopt(M_TOP_PAD, kReserve) == 0)
+    {
+        return; // another allocator is in place, such as a sanitizer's
+    }
     void* const block = ::operator new(kLargerThanTheHeap, std::nothrow);
     (void)::mallopt(M_TOP_PAD, kOrdinaryTopPad);
     if (block != nullptr)
     {
         AdviseHugePages(block, kReserve);
         ::operator delete(block);
+    }
+}
+
+} // namespace
+
+void PrepareHeap()
+{
+    (void)::mallopt(M_MMAP_MAX, 0);
+    (void)::mallopt(M_TRIM_THRESHOLD, kNever);
+    if (!IsAddressSpaceLimited())
+    {
+        AddReserve();
     }
 }
