@@ -1,5 +1,7 @@
 #include "Tools/DocTools/VantorPagemeld/Json/SpareLists.h"
 
+#include <new>
+
 namespace
 {
 
@@ -7,7 +9,7 @@ using rapidjson::SizeType;
 using rapidjson::Value;
 
 /// Returns how often number can be halved before nothing is left of it.
-unsigned BitLength(SizeType number)
+unsigned BitLength(std::size_t number)
 {
     unsigned length = 0;
     for (; number != 0; number >>= 1)
@@ -29,7 +31,7 @@ void AppendElements(Value& list, Value& input, SpareLists::Allocator& allocator)
 
 void SpareLists::MoveElements(Value& list, Value& input, Allocator& allocator)
 {
-    const SizeType size = list.Size() + input.Size();
+    const std::size_t size = std::size_t{list.Size()} + input.Size();
     if (size > list.Capacity())
     {
         Value roomier = Take(size, allocator);
@@ -41,8 +43,14 @@ void SpareLists::MoveElements(Value& list, Value& input, Allocator& allocator)
     Keep(input, allocator);
 }
 
-Value SpareLists::Take(SizeType capacity, Allocator& allocator)
+Value SpareLists::Take(std::size_t capacity, Allocator& allocator)
 {
+    constexpr std::size_t kMaxCapacity = std::size_t{1}
+                                         << 31; // the largest power of two that a list can count
+    if (capacity > kMaxCapacity)
+    {
+        throw std::bad_alloc();
+    }
     const unsigned length = BitLength(capacity - 1);
     Value& first = m_spares[length];
     Value list(rapidjson::kArrayType);

@@ -3,6 +3,7 @@
 #include <rapidjson/document.h>
 
 #include <array>
+#include <cstddef>
 
 /// Joins JSON arrays, and keeps the storage that they leave behind for the next arrays that grow.
 ///
@@ -15,11 +16,12 @@ public:
     using Value = rapidjson::Value;
     using Allocator = rapidjson::Document::AllocatorType;
 
-    /// Moves the elements of input behind those of list. input is null afterwards.
+    /// Moves the elements of input behind those of list. input is null afterwards. Throws std::bad_alloc for
+    /// more than 2^31 elements.
     void MoveElements(Value& list, Value& input, Allocator& allocator);
 
 private:
-    [[nodiscard]] Value Take(rapidjson::SizeType capacity, Allocator& allocator);
+    [[nodiscard]] Value Take(std::size_t capacity, Allocator& allocator);
     void Keep(Value& list, Allocator& allocator);
 
     /// By the power of two that their capacity reaches: null, or an array whose only element is the next one

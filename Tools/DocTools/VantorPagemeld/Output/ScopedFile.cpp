@@ -1,5 +1,6 @@
 #include "Tools/DocTools/VantorPagemeld/Output/ScopedFile.h"
 
+#include <cerrno>
 #include <utility>
 
 #include <fcntl.h>
@@ -9,10 +10,9 @@
 namespace
 {
 
-ScopedFile Open(const char* path, int flags, const char* mode)
+/// Returns the stream of a descriptor, which it owns from then on, or nothing for one that is negative.
+ScopedFile StreamOf(int descriptor, const char* mode)
 {
-    constexpr mode_t kReadableAndWritable = 0666; // less what the process's mask takes away
-    const int descriptor = ::open(path, flags | O_NONBLOCK | O_CLOEXEC, kReadableAndWritable);
     if (descriptor < 0)
     {
         return nullptr;
@@ -35,11 +35,17 @@ bool IsPipe(std::FILE* file)
 
 ScopedFile OpenForReading(const char* path)
 {
-    return Open(path, O_RDONLY, "rb");
+    int descriptor = ::open(path, O_RDONLY | O_CLOEXEC | O_NONBLOCK);
+    if (descriptor < 0 && errno == EWOULDBLOCK)
+    {
+        // Somebody holds a lease on a regular file, and gives it back when asked.
+        descriptor = ::open(path, O_RDONLY | O_CLOEXEC);
+    }
+    return StreamOf(descriptor, "rb");
 }
 
 ScopedFile OpenForWriting(const char* path)
 {
-    ScopedFile file = Open(path, O_RDWR | O_CREAT | O_TRUNC, "w+b");
+    ScopedFile file(std::fopen(path, "w+b")); // does not wait, as it asks for both ends of a pipe
     return file != nullptr && IsPipe(file.get()) ? nullptr : std::move(file);
 }
