@@ -1,4 +1,4 @@
-#include "tests/support/ReplaceAll.h"
+#include "tests/support/NeutralText.h"
 #include "tests/support/RunProgram.h"
 #include "tests/support/WholeFile.h"
 

@@ -1,3 +1,4 @@
+#include "Tools/DocTools/VantorPagemeld/Json/JsonReader.h"
 #include "tests/support/ExampleDocs.h"
 #include "tests/support/HasMatch.h"
 #include "tests/support/Repeated.h"
@@ -90,6 +91,23 @@ TEST(Environment, WantOfMemoryEndsTheRunBeforeItsFirstOutput)
     EXPECT_EQ("NNNN NNNN", docs.Describe());
 }
 
+TEST(Environment, DeepInputNeedsNoMoreThanASmallStack)
+{
+#ifdef __SANITIZE_ADDRESS__
+    GTEST_SKIP() << "the frames of this build are larger";
+#endif
+    const ExampleDocs docs;
+    const std::string input = docs / "b/Manual/docdata/index.json";
+    const std::string deep = Repeated("[", kMaxNestingDepth - 1) + Repeated("]", kMaxNestingDepth - 1);
+    WriteWholeFile(input, ReadWholeFile(input).insert(1, "\"ignored\":" + deep + ","));
+    const std::string justAboveTheHeapsReserve = std::to_string((std::size_t{1} << 30) + (7 << 20));
+    for (const std::string& limit : {std::string("--stack=2097152"), "--as=" + justAboveTheHeapsReserve})
+    {
+        EXPECT_EQ(0, docs.Run({"prlimit", limit}).status) << limit;
+        EXPECT_EQ("NNNN NNNN", docs.Describe()) << limit;
+    }
+}
+
 TEST(Environment, SymbolicLinksAreFollowedButForOutputs)
 {
     const struct
@@ -130,10 +148,15 @@ TEST(Environment, AnyNameIsUsedAsItIs)
         const ExampleDocs docs;
         fs::rename(docs / "b", docs / name);
         EXPECT_EQ(0, RunProgram(PAGEMELD_PROGRAM, {docs / "a", docs / name}).status) << name;
-        const std::string script = ReadWholeFile(docs / "a/Manual/docdata/global_toc.js");
-        const std::string prefixes = "var p0 = \"\";\nvar p1 = \"../../" + name + "/Manual/\";\ntoc = {\n";
-        EXPECT_EQ(prefixes, script.substr(0, prefixes.size()));
-        EXPECT_NE("the earlier output", ReadWholeFile(docs / name + "/Manual/docdata/global_toc.js"));
+        const std::pair<std::string, std::string> prefixes[] = {
+            {"a", "var p0 = \"\";\nvar p1 = \"../../" + name + "/Manual/\";\ntoc = {\n"},
+            {name, "var p0 = \"../../a/Manual/\";\nvar p1 = \"\";\ntoc = {\n"},
+        };
+        for (const auto& [module, lines] : prefixes)
+        {
+            const std::string script = ReadWholeFile(docs / module + "/Manual/docdata/global_toc.js");
+            EXPECT_EQ(lines, script.substr(0, lines.size()));
+        }
     }
 }
 

@@ -1,7 +1,7 @@
 #include "Tools/DocTools/VantorPagemeld/IndexCombiner.h"
 #include "tests/support/CapturedStderr.h"
+#include "tests/support/NeutralText.h"
 #include "tests/support/ParsedJson.h"
-#include "tests/support/ReplaceAll.h"
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/WholeFile.h"
 

@@ -1,19 +1,22 @@
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "tests/support/CapturedStderr.h"
+#include "tests/support/NeutralText.h"
 #include "tests/support/ParsedJson.h"
 #include "tests/support/Repeated.h"
-#include "tests/support/ReplaceAll.h"
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/WholeFile.h"
 
 #include <gtest/gtest.h>
 
+#include <csignal>
 #include <cstdlib>
 #include <cstring>
 #include <filesystem>
 #include <fstream>
 
+#include <fcntl.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 namespace
 {
@@ -96,6 +99,23 @@ TEST(JsonReading, WarnsOfWhatHasNoTextToRead)
     EXPECT_EQ(unread + "-1, got 0 bytes\n", Read("/proc", document)); // a folder of size 0
     EXPECT_EQ("[1]", RapidJsonIoUtil::OutputJsonValueToString(document))
         << "an unread file leaves the document alone";
+}
+
+TEST(JsonReading, WaitsForALeaseToBeGivenBack)
+{
+    const TemporaryFolder folder;
+    WriteWholeFile(folder / "file", "[1]");
+    static const int s_leased = ::open((folder / "file").c_str(), O_RDWR);
+    const auto giveBack = [](int) { (void)::fcntl(s_leased, F_SETLEASE, F_UNLCK); };
+    const auto handler = std::signal(SIGIO, giveBack);
+    if (::fcntl(s_leased, F_SETLEASE, F_WRLCK) != 0)
+    {
+        GTEST_SKIP() << "no leases here";
+    }
+    rapidjson::Document document;
+    EXPECT_EQ("read", Read(folder / "file", document));
+    (void)std::signal(SIGIO, handler);
+    ::close(s_leased);
 }
 
 TEST(JsonReading, DocumentTellsTheOutcomeOfTheLastParse)

@@ -1,6 +1,6 @@
 #include "Tools/DocTools/VantorPagemeld/ModuleDiscovery.h"
 
-#include "tests/support/ReplaceAll.h"
+#include "tests/support/NeutralText.h"
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/WholeFile.h"
 

@@ -12,7 +12,7 @@
 #include "Runtime/Utilities/CommandLine.h"
 #include "tests/support/CapturedConsole.h"
 #include "tests/support/DescribedTests.h"
-#include "tests/support/ReplaceAll.h"
+#include "tests/support/NeutralText.h"
 
 #include <gtest/gtest.h>
 

@@ -8,6 +8,7 @@
 #include <cerrno>
 #include <filesystem>
 
+#include <linux/fs.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -29,10 +30,10 @@ int Fail(int error)
 
 extern "C" int Clone(int file, unsigned long request, int original) __asm__("__wrap_ioctl");
 
-int Clone(int file, unsigned long /*request*/, int original)
+int Clone(int file, unsigned long request, int original)
 {
     struct stat status = {};
-    if (s_refusal != 0 || ::fstat(original, &status) != 0)
+    if (s_refusal != 0 || request != FICLONE || ::fstat(original, &status) != 0)
     {
         return Fail(s_refusal);
     }
@@ -77,7 +78,7 @@ TEST(RepeatedText, EveryFileIsWholeAndAsManyAsCanBeAreClones)
         s_cloneSizes.clear();
         for (const std::string name : c.names)
         {
-            repeated.WriteTo(ScopedFile(std::fopen((folder / name).c_str(), "w+b")));
+            repeated.WriteTo(OpenForWriting((folder / name).c_str()));
             EXPECT_TRUE(name == "full" || ReadWholeFile(folder / name) == text) << name << ": " << c.what;
         }
         s_refusal = EOPNOTSUPP;

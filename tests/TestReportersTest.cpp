@@ -3,7 +3,7 @@
 #include "Runtime/Testing/IgnoredTests.h"
 #include "Runtime/Utilities/NonPrintableChars.h"
 #include "tests/support/CapturedConsole.h"
-#include "tests/support/ReplaceAll.h"
+#include "tests/support/NeutralText.h"
 
 #include <gtest/gtest.h>
 

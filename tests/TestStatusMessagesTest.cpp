@@ -2,7 +2,7 @@
 
 #include "Modules/JSONSerialize/Public/JSONWrite.h"
 #include "tests/support/CapturedConsole.h"
-#include "tests/support/ReplaceAll.h"
+#include "tests/support/NeutralText.h"
 
 #include <gtest/gtest.h>
 

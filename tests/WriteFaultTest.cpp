@@ -104,7 +104,9 @@ TEST(WriteFault, ObstaclesLeaveWhatTheyMust)
         const char* outputs;
     } cases[] = {
         {putStaleFile, "a/Manual/docdata/global_index.json.tmp", 0, "NNNN NNNN"},
-        {putStaleFile, "a/Manual/docdata/global_toc.js.tmp", 0, "NNNN NNNN"},
+        {putStaleFile, "a/Manual/docdata/global_index.js.tmp", 0, "NNNN NNNN"},
+        {putStaleFile, "b/Manual/docdata/global_toc.json.tmp", 0, "NNNN NNNN"},
+        {putStaleFile, "b/Manual/docdata/global_toc.js.tmp", 0, "NNNN NNNN"},
         {forbidWriting, "a/Manual/docdata", 255, "OOOO OOOO"},
         {forbidWriting, "b/Manual/docdata", 255, "NNNN OOOO"},
         {putFolder, "a/Manual/docdata/global_index.json.tmp", 0, "O[D]NNN NNNN"},
@@ -113,6 +115,7 @@ TEST(WriteFault, ObstaclesLeaveWhatTheyMust)
         {putFolder, "a/Manual/docdata/global_toc.js.tmp", 0, "NNNO[D] NNNN"},
         {putPipe, "a/Manual/docdata/global_index.json.tmp", 0, "O[-]NNN NNNN"},
         {putPipe, "a/Manual/docdata/global_index.js.tmp", 255, "NO[-]OO OOOO"},
+        {putPipe, "a/Manual/docdata/global_toc.json.tmp", 0, "NNO[-]N NNNN"},
         {putPipe, "a/Manual/docdata/global_toc.js.tmp", 0, "NNNO[-] NNNN"},
         // A rename on to a folder fails, and is not reported.
         {putFolder, "a/Manual/docdata/global_index.json", 0, "D[N]NNN NNNN"},

@@ -1,6 +1,6 @@
 #include "tests/support/RunProgram.h"
 
-#include "tests/support/ReplaceAll.h"
+#include "tests/support/NeutralText.h"
 #include "tests/support/WholeFile.h"
 
 #include <stdexcept>
