@@ -4,6 +4,7 @@
 /// bytes of the JSON text that the part reads or that it writes.
 
 #include "Tools/DocTools/VantorPagemeld/IndexCombiner.h"
+#include "Tools/DocTools/VantorPagemeld/Memory/Heap.h"
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "Tools/DocTools/VantorPagemeld/Script/IndexScript.h"
 #include "Tools/DocTools/VantorPagemeld/Script/RelativePrefix.h"
@@ -320,4 +321,14 @@ BENCHMARK(Prefix);
 
 } // namespace
 
-BENCHMARK_MAIN();
+int main(int argc, char* argv[])
+{
+    PrepareHeap();
+    benchmark::Initialize(&argc, argv);
+    if (benchmark::ReportUnrecognizedArguments(argc, argv))
+    {
+        return 1;
+    }
+    benchmark::RunSpecifiedBenchmarks();
+    return 0;
+}

@@ -17,6 +17,11 @@ INDEX_OUTPUT = "global_index.json"
 OUTPUTS = (INDEX_OUTPUT, "global_index.js", "global_toc.json", "global_toc.js")
 
 
+def blocks_of(path):
+    with open(path, "rb") as file:
+        yield from iter(lambda: file.read(BLOCK), b"")
+
+
 class Arena:
     outputs = OUTPUTS
 
@@ -28,11 +33,22 @@ class Arena:
         self._make_ready_outputs()
 
     def prepare(self):
-        """Removes all outputs, waits for the disk, and brings the inputs into the page cache."""
+        """Removes all outputs, waits for the disk, and brings what is read into the page cache."""
         self.remove_outputs()
         os.sync()
-        for file in self._inputs(self.roots):
-            file.read_bytes()
+        for file in [*self._inputs(self.roots), *self._ready.glob("*/*")]:
+            for _ in blocks_of(file):
+                pass
+
+    def require_outputs(self, roots=None, outputs=OUTPUTS):
+        """Ends the program if an output is missing or too short, as on a full disk: the run was no run then."""
+        for root in roots or self.roots:
+            for set_name in corpus.SETS:
+                for output in outputs:
+                    written = root / set_name / "docdata" / output
+                    ready = self._ready / set_name / output
+                    if not written.exists() or written.stat().st_size < ready.stat().st_size:
+                        raise SystemExit(f"{written} was not written whole")
 
     def remove_outputs(self):
         for output in self.folder.glob("*/*/docdata/global_*"):
@@ -82,9 +98,8 @@ class Arena:
         for root in self.roots:
             for set_name in corpus.SETS:
                 for output in outputs:
-                    with open(root / set_name / "docdata" / output, "rb") as file:
-                        for block in iter(lambda stream=file: stream.read(BLOCK), b""):
-                            digest.update(block)
+                    for block in blocks_of(root / set_name / "docdata" / output):
+                        digest.update(block)
         return digest.hexdigest()
 
     def memory_goal(self):

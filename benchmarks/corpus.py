@@ -9,8 +9,10 @@ No term is a number: an object of JavaScript would put it in front of the others
 not keep the order of terms.
 """
 
+import hashlib
 import json
 import random
+import shutil
 import subprocess
 import sys
 from dataclasses import dataclass
@@ -95,11 +97,13 @@ SHAPES = {
 def make(name, folder):
     """Returns the folder of the corpus of that name below folder; makes it unless it is there already."""
     corpus = Path(folder) / name
-    complete = corpus / "complete"
-    if not complete.exists():
+    complete = corpus / "complete"  # made by the generator of that digest
+    generator = hashlib.sha256(Path(__file__).read_bytes()).hexdigest()
+    if not complete.exists() or complete.read_text(encoding="utf-8") != generator:
+        shutil.rmtree(corpus, ignore_errors=True)
         # In a process of its own: a child that is measured begins with the peak memory of its parent.
         subprocess.run([sys.executable, __file__, name, str(corpus)], check=True)
-        complete.touch()
+        complete.write_text(generator, encoding="utf-8")
     return corpus
 
 

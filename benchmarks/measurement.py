@@ -1,6 +1,7 @@
 """Runs commands and tells what they cost."""
 
 import os
+import random
 import statistics
 import subprocess
 import time
@@ -34,15 +35,16 @@ def run(command):
 class Rounds:
     """The costs of several contenders, measured in turn, round by round, so that a slow moment hits all alike."""
 
-    def __init__(self, contenders, rounds, prepare):
-        """Contenders are commands by name; prepare() is called before each run."""
+    def __init__(self, contenders, rounds, prepare, check):
+        """Contenders are commands by name; prepare() is called before each run, check(name) after it."""
         self._costs = {name: [] for name in contenders}
         for number in range(rounds):
             order = list(contenders.items())
-            shift = number % len(order)
-            for name, command in order[shift:] + order[:shift]:
+            random.Random(number).shuffle(order)
+            for name, command in order:
                 prepare()
                 self._costs[name].append(run(command))
+                check(name)
 
     def names(self):
         return list(self._costs)

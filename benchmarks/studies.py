@@ -22,10 +22,14 @@ class Study:
     one_more: float = None
 
 
+def outputs_of(arena, contender):
+    return [INDEX_OUTPUT] if contender == "jq" else list(arena.outputs)
+
+
 def check_outputs(arena, names):
     """Ends the program unless every contender named makes the outputs that pagemeld makes."""
     for name in names:
-        outputs = [INDEX_OUTPUT] if name == "jq" else list(arena.outputs)
+        outputs = outputs_of(arena, name)
         if arena.digest_after(getattr(arena, name)(), outputs) != arena.digest_after(arena.pagemeld(), outputs):
             raise SystemExit(f"{arena.folder}: the outputs of {name} differ from those of pagemeld")
         print(f"{arena.folder}: {name} makes the same outputs as pagemeld", flush=True)
@@ -36,7 +40,7 @@ def measure_size(study, name, folder, tool, rounds):
     alternatives = [] if name == "large" else ["node", "python"]
     check_outputs(arena, alternatives)
     contenders = {each: getattr(arena, each)() for each in ["limit", "pagemeld", *alternatives]}
-    study.sizes[name] = Rounds(contenders, rounds, arena.prepare)
+    study.sizes[name] = Rounds(contenders, rounds, arena.prepare, lambda _: arena.require_outputs())
     study.arenas[name] = arena
     arena.remove_outputs()
 
@@ -44,7 +48,11 @@ def measure_size(study, name, folder, tool, rounds):
 def measure_index_part(study, folder, tool, rounds):
     arena = Arena("medium-index", folder, tool)
     check_outputs(arena, ["jq"])
-    study.index_part = Rounds({"pagemeld": arena.pagemeld(), "jq": arena.jq()}, rounds, arena.prepare)
+
+    def check(name):
+        arena.require_outputs(outputs=outputs_of(arena, name))
+
+    study.index_part = Rounds({"pagemeld": arena.pagemeld(), "jq": arena.jq()}, rounds, arena.prepare, check)
     arena.remove_outputs()
 
 
@@ -55,9 +63,10 @@ def measure_series(study, series, folder, tool, rounds):
 
     def prepare():
         for arena in arenas.values():
-            arena.remove_outputs()
+            arena.prepare()
 
-    measured = Rounds({name: arenas[name].pagemeld() for name in names}, rounds, prepare)
+    contenders = {name: arenas[name].pagemeld() for name in names}
+    measured = Rounds(contenders, rounds, prepare, lambda name: arenas[name].require_outputs())
     study.series[series] = [
         (
             int(name.rpartition("-")[2]),
@@ -66,7 +75,8 @@ def measure_series(study, series, folder, tool, rounds):
         )
         for before, name in zip([None, *names], names)
     ]
-    prepare()
+    for arena in arenas.values():
+        arena.remove_outputs()
 
 
 def measure_one_more_module(study, folder, tool, rounds):
@@ -79,6 +89,8 @@ def measure_one_more_module(study, folder, tool, rounds):
         "limit": arena.limit(),
         "limit, more": arena.limit(roots),
     }
-    measured = Rounds(contenders, rounds, arena.prepare)
+    measured = Rounds(
+        contenders, rounds, arena.prepare, lambda name: arena.require_outputs(roots if "more" in name else None)
+    )
     study.one_more = measured.growth_ratio(("pagemeld, more", "pagemeld"), ("limit, more", "limit"), "wall")
     arena.remove_outputs()

@@ -46,6 +46,11 @@ function checkModules(found, where) {
     assert.deepEqual([...new Set(found)].sort(), combined, `modules in ${where}`);
 }
 
+function filesBelow(folder) {
+    return readdirSync(folder, { withFileTypes: true }).flatMap((entry) =>
+        entry.isDirectory() ? filesBelow(path.join(folder, entry.name)) : [path.join(folder, entry.name)]);
+}
+
 function checkSet(module, set) {
     const setFolder = path.join(folder, module, set);
     const { toc, pages, info, common, searchIndex } = loadScripts(setFolder);
@@ -73,5 +78,5 @@ for (const set of Object.keys(sharedGroups)) {
     console.log(`${set}: every link holds, from each of ${pageCounts.length} modules to ` +
         `${pageCounts[0]} pages of ${combined.join(", ")}`);
 }
-const strays = readdirSync(folder, { recursive: true }).filter((name) => name.endsWith(".tmp"));
+const strays = filesBelow(folder).filter((name) => name.endsWith(".tmp"));
 assert.deepEqual(strays, [], "temporary files left behind");
