@@ -21,6 +21,8 @@
 namespace
 {
 
+int s_leased = -1; ///< the file that a signal handler gives back
+
 const std::string kTag = "./Tools/DocTools/VantorPagemeld/RapidJsonIoUtil:";
 
 /// Reads a file into a document, and returns what was reported, with @ for the path; "read" when it was
@@ -105,9 +107,8 @@ TEST(JsonReading, WaitsForALeaseToBeGivenBack)
 {
     const TemporaryFolder folder;
     WriteWholeFile(folder / "file", "[1]");
-    static const int s_leased = ::open((folder / "file").c_str(), O_RDWR);
-    const auto giveBack = [](int) { (void)::fcntl(s_leased, F_SETLEASE, F_UNLCK); };
-    const auto handler = std::signal(SIGIO, giveBack);
+    s_leased = ::open((folder / "file").c_str(), O_RDWR);
+    const auto handler = std::signal(SIGIO, [](int) { (void)::fcntl(s_leased, F_SETLEASE, F_UNLCK); });
     if (::fcntl(s_leased, F_SETLEASE, F_WRLCK) != 0)
     {
         GTEST_SKIP() << "no leases here";
