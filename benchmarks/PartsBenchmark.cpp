@@ -330,5 +330,6 @@ int main(int argc, char* argv[])
         return 1;
     }
     benchmark::RunSpecifiedBenchmarks();
+    benchmark::Shutdown();
     return 0;
 }

@@ -97,10 +97,14 @@ SHAPES = {
 def make(name, folder):
     """Returns the folder of the corpus of that name below folder; makes it unless it is there already."""
     corpus = Path(folder) / name
-    complete = corpus / "complete"  # made by the generator of that digest
+    complete = corpus / "complete"  # empty, or the digest of the generator that made all of it
     generator = hashlib.sha256(Path(__file__).read_bytes()).hexdigest()
-    if not complete.exists() or complete.read_text(encoding="utf-8") != generator:
+    if corpus.exists() and not complete.exists():
+        raise SystemExit(f"{corpus} was not made here, or is incomplete: remove it")
+    if not corpus.exists() or complete.read_text(encoding="utf-8") != generator:
         shutil.rmtree(corpus, ignore_errors=True)
+        corpus.mkdir(parents=True)
+        complete.touch()
         # In a process of its own: a child that is measured begins with the peak memory of its parent.
         subprocess.run([sys.executable, __file__, name, str(corpus)], check=True)
         complete.write_text(generator, encoding="utf-8")

@@ -38,9 +38,9 @@ class Rounds:
     def __init__(self, contenders, rounds, prepare, check):
         """Contenders are commands by name; prepare() is called before each run, check(name) after it."""
         self._costs = {name: [] for name in contenders}
-        for number in range(rounds):
+        for _ in range(rounds):
             order = list(contenders.items())
-            random.Random(number).shuffle(order)
+            random.shuffle(order)
             for name, command in order:
                 prepare()
                 self._costs[name].append(run(command))

@@ -100,8 +100,12 @@ TEST(Environment, DeepInputNeedsNoMoreThanASmallStack)
     const std::string input = docs / "b/Manual/docdata/index.json";
     const std::string deep = Repeated("[", kMaxNestingDepth - 1) + Repeated("]", kMaxNestingDepth - 1);
     WriteWholeFile(input, ReadWholeFile(input).insert(1, "\"ignored\":" + deep + ","));
-    const std::string justAboveTheHeapsReserve = std::to_string((std::size_t{1} << 30) + (7 << 20));
-    for (const std::string& limit : {std::string("--stack=2097152"), "--as=" + justAboveTheHeapsReserve})
+    std::vector<std::string> limits = {"--stack=2097152"};
+    for (std::size_t megabytes = 3; megabytes <= 12; ++megabytes) // just above what the heap would reserve
+    {
+        limits.push_back("--as=" + std::to_string((std::size_t{1} << 30) + (megabytes << 20)));
+    }
+    for (const std::string& limit : limits)
     {
         EXPECT_EQ(0, docs.Run({"prlimit", limit}).status) << limit;
         EXPECT_EQ("NNNN NNNN", docs.Describe()) << limit;

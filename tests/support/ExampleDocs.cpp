@@ -62,6 +62,8 @@ void ExampleDocs::Restore() const
     for (const std::string module : {"a", "b"})
     {
         const std::string docdata = *this / module + "/Manual/docdata";
+        std::error_code missing;
+        fs::permissions(docdata, fs::perms::owner_all, missing); // a test may have taken them away
         fs::remove_all(docdata);
         WriteWholeFile(docdata + "/index.json",
                        R"({"pages":[["p.html","P"]],"info":[["t",0]],"common":{},"searchIndex":{")" + module +

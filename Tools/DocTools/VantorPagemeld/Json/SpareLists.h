@@ -16,8 +16,8 @@ public:
     using Value = rapidjson::Value;
     using Allocator = rapidjson::Document::AllocatorType;
 
-    /// Moves the elements of input behind those of list. input is null afterwards. Throws std::bad_alloc for
-    /// more than 2^31 elements.
+    /// Moves the elements of input behind those of list. input is null afterwards. Throws std::bad_alloc if
+    /// the list would have to grow beyond 2^31 elements.
     void MoveElements(Value& list, Value& input, Allocator& allocator);
 
 private:

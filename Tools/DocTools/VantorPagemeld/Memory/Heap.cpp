@@ -38,7 +38,7 @@ void AddReserve()
     constexpr std::size_t kLargerThanTheHeap = 1 << 20;
     if (::mallopt(M_TOP_PAD, kReserve) == 0)
     {
-        return; // another allocator is in place, such as a sanitizer's
+        return; // a sanitizer's allocator is in place
     }
     void* const block = ::operator new(kLargerThanTheHeap, std::nothrow);
     (void)::mallopt(M_TOP_PAD, kOrdinaryTopPad);

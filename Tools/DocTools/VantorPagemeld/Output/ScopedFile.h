@@ -17,7 +17,8 @@ using ScopedFile = std::unique_ptr<std::FILE, FileCloser>;
 
 /// Opens a file for reading. Returns nothing when that fails.
 ///
-/// Waits for nobody: a named pipe that nobody writes to would otherwise hold up the build for ever.
+/// Doesn't wait for a writer of a named pipe, which would hold up the build for ever. Waits for the end of a
+/// lease that somebody holds on the file, which the system sees to.
 [[nodiscard]] ScopedFile OpenForReading(const char* path);
 
 /// Opens a file for writing and reading, created if it is missing and emptied if it is there. Returns nothing
