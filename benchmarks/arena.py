@@ -23,8 +23,6 @@ def blocks_of(path):
 
 
 class Arena:
-    outputs = OUTPUTS
-
     def __init__(self, name, folder, tool):
         self.folder = corpus.make(name, folder)
         self.roots = sorted(self.folder.glob("m*"))

@@ -3,7 +3,7 @@
 from dataclasses import dataclass, field
 
 import corpus
-from arena import INDEX_OUTPUT, Arena
+from arena import INDEX_OUTPUT, OUTPUTS, Arena
 from measurement import Rounds
 
 SIZES = ("small", "medium", "large")
@@ -22,14 +22,14 @@ class Study:
     one_more: float = None
 
 
-def outputs_of(arena, contender):
-    return [INDEX_OUTPUT] if contender == "jq" else list(arena.outputs)
+def outputs_of(contender):
+    return [INDEX_OUTPUT] if contender == "jq" else OUTPUTS
 
 
 def check_outputs(arena, names):
     """Ends the program unless every contender named makes the outputs that pagemeld makes."""
     for name in names:
-        outputs = outputs_of(arena, name)
+        outputs = outputs_of(name)
         if arena.digest_after(getattr(arena, name)(), outputs) != arena.digest_after(arena.pagemeld(), outputs):
             raise SystemExit(f"{arena.folder}: the outputs of {name} differ from those of pagemeld")
         print(f"{arena.folder}: {name} makes the same outputs as pagemeld", flush=True)
@@ -50,7 +50,7 @@ def measure_index_part(study, folder, tool, rounds):
     check_outputs(arena, ["jq"])
 
     def check(name):
-        arena.require_outputs(outputs=outputs_of(arena, name))
+        arena.require_outputs(outputs=outputs_of(name))
 
     study.index_part = Rounds({"pagemeld": arena.pagemeld(), "jq": arena.jq()}, rounds, arena.prepare, check)
     arena.remove_outputs()

@@ -1,12 +1,9 @@
-#include "Tools/DocTools/VantorPagemeld/Json/JsonReader.h"
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "Tools/DocTools/VantorPagemeld/Structure/TocStructure.h"
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
-#include "fuzz/Property.h"
+#include "fuzz/MergeProperty.h"
 #include "fuzz/ScriptForm.h"
 #include "tests/support/PlainMerge.h"
-
-#include <list>
 
 // Tables of contents that pass the structure check merge as a plain linear merge has it, and both writers say
 // what the merged one holds.
@@ -21,18 +18,6 @@ constexpr const char* kFirstModule =
     R"({"link":"A","title":"A","children":null},{"link":"a\"\\","title":"\"\\","children":[]}]},)"
     R"({"link":"B","title":"B","module":7,"children":null},{"link":"B","title":"C","children":[]}]})";
 
-bool IsSound(const Value& document)
-{
-    int faults = 0;
-    Require(CheckTocStructure(document, [&](const StructureFault&, const JsonPlace& place)
-                              { return (void)place.ToPointer(), ++faults > 0; }),
-            "a check that is told to go on does");
-    const bool sound =
-        CheckTocStructure(document, [](const StructureFault&, const JsonPlace&) { return false; });
-    Require(sound == (faults == 0), "the first fault and all faults agree");
-    return sound;
-}
-
 void RequireWritersAgree(const TocCombiner& combiner)
 {
     const Value& merged = combiner.combinedDocument;
@@ -44,21 +29,8 @@ void RequireMergesLikePlain(const std::vector<std::string>& texts)
 {
     std::list<rapidjson::Document> documents; // they hold the values of the merged one
     TocCombiner combiner;
-    PlainTocMerge plain;
-    int moduleIndex = 0;
-    for (const std::string& text : texts)
-    {
-        rapidjson::Document& document = documents.emplace_back();
-        if (!ParseJson(text.c_str(), document).IsError() && IsSound(document))
-        {
-            plain.Append(document, moduleIndex);
-            combiner.AddModuleIndexToEachEntry(document, moduleIndex);
-            combiner.AppendJsonDocument(document);
-            ++moduleIndex;
-        }
-    }
-    Require(IsSameValue(combiner.combinedDocument, plain.Merged()), "the merge equals the plain one");
-    if (moduleIndex > 0)
+    const int merged = MergeLikePlain<PlainTocMerge>(combiner, documents, CheckTocStructure, texts);
+    if (merged > 0)
     {
         RequireWritersAgree(combiner);
     }

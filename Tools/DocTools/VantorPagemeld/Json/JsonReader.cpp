@@ -1,6 +1,6 @@
 #include "Tools/DocTools/VantorPagemeld/Json/JsonReader.h"
 
-#include "Tools/DocTools/VantorPagemeld/Json/ExponentLimit.h"
+#include "Tools/DocTools/VantorPagemeld/Json/NumberLimit.h"
 
 #include <rapidjson/reader.h>
 
@@ -79,7 +79,7 @@ struct FailedStream
 
 rapidjson::ParseResult ParseJson(const char* text, rapidjson::Document& document)
 {
-    const std::optional<std::string> limitedText = LimitExponents(text);
+    const std::optional<std::string> limitedText = LimitNumbers(text);
     rapidjson::Reader reader;
     const auto readText = [&](rapidjson::Document& target)
     {

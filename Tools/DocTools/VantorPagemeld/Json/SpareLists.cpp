@@ -45,8 +45,8 @@ void SpareLists::MoveElements(Value& list, Value& input, Allocator& allocator)
 
 Value SpareLists::Take(std::size_t capacity, Allocator& allocator)
 {
-    constexpr std::size_t kMaxCapacity = std::size_t{1}
-                                         << 31; // the largest power of two that a list can count
+    // The largest power of two that a list can count.
+    constexpr std::size_t kMaxCapacity = std::size_t{1} << 31;
     if (capacity > kMaxCapacity)
     {
         throw std::bad_alloc();

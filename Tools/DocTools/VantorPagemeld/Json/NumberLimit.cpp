@@ -1,9 +1,10 @@
-#include "Tools/DocTools/VantorPagemeld/Json/ExponentLimit.h"
+#include "Tools/DocTools/VantorPagemeld/Json/NumberLimit.h"
 
 #include <algorithm>
 #include <cstddef>
 #include <cstring>
 #include <string_view>
+#include <utility>
 
 namespace
 {
@@ -83,13 +84,14 @@ void LimitDigits(std::string& text, std::size_t start, std::size_t count)
 
 } // namespace
 
-std::optional<std::string> LimitExponents(const char* text)
+std::optional<std::string> LimitNumbers(const char* text)
 {
     const std::size_t endlessDigits = FindEndlessDigits(text);
     if (endlessDigits != std::string_view::npos)
     {
-        return LimitExponents(std::string(text, endlessDigits).c_str())
-            .value_or(std::string(text, endlessDigits));
+        std::string readable(text, endlessDigits);
+        std::optional<std::string> limited = LimitNumbers(readable.c_str());
+        return limited ? std::move(limited) : std::move(readable);
     }
     if (!MayHaveLongExponent(text))
     {
