@@ -1,5 +1,5 @@
-#include "Tools/DocTools/VantorPagemeld/Json/JsonReader.h"
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
+#include "Tools/DocTools/VantorPagemeld/Read/JsonReader.h"
 #include "fuzz/Property.h"
 
 #include <algorithm>
@@ -37,7 +37,8 @@ void RequireSameFailure(const rapidjson::ParseResult& result, const rapidjson::D
             "what is refused beyond the library's rules is an infinite number before any error of theirs");
         return;
     }
-    Require(result.Code() == plain.GetParseError() && result.Offset() == plain.GetErrorOffset(),
+    Require(document.GetParseError() == plain.GetParseError() && result.Code() == plain.GetParseError() &&
+                result.Offset() == plain.GetErrorOffset(),
             "any other refusal is the library's");
 }
 
@@ -59,6 +60,6 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     Require(!plain.HasParseError() && IsSameValue(document, plain),
             "an accepted text is what the library reads");
     RequireReadsBack(document, RapidJsonIoUtil::OutputJsonValueToString(document).c_str());
-    RequireReadsBack(document, RapidJsonIoUtil::RenderPrettyJson(document).GetString());
+    RequireReadsBack(document, RenderPrettyJson(document).GetString());
     return 0;
 }

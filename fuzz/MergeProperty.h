@@ -1,11 +1,9 @@
 #pragma once
 
-#include "Tools/DocTools/VantorPagemeld/Json/JsonReader.h"
-#include "Tools/DocTools/VantorPagemeld/Structure/JsonPlace.h"
-#include "Tools/DocTools/VantorPagemeld/Structure/StructureFault.h"
+#include "Tools/DocTools/VantorPagemeld/Check/StructureFault.h"
+#include "Tools/DocTools/VantorPagemeld/Read/JsonReader.h"
 #include "fuzz/Property.h"
-
-#include <list>
+#include "tests/support/MergedModules.h"
 
 // What the merges of search indexes and of tables of contents have in common.
 
@@ -14,33 +12,32 @@ template <class Check>
 bool IsSound(Check check, const rapidjson::Value& document)
 {
     int faults = 0;
-    Require(check(document, [&](const StructureFault&, const JsonPlace& place)
-                  { return (void)place.ToPointer(), ++faults > 0; }),
+    Require(check(document, [&](const StructureFault&, const JsonPointer& pointer, const rapidjson::Value&)
+                  { return (void)pointer.Text(), ++faults > 0; }),
             "a check that is told to go on does");
-    const bool sound = check(document, [](const StructureFault&, const JsonPlace&) { return false; });
+    const bool sound = check(document, [](const StructureFault&, const JsonPointer&, const rapidjson::Value&)
+                             { return false; });
     Require(sound == (faults == 0), "the first fault and all faults agree");
     return sound;
 }
 
-/// Merges those of the texts that are sound into the combiner, and requires that the result equals a plain
-/// merge. The documents hold the values of the result. Returns how many were merged.
-template <class PlainMerge, class Combiner, class Check>
-int MergeLikePlain(Combiner& combiner, std::list<rapidjson::Document>& documents, Check check,
-                   const std::vector<std::string>& texts)
+/// Merges those of the texts that are sound, by the combiner and by a plain merge. Requires that the results
+/// are equal, and hands over the combiner's.
+template <class PlainMerge, class Combiner, class Check, class Handler>
+void MergeLikePlain(Check check, const std::vector<std::string>& texts, Handler handleMerged)
 {
     PlainMerge plain;
-    int moduleIndex = 0;
+    std::vector<std::string> soundTexts;
     for (const std::string& text : texts)
     {
-        rapidjson::Document& document = documents.emplace_back();
+        rapidjson::Document document;
         if (!ParseJson(text.c_str(), document).IsError() && IsSound(check, document))
         {
-            plain.Append(document, moduleIndex);
-            combiner.AddModuleIndexToEachEntry(document, moduleIndex);
-            combiner.AppendJsonDocument(document);
-            ++moduleIndex;
+            plain.Append(document, static_cast<int>(soundTexts.size()));
+            soundTexts.push_back(text);
         }
     }
-    Require(IsSameValue(combiner.combinedDocument, plain.Merged()), "the merge equals the plain one");
-    return moduleIndex;
+    MergedModules<Combiner> merged(soundTexts);
+    Require(IsSameValue(merged.Get().combinedDocument, plain.Merged()), "the merge equals the plain one");
+    handleMerged(merged.Get().combinedDocument);
 }

@@ -1,7 +1,7 @@
 #include "fuzz/Property.h"
 
-#include "Tools/DocTools/VantorPagemeld/Json/JsonReader.h"
-#include "Tools/DocTools/VantorPagemeld/Json/JsonValue.h"
+#include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
+#include "Tools/DocTools/VantorPagemeld/Read/JsonReader.h"
 
 #include <algorithm>
 #include <cmath>

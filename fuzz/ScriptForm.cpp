@@ -1,7 +1,7 @@
 #include "fuzz/ScriptForm.h"
 
-#include "Tools/DocTools/VantorPagemeld/Json/JsonReader.h"
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
+#include "Tools/DocTools/VantorPagemeld/Read/JsonReader.h"
 #include "fuzz/Property.h"
 
 #include <cstring>

@@ -1,4 +1,4 @@
-#include "Tools/DocTools/VantorPagemeld/Json/JsonReader.h"
+#include "Tools/DocTools/VantorPagemeld/Read/JsonReader.h"
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
 #include "tests/support/MergedModules.h"
 #include "tests/support/Repeated.h"
@@ -38,11 +38,11 @@ void RunOnSmallStack(std::function<void()> function)
     ::pthread_attr_destroy(&attributes);
 }
 
-/// Returns the indented form without its blanks, which can be more than half a gigabyte.
+/// Returns the pretty form without its spaces, which can take more than half a gigabyte.
 std::string Lines(const rapidjson::Value& value)
 {
-    RenderedText text;
-    rapidjson::PrettyWriter<RenderedText> writer(text);
+    TextBuffer text;
+    rapidjson::PrettyWriter<TextBuffer> writer(text);
     writer.SetIndent(' ', 0);
     EXPECT_TRUE(value.Accept(writer));
     return text.GetString();
@@ -56,13 +56,13 @@ void MergeDeepTocs()
     // The second is copied below the first, the third merged with it level by level.
     MergedModules<TocCombiner> merged({R"({"link":"l","title":"t","children":null})", deep, deep});
     TocCombiner& combiner = merged.Get();
-    EXPECT_TRUE(combiner.VerifyJSONStructure(combiner.combinedDocument));
+    EXPECT_TRUE(combiner.TocCombiner::VerifyJSONStructure(combiner.combinedDocument));
     EXPECT_EQ(Repeated(node, kLevels) + Repeated(R"(],"module":1})", kLevels - 1) + R"(],"module":0})",
               merged.Json());
     EXPECT_EQ("toc = {\n\"link\": \"l\",\"title\": \"t\",\"children\": [" +
                   Repeated(R"({"link": p1+"l","title": "t","children": [)", kLevels - 1) +
                   Repeated("]}", kLevels - 1) + "]};\n",
-              TextOf(*combiner.RenderScript(combiner.combinedDocument)));
+              TextOf(RenderTocScript(combiner.combinedDocument)));
 }
 
 } // namespace

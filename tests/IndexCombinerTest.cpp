@@ -97,3 +97,44 @@ TEST(IndexCombiner, ManyTermsKeepTheirOrderAndNumbers)
     const std::string json = MergedModules<IndexCombiner>(modules).Json();
     EXPECT_TRUE(json.find("\"searchIndex\":{" + Joined(expected) + "}}") != std::string::npos);
 }
+
+TEST(IndexCombiner, PublicMergesAreRightForAnyValues)
+{
+    const struct
+    {
+        const char* combined;
+        const char* input;
+        const char* merged; ///< with numbers raised by 10
+    } cases[] = {
+        {R"({"b":[0]})", R"({"b":[0]})", R"({"b":[0,10]})"},
+        {R"({"a":[0]})", R"({"b":[0]})", R"({"a":[0],"b":[10]})"},
+        {R"({"b":[1]})", R"({"b":[0,1]})", R"({"b":[1,10,11]})"},
+        {R"({"a":[],"b":[1],"a":[2],"a\u0000":[3]})", R"({"a\u0000":[0],"a":[0]})",
+         R"({"a":[10],"b":[1],"a":[2],"a\u0000":[3,10]})"}, // the first of a name counts
+    };
+    IndexCombiner combiner;
+    rapidjson::Document::AllocatorType pool;
+    for (const auto& c : cases)
+    {
+        pool.Clear(); // so that the values of all rows lie at the same addresses
+        rapidjson::Document combined(&pool);
+        rapidjson::Document input(&pool);
+        combined.Parse(c.combined);
+        input.Parse(c.input);
+        combiner.CombineSearchIndexJson(combined, input, 10);
+        EXPECT_EQ(c.merged, RapidJsonIoUtil::OutputJsonValueToString(combined));
+    }
+}
+
+TEST(IndexCombiner, MergesIntoWhatItsCallerChanged)
+{
+    const char* const module = R"({"pages":[],"info":[],"common":{},"searchIndex":{"a":[],"b":[1]}})";
+    rapidjson::Document first = ParsedJson(module);
+    rapidjson::Document second = ParsedJson(module);
+    IndexCombiner combiner;
+    combiner.AppendJsonDocument(first);
+    combiner.combinedDocument["searchIndex"].MemberBegin()->name.SetString("c");
+    combiner.AppendJsonDocument(second);
+    EXPECT_EQ(R"({"pages":[],"info":[],"common":{},"searchIndex":{"c":[],"b":[1,1],"a":[]}})",
+              RapidJsonIoUtil::OutputJsonValueToString(combiner.combinedDocument));
+}

@@ -1,11 +1,12 @@
+#include "Tools/DocTools/VantorPagemeld/Check/IndexStructure.h"
+#include "Tools/DocTools/VantorPagemeld/Check/TocStructure.h"
 #include "Tools/DocTools/VantorPagemeld/IndexCombiner.h"
-#include "Tools/DocTools/VantorPagemeld/Structure/IndexStructure.h"
-#include "Tools/DocTools/VantorPagemeld/Structure/TocStructure.h"
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
 #include "tests/support/CapturedStderr.h"
 #include "tests/support/ParsedJson.h"
 
 #include <gtest/gtest.h>
+#include <rapidjson/pointer.h>
 
 namespace
 {
@@ -39,12 +40,15 @@ template <class Check>
 std::string AllFaults(Check check, const rapidjson::Value& document)
 {
     std::string faults;
-    const bool wentOn = check(document,
-                              [&](const StructureFault& fault, const JsonPlace& place)
-                              {
-                                  faults += std::to_string(fault.number) + place.ToPointer() + " ";
-                                  return true;
-                              });
+    const bool wentOn =
+        check(document,
+              [&](const StructureFault& fault, const JsonPointer& pointer, const rapidjson::Value& value)
+              {
+                  const std::string where = pointer.Text();
+                  EXPECT_EQ(&value, rapidjson::Pointer(where.c_str()).Get(document)) << where;
+                  faults += std::to_string(fault.number) + where + " ";
+                  return true;
+              });
     return wentOn ? faults : faults + "stopped";
 }
 
@@ -69,19 +73,20 @@ TEST(IndexStructure, FirstFaultIsReportedAndEveryFaultIsFound)
         {R"({"pages":[],"info":[],"common":{},"searchIndex":{}})", "", ""},
         {R"({"x":[[]],"searchIndex":{"a":[0,1,0],"a":[]},"common":{"a":1},"info":[["t",0],["u",1]],"pages":[["",""],["a","b"]]})",
          "", ""},
-        {"[]", "", "0 "}, // refused without a word
+        {"[]", "", "0 "}, // refused without a message
         {"null", "", "0 "},
         {"\"pages\"", "", "0 "},
         {"{}", "290 Pages is not an array or absent", "290 296 302 308 "},
-        {R"({"pages":{},"common":{},"searchIndex":{}})", "290 Pages is not an array or absent", "290 296 "},
+        {R"({"pages":{},"common":{},"searchIndex":{}})", "290 Pages is not an array or absent",
+         "290/pages 296 "},
         {R"({"pages":[],"common":[],"searchIndex":[]})", "296 Info is not an array or absent",
-         "296 302 308 "},
+         "296 302/common 308/searchIndex "},
         {R"({"pages":[],"info":[],"common":null,"searchIndex":0})", "302 Common is not an object or absent",
-         "302 308 "},
+         "302/common 308/searchIndex "},
         {R"({"pages":[],"info":[],"common":{},"searchIndex":[]})",
-         "308 SearchIndex is not an object or absent", "308 "},
+         "308 SearchIndex is not an object or absent", "308/searchIndex "},
         {R"({"pages":1,"pages":[],"info":[],"common":{},"searchIndex":{}})", // the first of a name counts
-         "290 Pages is not an array or absent", "290 "},
+         "290 Pages is not an array or absent", "290/pages "},
         {R"({"pages":[["a","b",0],["a"],{},["a","b"]],"info":[],"common":{},"searchIndex":{}})",
          "318 Content in pages is not an array of 2 elements", "318/pages/0 318/pages/1 318/pages/2 "},
         {R"({"pages":[["a","b"],["a",1],[null,"b"],7],"info":[],"common":{},"searchIndex":{}})",
@@ -107,7 +112,7 @@ TEST(IndexStructure, FirstFaultIsReportedAndEveryFaultIsFound)
          "401 Value in index is out of bounds", "401/searchIndex/a/2 401/searchIndex/a/3 "},
         {R"({"pages":0,"info":[["t",5]],"common":{},"searchIndex":{"a":[0]}})", // no page numbers to hold it
                                                                                 // to
-         "290 Pages is not an array or absent", "290 "},
+         "290 Pages is not an array or absent", "290/pages "},
         {R"({"pages":[["A","A"]],"info":[["A text",0]],"common":{"a":1},"searchIndex":{"a":[1]}})",
          "401 Value in index is out of bounds", "401/searchIndex/a/0 "},
     };
@@ -128,19 +133,19 @@ TEST(TocStructure, FirstFaultIsReportedAndEveryFaultIsFound)
         {R"({"children":[{"title":"","children":[],"link":"","module":"x","more":[{}]}],"title":"t","link":"null"})",
          "", ""},
         {"{}", noTitle, "372 377 382 "},
-        {"[]", noTitle, "372 377 382 "},
-        {"null", noTitle, "372 377 382 "},
-        {R"({"title":1})", noTitle, "372 377 382 "},
+        {"[]", noTitle, "372 "},
+        {"null", noTitle, "372 "},
+        {R"({"title":1})", noTitle, "372/title 377 382 "},
         {R"({"Title":"t","link":"l","children":null})", noTitle, "372 "},
-        {R"({"title":"t","link":null,"children":null})", noLink, "377 "},
+        {R"({"title":"t","link":null,"children":null})", noLink, "377/link "},
         {R"({"title":"t","link":1,"link":"l","children":null})", noLink,
-         "377 "}, // the first of a name counts
+         "377/link "}, // the first of a name counts
         {R"({"title":"t","link":"l"})", noChildren, "382 "},
-        {R"({"title":"t","link":"l","children":{}})", noChildren, "382 "},
-        {R"({"title":"t","link":"l","children":"null"})", noChildren, "382 "},
+        {R"({"title":"t","link":"l","children":{}})", noChildren, "382/children "},
+        {R"({"title":"t","link":"l","children":"null"})", noChildren, "382/children "},
         {R"({"title":"t","link":"l","children":[{"title":"a","link":"a","children":null},7,{"title":"b","link":"b","children":[{"title":"c","link":1,"children":0}]},{"link":""}]})",
          noTitle,
-         "372/children/1 377/children/1 382/children/1 377/children/2/children/0 382/children/2/children/0 "
+         "372/children/1 377/children/2/children/0/link 382/children/2/children/0/children "
          "372/children/3 382/children/3 "},
         {R"({"title":"t","link":"l","children":[{"title":"b","link":"b","children":[{"title":"c","children":[{}]}]}]})",
          noLink,

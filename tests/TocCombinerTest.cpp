@@ -10,7 +10,7 @@
 namespace
 {
 
-/// Returns a list of few different nodes, or null, with lists inside one another on so many levels.
+/// Returns a list of few different nodes, or null, with lists nested at most that many levels deep.
 std::string RandomChildren(std::mt19937& random, int levels)
 {
     const char* const texts[] = {"a", "b", "a\\u0000x", "", "\\u0000", "not a short string"};
@@ -85,5 +85,37 @@ TEST(TocCombiner, MergesAsALinearSearchWould)
         EXPECT_EQ(RapidJsonIoUtil::OutputJsonValueToString(plain.Merged()),
                   MergedModules<TocCombiner>(modules).Json())
             << "seed " << seed;
+    }
+}
+
+TEST(TocCombiner, PublicMergesAreRightForAnyValues)
+{
+    const std::string a = R"({"link":"l","title":"a","children":null})";
+    const std::string b = R"({"link":"l","title":"b","children":null})";
+    const std::string swapped = R"({"link":"a","title":"l","children":null})";
+    const struct
+    {
+        std::string destination;
+        std::string source;
+        std::string merged;
+    } cases[] = {
+        {"[" + a + "]", "[" + a + "]", "[" + a + "]"},
+        {"[" + b + "]", "[" + a + "]", "[" + b + "," + a + "]"},
+        {"[" + a + "]", "[" + b + "]", "[" + a + "," + b + "]"},
+        {"[" + a + "]", "[" + swapped + "]", "[" + a + "," + swapped + "]"},
+        {R"([{"link":"l"},)" + a + "," + a + "]", R"([{"link":"l","title":"a","children":[]}])",
+         R"([{"link":"l"},{"link":"l","title":"a","children":[]},)" + a + "]"}, // the first of them counts
+    };
+    TocCombiner combiner;
+    rapidjson::Document::AllocatorType pool;
+    for (const auto& c : cases)
+    {
+        pool.Clear(); // so that the values of all rows lie at the same addresses
+        rapidjson::Document destination(&pool);
+        rapidjson::Document source(&pool);
+        destination.Parse(c.destination.c_str());
+        source.Parse(c.source.c_str());
+        combiner.AppendJsonValue(destination, source);
+        EXPECT_EQ(c.merged, RapidJsonIoUtil::OutputJsonValueToString(destination));
     }
 }

@@ -1,11 +1,12 @@
 #pragma once
 
-#include "Tools/DocTools/VantorPagemeld/Output/ScopedFile.h"
+#include "Tools/DocTools/VantorPagemeld/System/ScopedFile.h"
 
 #include <algorithm>
 #include <string>
+#include <utility>
 
-/// An unbuffered stream whose device takes so many bytes and is full then: writes beyond fail.
+/// An unbuffered stream whose device is full after capacity bytes: writes beyond fail.
 class FullDevice
 {
 public:
@@ -18,6 +19,9 @@ public:
     }
 
     [[nodiscard]] std::FILE* Stream() const { return m_stream.get(); }
+
+    /// Hands over the stream, which must not outlive this object.
+    ScopedFile Take() { return std::move(m_stream); }
 
     /// What has reached the device so far.
     [[nodiscard]] const std::string& Arrived() const { return m_arrived; }

@@ -1,6 +1,6 @@
 #include "tests/support/PlainMerge.h"
 
-#include "Tools/DocTools/VantorPagemeld/Json/JsonValue.h"
+#include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 
 #include <cstdlib>
 #include <cstring>

@@ -1,7 +1,5 @@
 #pragma once
 
-#include <gtest/gtest.h>
-
 #include <cstdlib>
 #include <filesystem>
 #include <string>
@@ -10,7 +8,7 @@
 class TemporaryFolder
 {
 public:
-    TemporaryFolder() : m_path(testing::TempDir() + "pagemeld-test-XXXXXX")
+    TemporaryFolder() : m_path(std::filesystem::temp_directory_path() / "pagemeld-test-XXXXXX")
     {
         if (::mkdtemp(m_path.data()) == nullptr)
         {

@@ -1,61 +1,43 @@
 #include "Tools/DocTools/VantorPagemeld/DocumentationSet.h"
 
 #include "Tools/DocTools/VantorPagemeld/IndexCombiner.h"
+#include "Tools/DocTools/VantorPagemeld/ModulePath.h"
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
-#include "Tools/DocTools/VantorPagemeld/Script/IndexScript.h"
+#include "Tools/DocTools/VantorPagemeld/Render/IndexScript.h"
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
-
-#include <cstdio>
-#include <functional>
-#include <optional>
 
 namespace
 {
 
-/// Writes one output of the module at modulePath to the file at outputPath. Returns whether it was written.
-using OutputWriter = std::function<bool(const char* modulePath, const char* outputPath)>;
-
+/// One of the files that every module receives.
 struct Output
 {
-    const char* name; ///< the file, behind a module path
-    OutputWriter write;
+    const char* name;
+    const OutputKind& kind;
+    const JsonCombiner* prefixes; ///< whose prefix lines come before the body; null for JSON
+    SharedText body;
 };
 
-void WriteAndRename(const std::string& modulePath, const Output& output)
-{
-    const std::string finalPath = modulePath + output.name;
-    const std::string temporaryPath = finalPath + ".tmp";
-    if (output.write(modulePath.c_str(), temporaryPath.c_str()))
-    {
-        // A rename that fails is deliberately not reported.
-        (void)std::rename(temporaryPath.c_str(), finalPath.c_str());
-    }
-}
-
-/// Renders each output once, and writes all of them for each module in turn.
+/// Writes all outputs for each module in turn. Each body is rendered only once.
 void WriteOutputs(const std::list<std::string>& modulePaths, const IndexCombiner& index,
                   const TocCombiner& toc)
 {
-    RepeatedText indexJson(RapidJsonIoUtil::RenderPrettyJson(index.combinedDocument));
-    const RenderedText indexScript = RenderIndexScript(index.combinedDocument);
-    RepeatedText tocJson(RapidJsonIoUtil::RenderPrettyJson(toc.combinedDocument));
-    const std::optional<RenderedText> tocScript = toc.RenderScript(toc.combinedDocument);
-
-    const Output outputs[] = {
-        {"/docdata/global_index.json", [&](const char*, const char* path)
-         { return RapidJsonIoUtil::OutputJsonTextToFile(indexJson, path); }},
-        {"/docdata/global_index.js",
-         [&](const char* module, const char* path) { return index.OutputScript(module, indexScript, path); }},
-        {"/docdata/global_toc.json",
-         [&](const char*, const char* path) { return RapidJsonIoUtil::OutputJsonTextToFile(tocJson, path); }},
-        {"/docdata/global_toc.js",
-         [&](const char* module, const char* path) { return toc.OutputScript(module, tocScript, path); }},
+    Output outputs[] = {
+        {kIndexJsonOutput, RapidJsonIoUtil::kJsonFile, nullptr,
+         SharedText(RenderPrettyJson(index.combinedDocument))},
+        {kIndexScriptOutput, IndexCombiner::kScriptFile, &index,
+         SharedText(RenderIndexScript(index.combinedDocument))},
+        {kTocJsonOutput, RapidJsonIoUtil::kJsonFile, nullptr,
+         SharedText(RenderPrettyJson(toc.combinedDocument))},
+        {kTocScriptOutput, TocCombiner::kScriptFile, &toc, SharedText(RenderTocScript(toc.combinedDocument))},
     };
-    for (const std::string& modulePath : modulePaths)
+    for (const std::string& path : modulePaths)
     {
-        for (const Output& output : outputs)
+        for (Output& output : outputs)
         {
-            WriteAndRename(modulePath, output);
+            const std::string head =
+                output.prefixes == nullptr ? "" : output.prefixes->PrefixLines(path.c_str());
+            ReplaceOutput(ModulePath(path).File(output.name), head, output.body, output.kind);
         }
     }
 }
@@ -67,16 +49,16 @@ int CombineAllTocAndIndex(const std::list<std::string>& moduleRoots, const std::
     std::list<std::string> modulePaths;
     for (const std::string& root : moduleRoots)
     {
-        modulePaths.push_back(root + "/" + setName);
+        modulePaths.push_back(ModulePath(root, setName).Text());
     }
 
     IndexCombiner index;
-    if (!index.CombineJson(modulePaths, "docdata/index.json"))
+    if (!index.CombineJson(modulePaths, kIndexInput))
     {
         return -1;
     }
     TocCombiner toc;
-    if (!toc.CombineJson(modulePaths, "docdata/toc.json"))
+    if (!toc.CombineJson(modulePaths, kTocInput))
     {
         return -1;
     }

@@ -1,11 +1,9 @@
 #include "Tools/DocTools/VantorPagemeld/IndexCombiner.h"
 
-#include "Tools/DocTools/VantorPagemeld/Output/Diagnostics.h"
-#include "Tools/DocTools/VantorPagemeld/Output/OutputFile.h"
-#include "Tools/DocTools/VantorPagemeld/Script/IndexScript.h"
-#include "Tools/DocTools/VantorPagemeld/Structure/IndexStructure.h"
+#include "Tools/DocTools/VantorPagemeld/Check/IndexStructure.h"
+#include "Tools/DocTools/VantorPagemeld/Render/IndexScript.h"
+#include "Tools/DocTools/VantorPagemeld/System/Messages.h"
 
-#include <algorithm>
 #include <cstdint>
 
 namespace
@@ -20,7 +18,25 @@ void Rebase(rapidjson::Value& number, int offset)
         static_cast<int>(static_cast<std::uint32_t>(number.GetInt()) + static_cast<std::uint32_t>(offset)));
 }
 
+bool ReportAndStop(const StructureFault& fault, const JsonPointer& /*pointer*/,
+                   const rapidjson::Value& /*value*/)
+{
+    if (fault.text != nullptr)
+    {
+        kDiagnostics.Warning(fault.number, "%s\n", fault.text);
+    }
+    return false;
+}
+
+void EndRun(const char* path)
+{
+    // This message deliberately has no line break.
+    kDiagnostics.CriticalAndExit(176, "Unable to open file %s for writing", path);
+}
+
 } // namespace
+
+const OutputKind IndexCombiner::kScriptFile = {EndRun, false};
 
 IndexCombiner::IndexCombiner()
 {
@@ -33,19 +49,15 @@ IndexCombiner::IndexCombiner()
 
 bool IndexCombiner::VerifyJSONStructure(const rapidjson::Value& document)
 {
-    return CheckIndexStructure(document,
-                               [](const StructureFault& fault, const JsonPlace&)
-                               {
-                                   if (fault.text != nullptr)
-                                   {
-                                       kDiagnostics.Warning(fault.number, "%s\n", fault.text);
-                                   }
-                                   return false;
-                               });
+    return CheckIndexStructure(document, ReportAndStop);
 }
 
 void IndexCombiner::AppendJsonDocument(rapidjson::Document& document)
 {
+    if (!ContinuesMerging())
+    {
+        m_merge = std::make_unique<Merge>(combinedDocument["searchIndex"], m_largeObjects);
+    }
     rapidjson::Value& common = combinedDocument["common"];
     if (common.ObjectEmpty())
     {
@@ -55,9 +67,9 @@ void IndexCombiner::AppendJsonDocument(rapidjson::Document& document)
     rapidjson::Value& info = combinedDocument["info"];
     const auto pageOffset = static_cast<int>(pages.Size());
     const auto infoOffset = static_cast<int>(info.Size());
-    m_lists.MoveElements(pages, document["pages"], combinedDocument.GetAllocator());
-    CombineInfoJson(info, document["info"], pageOffset);
-    CombineSearchIndexJson(combinedDocument["searchIndex"], document["searchIndex"], infoOffset);
+    m_merge->arrays.MoveElements(pages, document["pages"], combinedDocument.GetAllocator());
+    MoveInfo(m_merge->arrays, info, document["info"], pageOffset);
+    MoveTerms(*m_merge, document["searchIndex"], infoOffset);
 }
 
 void IndexCombiner::AddModuleIndexToEachEntry(rapidjson::Document& document, int moduleIndex)
@@ -71,43 +83,44 @@ void IndexCombiner::AddModuleIndexToEachEntry(rapidjson::Document& document, int
 bool IndexCombiner::OutputJsonValueAsJs(const char* modulePath, const rapidjson::Document& document,
                                         const char* outputPath)
 {
-    return OutputScript(modulePath, RenderIndexScript(document), outputPath);
-}
-
-bool IndexCombiner::OutputScript(const char* modulePath, const RenderedText& script,
-                                 const char* outputPath) const
-{
-    OutputFile file(outputPath);
-    if (!file.IsOpen())
-    {
-        // This message deliberately has no line break.
-        kDiagnostics.CriticalAndExit(176, "Unable to open file %s for writing", outputPath);
-    }
-    return file.Finish(WriteScript(modulePath, script, file.Stream()));
+    SharedText script(RenderIndexScript(document));
+    return WriteOutput(outputPath, PrefixLines(modulePath), script, kScriptFile);
 }
 
 void IndexCombiner::CombineInfoJson(rapidjson::Value& combined, rapidjson::Value& input, int pageOffset)
 {
-    for (rapidjson::Value& entry : input.GetArray())
-    {
-        Rebase(entry[1], pageOffset);
-    }
-    m_lists.MoveElements(combined, input, combinedDocument.GetAllocator());
+    ArrayRecycler arrays;
+    MoveInfo(arrays, combined, input, pageOffset);
 }
 
 void IndexCombiner::CombineSearchIndexJson(rapidjson::Value& combined, rapidjson::Value& input,
                                            int infoOffset)
 {
-    m_terms.Follow(combined);
+    Merge merge(combined, m_largeObjects);
+    MoveTerms(merge, input, infoOffset);
+}
+
+void IndexCombiner::MoveInfo(ArrayRecycler& arrays, rapidjson::Value& combined, rapidjson::Value& input,
+                             int pageOffset)
+{
+    for (rapidjson::Value& entry : input.GetArray())
+    {
+        Rebase(entry[1], pageOffset);
+    }
+    arrays.MoveElements(combined, input, combinedDocument.GetAllocator());
+}
+
+void IndexCombiner::MoveTerms(Merge& merge, rapidjson::Value& input, int infoOffset)
+{
     for (auto& term : input.GetObject())
     {
         for (rapidjson::Value& infoNumber : term.value.GetArray())
         {
             Rebase(infoNumber, infoOffset);
         }
-        if (rapidjson::Value* known = m_terms.FindOrAppend(term, combinedDocument.GetAllocator()))
+        if (rapidjson::Value* known = merge.terms.FindOrAppend(term, combinedDocument.GetAllocator()))
         {
-            m_lists.MoveElements(*known, term.value, combinedDocument.GetAllocator());
+            merge.arrays.MoveElements(*known, term.value, combinedDocument.GetAllocator());
         }
     }
 }

@@ -1,8 +1,11 @@
 #pragma once
 
-#include "Tools/DocTools/VantorPagemeld/Json/SpareLists.h"
 #include "Tools/DocTools/VantorPagemeld/JsonCombiner.h"
-#include "Tools/DocTools/VantorPagemeld/Lookup/TermIndex.h"
+#include "Tools/DocTools/VantorPagemeld/Merge/ArrayRecycler.h"
+#include "Tools/DocTools/VantorPagemeld/Merge/TermIndex.h"
+#include "Tools/DocTools/VantorPagemeld/Write/OutputFile.h"
+
+#include <memory>
 
 /// Merges the search indexes of all modules. Pages and infos are appended, the numbers that point to them
 /// re-based; a term that several modules use holds the numbers of the first, then those of the second, and so
@@ -10,6 +13,9 @@
 class IndexCombiner : public JsonCombiner
 {
 public:
+    /// The kind of file that OutputJsonValueAsJs writes.
+    static const OutputKind kScriptFile;
+
     /// Starts with an empty search index.
     IndexCombiner();
 
@@ -26,10 +32,7 @@ public:
     bool OutputJsonValueAsJs(const char* modulePath, const rapidjson::Document& document,
                              const char* outputPath) override;
 
-    /// Writes what RenderIndexScript returned for combinedDocument; otherwise as OutputJsonValueAsJs.
-    bool OutputScript(const char* modulePath, const RenderedText& script, const char* outputPath) const;
-
-    /// Moves the entries of input behind those of combined, their page numbers raised by pageOffset.
+    /// Moves the entries of input to the end of combined, their page numbers raised by pageOffset.
     void CombineInfoJson(rapidjson::Value& combined, rapidjson::Value& input, int pageOffset);
 
     /// Moves the terms of input into combined, their info numbers raised by infoOffset. New terms go to the
@@ -37,6 +40,18 @@ public:
     void CombineSearchIndexJson(rapidjson::Value& combined, rapidjson::Value& input, int infoOffset);
 
 private:
-    TermIndex m_terms;
-    SpareLists m_lists;
+    /// What one merge leaves to the next: where the terms are, and arrays to reuse.
+    struct Merge
+    {
+        Merge(rapidjson::Value& searchIndex, LargeObjectPool& pool) : terms(searchIndex, pool) {}
+
+        TermIndex terms;
+        ArrayRecycler arrays;
+    };
+
+    void MoveInfo(ArrayRecycler& arrays, rapidjson::Value& combined, rapidjson::Value& input, int pageOffset);
+    void MoveTerms(Merge& merge, rapidjson::Value& input, int infoOffset);
+
+    LargeObjectPool m_largeObjects;
+    std::unique_ptr<Merge> m_merge;
 };

@@ -1,7 +1,8 @@
 #include "Tools/DocTools/VantorPagemeld/JsonCombiner.h"
 
+#include "Tools/DocTools/VantorPagemeld/ModulePath.h"
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
-#include "Tools/DocTools/VantorPagemeld/Script/RelativePrefix.h"
+#include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"
 
 JsonCombiner::JsonCombiner() : defaultJson("{}") {}
 
@@ -21,21 +22,23 @@ bool JsonCombiner::InitializeCombinedDocument()
 bool JsonCombiner::CombineJson(const std::list<std::string>& modulePaths, const std::string& fileName)
 {
     int nextModuleIndex = 0;
-    for (const std::string& modulePath : modulePaths)
+    for (const std::string& path : modulePaths)
     {
+        const ModulePath modulePath(path);
         rapidjson::Document& document = *moduleDocuments.emplace_back(
             std::make_unique<rapidjson::Document>(&modulePools.emplace_back().allocator));
-        const std::string filePath = modulePath + "/" + fileName;
-        if (!RapidJsonIoUtil::TryGetJsonDocFromFile(filePath.c_str(), document) ||
+        if (!RapidJsonIoUtil::TryGetJsonDocFromFile(modulePath.File(fileName).c_str(), document) ||
             !VerifyJSONStructure(document))
         {
             continue;
         }
-        SetModulePathAtIndex(nextModuleIndex, modulePath + "/");
+        SetModulePathAtIndex(nextModuleIndex, modulePath.AsLinkTarget());
         AddModuleIndexToEachEntry(document, nextModuleIndex);
         AppendJsonDocument(document);
         ++nextModuleIndex;
+        m_continuesMerging = true;
     }
+    m_continuesMerging = false;
     return nextModuleIndex > 0;
 }
 
@@ -44,20 +47,12 @@ void JsonCombiner::SetModulePathAtIndex(int moduleIndex, const std::string& path
     modulePathTable[moduleIndex] = path;
 }
 
-bool JsonCombiner::OutputPrefixVars(const char* modulePath, std::FILE* stream) const
+std::string JsonCombiner::PrefixLines(const char* modulePath) const
 {
-    for (const auto& [moduleIndex, path] : modulePathTable)
-    {
-        const std::string prefix = RelativePrefix(modulePath, path);
-        if (std::fprintf(stream, "var p%d = \"%s\";\n", moduleIndex, prefix.c_str()) < 0)
-        {
-            return false;
-        }
-    }
-    return true;
+    return RenderPrefixLines(modulePath, modulePathTable);
 }
 
-bool JsonCombiner::WriteScript(const char* modulePath, const RenderedText& script, std::FILE* stream) const
+bool JsonCombiner::OutputPrefixVars(const char* modulePath, std::FILE* stream) const
 {
-    return OutputPrefixVars(modulePath, stream) && WriteText(stream, TextOf(script));
+    return WriteText(stream, PrefixLines(modulePath));
 }

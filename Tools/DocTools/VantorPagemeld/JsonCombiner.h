@@ -1,7 +1,6 @@
 #pragma once
 
-#include "Tools/DocTools/VantorPagemeld/Json/PoolWithSmallStart.h"
-#include "Tools/DocTools/VantorPagemeld/Output/RenderedText.h"
+#include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 
 #include <rapidjson/document.h>
 
@@ -13,7 +12,7 @@
 #include <string>
 #include <vector>
 
-/// Merges one JSON file of every documentation module into one document, and writes that as a script.
+/// Merges one JSON file of every documentation module into one document.
 ///
 /// What the file holds is the business of the derived class. A combiner is created, combines once, is asked
 /// for its outputs and is destroyed; it is used by one thread.
@@ -45,16 +44,19 @@ public:
 
     /// Reads the file of that name below every module path, and merges those that can be read and are sound.
     /// These take the module indices 0, 1, 2, ... in list order; the others are skipped, and their readers
-    /// say why.
+    /// report why.
     ///
     /// Returns whether any module was merged. To be called once.
     bool CombineJson(const std::list<std::string>& modulePaths, const std::string& fileName);
 
-    /// Stores a module's path, with its trailing '/', in the place of one that may be there.
+    /// Stores a module's path, with its trailing '/', replacing one that may be there.
     void SetModulePathAtIndex(int moduleIndex, const std::string& path);
 
-    /// Writes a line for each module that sets its prefix variable to the path from the module at modulePath.
-    /// Nothing in a path is escaped. Returns false as soon as a write fails.
+    /// Returns the prefix lines of the module at modulePath: what RenderPrefixLines makes of the module
+    /// paths.
+    [[nodiscard]] std::string PrefixLines(const char* modulePath) const;
+
+    /// Writes PrefixLines to the stream. Returns false when the stream took less.
     bool OutputPrefixVars(const char* modulePath, std::FILE* stream) const;
 
 protected:
@@ -63,18 +65,23 @@ protected:
     /// Parses defaultJson into combinedDocument. Returns whether that succeeded.
     bool InitializeCombinedDocument();
 
-    /// Writes a script for one module: the prefix variables, then what is the same in all modules. Returns
-    /// false as soon as a write fails.
-    bool WriteScript(const char* modulePath, const RenderedText& script, std::FILE* stream) const;
+    /// Whether the document that is merged now follows another one within CombineJson. Then nobody else has
+    /// changed combinedDocument in between, and what the last merge learnt about it still holds.
+    [[nodiscard]] bool ContinuesMerging() const { return m_continuesMerging; }
 
     std::map<int, std::string> modulePathTable;
     std::string defaultJson;
-    std::deque<PoolWithSmallStart>
-        modulePools; ///< one for each of the module documents, whose values it holds
-    std::vector<std::unique_ptr<rapidjson::Document>>
-        moduleDocuments; ///< every one that CombineJson tried to read
+
+    /// One for each of the module documents, whose values it holds.
+    std::deque<DocumentPool> modulePools;
+
+    /// Every document that CombineJson tried to read.
+    std::vector<std::unique_ptr<rapidjson::Document>> moduleDocuments;
 
 public:
     /// The merged result, to be read only. Its values lie in the module documents' pools too.
     rapidjson::Document combinedDocument;
+
+private:
+    bool m_continuesMerging = false;
 };

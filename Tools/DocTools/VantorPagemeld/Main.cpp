@@ -1,10 +1,9 @@
 #include "Runtime/Testing/RunNativeTests.h"
 #include "Runtime/Utilities/CommandLine.h"
 #include "Tools/DocTools/VantorPagemeld/DocumentationSet.h"
-#include "Tools/DocTools/VantorPagemeld/Memory/Heap.h"
 #include "Tools/DocTools/VantorPagemeld/ModuleDiscovery.h"
-#include "Tools/DocTools/VantorPagemeld/Output/Diagnostics.h"
-#include "Tools/DocTools/VantorPagemeld/Output/StandardStreams.h"
+#include "Tools/DocTools/VantorPagemeld/System/Memory.h"
+#include "Tools/DocTools/VantorPagemeld/System/Messages.h"
 #include "Tools/DocTools/VantorPagemeld/Verification.h"
 
 #include <algorithm>
@@ -91,7 +90,7 @@ int main(int argc, char* argv[])
     {
         if (argument == nullptr)
         {
-            // Unlike the same message above, this ends with success; it is kept so on purpose.
+            // Unlike the same message above, this ends with success; it is intentional.
             ReportUsage(212, program);
             return kSuccess;
         }

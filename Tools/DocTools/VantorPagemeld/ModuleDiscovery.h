@@ -3,7 +3,7 @@
 #include <list>
 #include <string>
 
-/// Appends every documentation module below a directory to the list: each directory that holds the folder
+/// Appends every documentation module below a directory to the list: each directory that holds the directory
 /// Manual/docdata.
 ///
 /// Walks depth first, siblings in the byte order of their names, and does not look inside a module. The

@@ -1,9 +1,8 @@
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
 
-#include "Tools/DocTools/VantorPagemeld/Json/JsonValue.h"
-#include "Tools/DocTools/VantorPagemeld/Output/Diagnostics.h"
-#include "Tools/DocTools/VantorPagemeld/Output/OutputFile.h"
-#include "Tools/DocTools/VantorPagemeld/Structure/TocStructure.h"
+#include "Tools/DocTools/VantorPagemeld/Check/TocStructure.h"
+#include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
+#include "Tools/DocTools/VantorPagemeld/System/Messages.h"
 
 #include <cstring>
 
@@ -12,17 +11,24 @@ namespace
 
 constexpr Diagnostics kDiagnostics("./Tools/DocTools/VantorPagemeld/TocCombiner");
 
-bool ReportAndStop(const StructureFault& fault, const JsonPlace& /*place*/)
+bool ReportAndStop(const StructureFault& fault, const JsonPointer& /*pointer*/,
+                   const rapidjson::Value& /*value*/)
 {
     kDiagnostics.Warning(fault.number, "%s\n", fault.text);
     return false;
 }
 
+void ReportUnopened(const char* path)
+{
+    kDiagnostics.Error(314, "Failed to open output file %s\n", path);
+}
+
 } // namespace
+
+const OutputKind TocCombiner::kScriptFile = {ReportUnopened, false};
 
 TocCombiner::TocCombiner()
 {
-    defaultJson = "{}";
     if (!InitializeCombinedDocument())
     {
         kDiagnostics.CriticalAndExit(17, "Failed to initialize the base JSON object\n");
@@ -31,14 +37,18 @@ TocCombiner::TocCombiner()
 
 bool TocCombiner::VerifyJSONStructure(const rapidjson::Value& node)
 {
-    return CheckTocNode(node, JsonPlace(), ReportAndStop,
-                        [this](const rapidjson::Value& child, const JsonPlace&)
+    return CheckTocNode(node, JsonPointer(), ReportAndStop,
+                        [this](const rapidjson::Value& child, const JsonPointer&)
                         { return VerifyJSONStructure(child); });
 }
 
 void TocCombiner::AppendJsonDocument(rapidjson::Document& document)
 {
-    AppendJsonValue(combinedDocument, document);
+    if (!ContinuesMerging())
+    {
+        m_siblings.clear();
+    }
+    AppendValue(m_siblings, combinedDocument, document);
 }
 
 void TocCombiner::AddModuleIndexToEachEntry(rapidjson::Document& document, int moduleIndex)
@@ -49,28 +59,12 @@ void TocCombiner::AddModuleIndexToEachEntry(rapidjson::Document& document, int m
 bool TocCombiner::OutputJsonValueAsJs(const char* modulePath, const rapidjson::Document& document,
                                       const char* outputPath)
 {
-    return OutputScript(modulePath, RenderScript(document), outputPath);
-}
-
-std::optional<RenderedText> TocCombiner::RenderScript(const rapidjson::Value& root) const
-{
-    return RenderTocScript(root, m_layout);
-}
-
-bool TocCombiner::OutputScript(const char* modulePath, const std::optional<RenderedText>& script,
-                               const char* outputPath) const
-{
-    if (!script)
+    if (FindMember(document, "link") == nullptr || FindMember(document, "title") == nullptr)
     {
         return false;
     }
-    OutputFile file(outputPath);
-    if (!file.IsOpen())
-    {
-        kDiagnostics.Error(314, "Failed to open output file %s\n", outputPath);
-        return false;
-    }
-    return file.Finish(WriteScript(modulePath, *script, file.Stream()));
+    SharedText script(RenderTocScript(document, m_layout));
+    return WriteOutput(outputPath, PrefixLines(modulePath), script, kScriptFile);
 }
 
 bool TocCombiner::SameLinkAndTitle(rapidjson::Value& a, rapidjson::Value& b)
@@ -81,36 +75,42 @@ bool TocCombiner::SameLinkAndTitle(rapidjson::Value& a, rapidjson::Value& b)
 
 void TocCombiner::AppendJsonValue(rapidjson::Value& destination, rapidjson::Value& source)
 {
+    SiblingIndexes indexes;
+    AppendValue(indexes, destination, source);
+}
+
+void TocCombiner::AppendValue(SiblingIndexes& indexes, rapidjson::Value& destination,
+                              rapidjson::Value& source)
+{
     if (source.IsArray())
     {
-        AppendList(destination, source);
+        AppendList(indexes, destination, source);
     }
     else if (source.IsObject())
     {
-        AppendNode(destination, source);
+        AppendNode(indexes, destination, source);
     }
 }
 
-void TocCombiner::AppendList(rapidjson::Value& destination, rapidjson::Value& source)
+void TocCombiner::AppendList(SiblingIndexes& indexes, rapidjson::Value& destination, rapidjson::Value& source)
 {
     if (!destination.IsArray())
     {
         destination.CopyFrom(source, combinedDocument.GetAllocator());
         return;
     }
-    SiblingIndex& siblings = m_siblings[&destination];
-    siblings.Follow(destination);
+    SiblingIndex& siblings = indexes.try_emplace(&destination, destination).first->second;
     for (rapidjson::Value& entry : source.GetArray())
     {
         if (rapidjson::Value* children =
                 siblings.FindChildrenOrAppend(entry, combinedDocument.GetAllocator()))
         {
-            AppendJsonValue(*children, entry["children"]);
+            AppendValue(indexes, *children, entry["children"]);
         }
     }
 }
 
-void TocCombiner::AppendNode(rapidjson::Value& destination, rapidjson::Value& source)
+void TocCombiner::AppendNode(SiblingIndexes& indexes, rapidjson::Value& destination, rapidjson::Value& source)
 {
     if (FindMember(destination, "link") == nullptr || FindMember(destination, "title") == nullptr)
     {
@@ -118,7 +118,7 @@ void TocCombiner::AppendNode(rapidjson::Value& destination, rapidjson::Value& so
     }
     else if (SameLinkAndTitle(destination, source))
     {
-        AppendJsonValue(destination["children"], source["children"]);
+        AppendValue(indexes, destination["children"], source["children"]);
     }
 }
 
@@ -133,7 +133,7 @@ void TocCombiner::AddPlatformPrefixToLinks(rapidjson::Value& value, int moduleIn
     }
     else if (value.IsObject())
     {
-        // An input may bring a "module" of its own; the first one counts, and no check is wanted here.
+        // An input may bring a "module" of its own, on purpose without a check: the first one counts.
         value.AddMember("module", moduleIndex, combinedDocument.GetAllocator());
         if (rapidjson::Value* children = FindMember(value, "children"))
         {
@@ -145,14 +145,14 @@ void TocCombiner::AddPlatformPrefixToLinks(rapidjson::Value& value, int moduleIn
 bool TocCombiner::WriteQuotedStringPlusExtra(std::FILE* file, const char* text, const char* extra, int indent,
                                              bool newLine)
 {
-    RenderedText script;
+    TextBuffer script;
     AppendTocString(script, text, extra, indent, newLine, m_layout);
     return WriteText(file, TextOf(script));
 }
 
 bool TocCombiner::OutputValueAsJs(std::FILE* file, const rapidjson::Value& value, int indent)
 {
-    RenderedText script;
+    TextBuffer script;
     AppendTocValue(script, value, indent, m_layout);
     return WriteText(file, TextOf(script));
 }

@@ -1,10 +1,10 @@
 #pragma once
 
 #include "Tools/DocTools/VantorPagemeld/JsonCombiner.h"
-#include "Tools/DocTools/VantorPagemeld/Lookup/SiblingIndex.h"
-#include "Tools/DocTools/VantorPagemeld/Script/TocScript.h"
+#include "Tools/DocTools/VantorPagemeld/Merge/SiblingIndex.h"
+#include "Tools/DocTools/VantorPagemeld/Render/TocScript.h"
+#include "Tools/DocTools/VantorPagemeld/Write/OutputFile.h"
 
-#include <optional>
 #include <unordered_map>
 
 /// Merges the tables of contents of all modules. Entries of one list that have the same link and title become
@@ -12,6 +12,9 @@
 class TocCombiner : public JsonCombiner
 {
 public:
+    /// The kind of file that OutputJsonValueAsJs writes.
+    static const OutputKind kScriptFile;
+
     /// Starts with an empty object.
     TocCombiner();
 
@@ -19,23 +22,16 @@ public:
     bool VerifyJSONStructure(const rapidjson::Value& node) override;
 
     /// Trusts that the document passed VerifyJSONStructure. The first document becomes the combined one; a
-    /// later one whose root has another link or title is deliberately dropped without a word.
+    /// later one whose root has another link or title is deliberately dropped without a message.
     void AppendJsonDocument(rapidjson::Document& document) override;
 
     /// Adds a "module" member to every node, with the combined document's allocator.
     void AddModuleIndexToEachEntry(rapidjson::Document& document, int moduleIndex) override;
 
-    /// Reports an error and returns false when the file can't be opened. Returns false without a word or a
-    /// file when the root has no link or no title.
+    /// Reports an error and returns false when the file can't be opened. Returns false without a message and
+    /// without a file when the root has no link or no title.
     bool OutputJsonValueAsJs(const char* modulePath, const rapidjson::Document& document,
                              const char* outputPath) override;
-
-    /// Returns what OutputScript writes for combinedDocument.
-    [[nodiscard]] std::optional<RenderedText> RenderScript(const rapidjson::Value& root) const;
-
-    /// Writes what RenderScript returned; otherwise as OutputJsonValueAsJs.
-    bool OutputScript(const char* modulePath, const std::optional<RenderedText>& script,
-                      const char* outputPath) const;
 
     /// Whether two nodes count as the same entry: equal links and equal titles, each as NUL-terminated text.
     bool SameLinkAndTitle(rapidjson::Value& a, rapidjson::Value& b);
@@ -45,7 +41,7 @@ public:
     void AppendJsonValue(rapidjson::Value& destination, rapidjson::Value& source);
 
     /// Tags a node or list and everything below it. The links themselves stay as they are, despite the name:
-    /// their prefixes differ from one output module to the next and are put in front when the script is
+    /// their prefixes differ from one output module to the next and are put before them when the script is
     /// written.
     void AddPlatformPrefixToLinks(rapidjson::Value& value, int moduleIndex);
 
@@ -57,12 +53,14 @@ public:
     bool OutputValueAsJs(std::FILE* file, const rapidjson::Value& value, int indent);
 
 private:
-    void AppendList(rapidjson::Value& destination, rapidjson::Value& source);
-    void AppendNode(rapidjson::Value& destination, rapidjson::Value& source);
+    /// The entries of every list that another was merged into, by the address of its "children" value. That
+    /// stays where it is as long as the node is not given further members.
+    using SiblingIndexes = std::unordered_map<const rapidjson::Value*, SiblingIndex>;
+
+    void AppendValue(SiblingIndexes& indexes, rapidjson::Value& destination, rapidjson::Value& source);
+    void AppendList(SiblingIndexes& indexes, rapidjson::Value& destination, rapidjson::Value& source);
+    void AppendNode(SiblingIndexes& indexes, rapidjson::Value& destination, rapidjson::Value& source);
 
     TocScriptLayout m_layout;
-
-    /// For every combined list that another was merged into, by the address of its "children" value, which
-    /// stays where it is as long as the node is not given further members.
-    std::unordered_map<const rapidjson::Value*, SiblingIndex> m_siblings;
+    SiblingIndexes m_siblings; ///< what one merge leaves to the next
 };

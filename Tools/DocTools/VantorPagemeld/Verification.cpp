@@ -1,7 +1,7 @@
 #include "Tools/DocTools/VantorPagemeld/Verification.h"
 
-#include "Tools/DocTools/VantorPagemeld/Output/Diagnostics.h"
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
+#include "Tools/DocTools/VantorPagemeld/System/Messages.h"
 
 #include <rapidjson/document.h>
 

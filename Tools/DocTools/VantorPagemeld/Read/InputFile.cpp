@@ -1,0 +1,95 @@
+#include "Tools/DocTools/VantorPagemeld/Read/InputFile.h"
+
+#include "Tools/DocTools/VantorPagemeld/System/ScopedFile.h"
+
+#include <cerrno>
+#include <cstdint>
+#include <new>
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace
+{
+
+/// The parser counts in 32 bits.
+constexpr long kMaxFileSize = UINT32_MAX;
+
+int OpenDescriptor(const char* path)
+{
+    const int descriptor = ::open(path, O_RDONLY | O_CLOEXEC | O_NONBLOCK);
+    if (descriptor < 0 && errno == EWOULDBLOCK)
+    {
+        // Somebody holds a lease on a regular file, and gives it back when asked.
+        return ::open(path, O_RDONLY | O_CLOEXEC);
+    }
+    return descriptor;
+}
+
+ScopedFile OpenForReading(const char* path)
+{
+    const int descriptor = OpenDescriptor(path);
+    if (descriptor < 0)
+    {
+        return nullptr;
+    }
+    ScopedFile file(::fdopen(descriptor, "rb"));
+    if (file == nullptr)
+    {
+        (void)::close(descriptor);
+    }
+    return file;
+}
+
+/// Returns the size in bytes, or -1 for what has none: a directory, whatever its file system reports, or a
+/// pipe. Leaves the stream at its start.
+long SizeOf(std::FILE* file)
+{
+    struct stat status = {};
+    if (::fstat(::fileno(file), &status) != 0 || S_ISDIR(status.st_mode) ||
+        std::fseek(file, 0, SEEK_END) != 0)
+    {
+        return -1;
+    }
+    const long size = std::ftell(file);
+    std::rewind(file);
+    return size;
+}
+
+/// Returns size + 1 bytes that are not set yet, or null when the size is out of bounds or memory ran out.
+std::unique_ptr<char[]> AllocateText(long size)
+{
+    return std::unique_ptr<char[]>(size >= 0 && size <= kMaxFileSize
+                                       ? new (std::nothrow) char[static_cast<std::size_t>(size) + 1]
+                                       : nullptr);
+}
+
+} // namespace
+
+InputText ReadInputFile(const char* path)
+{
+    InputText text;
+    const ScopedFile file = OpenForReading(path);
+    if (file == nullptr)
+    {
+        return text;
+    }
+    text.outcome = InputText::Outcome::NotWhole;
+    text.size = SizeOf(file.get());
+    text.bytes = AllocateText(text.size);
+    if (text.bytes == nullptr)
+    {
+        return text;
+    }
+    const auto size = static_cast<std::size_t>(text.size);
+    text.bytesRead = std::fread(text.bytes.get(), 1, size, file.get());
+    if (text.bytesRead != size)
+    {
+        text.bytes.reset();
+        return text;
+    }
+    text.bytes[size] = '\0';
+    text.outcome = InputText::Outcome::Read;
+    return text;
+}

@@ -1,0 +1,51 @@
+#pragma once
+
+#include <rapidjson/document.h>
+
+#include <array>
+#include <cstddef>
+#include <string_view>
+
+// The memory of a JSON document, and access to its values that reaches no assertion of the JSON library,
+// whatever the value is.
+//
+// References into an array or object die when that array or object grows. The text of a string lives as long
+// as the value that holds it, since short texts lie inside the value itself.
+
+/// The memory of a document: first a small block, and after it the large ones that the library takes.
+///
+/// The library would begin with a large one, which is more than all that a small module holds, and there may
+/// be hundreds of them.
+struct DocumentPool
+{
+    alignas(std::max_align_t) std::array<char, std::size_t{8} << 10> start;
+    rapidjson::Document::AllocatorType allocator{start.data(), start.size()};
+};
+
+/// Returns the first member of that name, or null when object has none or is not an object.
+inline const rapidjson::Value* FindMember(const rapidjson::Value& object, const char* name)
+{
+    if (!object.IsObject())
+    {
+        return nullptr;
+    }
+    const auto member = object.FindMember(name);
+    return member == object.MemberEnd() ? nullptr : &member->value;
+}
+
+inline rapidjson::Value* FindMember(rapidjson::Value& object, const char* name)
+{
+    return const_cast<rapidjson::Value*>(FindMember(static_cast<const rapidjson::Value&>(object), name));
+}
+
+/// Returns all bytes of a JSON string, NUL included.
+inline std::string_view BytesOf(const rapidjson::Value& string)
+{
+    return {string.GetString(), string.GetStringLength()};
+}
+
+/// Returns a JSON string as NUL-terminated text: it ends at the first NUL.
+inline const char* CStringOf(const rapidjson::Value& string)
+{
+    return string.GetString();
+}

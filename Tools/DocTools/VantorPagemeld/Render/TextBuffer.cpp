@@ -1,0 +1,45 @@
+#include "Tools/DocTools/VantorPagemeld/Render/TextBuffer.h"
+
+#include <rapidjson/prettywriter.h>
+#include <rapidjson/writer.h>
+
+#include <cstring>
+
+std::string_view TextOf(const TextBuffer& buffer)
+{
+    return {buffer.GetString(), buffer.GetSize()};
+}
+
+void AppendText(TextBuffer& buffer, std::string_view text)
+{
+    if (!text.empty())
+    {
+        std::memcpy(buffer.Push(text.size()), text.data(), text.size());
+    }
+}
+
+void AppendEscapingQuotes(TextBuffer& buffer, std::string_view text)
+{
+    std::string_view rest = text;
+    for (std::size_t quote = rest.find('"'); quote != std::string_view::npos; quote = rest.find('"'))
+    {
+        AppendText(buffer, rest.substr(0, quote));
+        AppendText(buffer, "\\\"");
+        rest.remove_prefix(quote + 1);
+    }
+    AppendText(buffer, rest);
+}
+
+void AppendCompactJson(TextBuffer& buffer, const rapidjson::Value& value)
+{
+    rapidjson::Writer<TextBuffer> writer(buffer);
+    value.Accept(writer);
+}
+
+TextBuffer RenderPrettyJson(const rapidjson::Value& value)
+{
+    TextBuffer buffer;
+    rapidjson::PrettyWriter<TextBuffer> writer(buffer);
+    value.Accept(writer);
+    return buffer;
+}

@@ -1,0 +1,28 @@
+#pragma once
+
+#include <rapidjson/document.h>
+#include <rapidjson/stringbuffer.h>
+
+#include <string_view>
+
+/// Text that is composed in memory.
+///
+/// It is the buffer of the JSON library's writers, so that JSON and script text go into one place without a
+/// copy.
+using TextBuffer = rapidjson::StringBuffer;
+
+/// The bytes composed so far, valid until the next append.
+[[nodiscard]] std::string_view TextOf(const TextBuffer& buffer);
+
+/// Appends text at the end. Bytes are taken as they are, NUL included.
+void AppendText(TextBuffer& buffer, std::string_view text);
+
+/// Appends text with a backslash before every double quote. That is the whole escape rule of the scripts'
+/// titles: backslashes, control characters and bytes above 0x7F pass as they are, on purpose.
+void AppendEscapingQuotes(TextBuffer& buffer, std::string_view text);
+
+/// Appends the value as compact JSON: no white space between tokens.
+void AppendCompactJson(TextBuffer& buffer, const rapidjson::Value& value);
+
+/// Returns the value as pretty JSON: four spaces a level, "\n" line ends, none after the last bracket.
+[[nodiscard]] TextBuffer RenderPrettyJson(const rapidjson::Value& value);

@@ -1,0 +1,54 @@
+#include "Tools/DocTools/VantorPagemeld/Write/OutputFile.h"
+
+#include "Tools/DocTools/VantorPagemeld/System/ScopedFile.h"
+
+#include <cstdio>
+#include <utility>
+
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace
+{
+
+bool IsPipe(std::FILE* file)
+{
+    struct stat status = {};
+    return ::fstat(::fileno(file), &status) == 0 && S_ISFIFO(status.st_mode);
+}
+
+/// Returns nothing when the open fails, or when a named pipe is at path: it would keep nothing, and its
+/// reader decides how long a write takes.
+ScopedFile OpenForWriting(const char* path)
+{
+    ScopedFile file(std::fopen(path, "w+b")); // does not wait, as it asks for both ends of a pipe
+    return file != nullptr && IsPipe(file.get()) ? nullptr : std::move(file);
+}
+
+} // namespace
+
+bool WriteOutput(const char* path, std::string_view head, SharedText& body, const OutputKind& kind)
+{
+    ScopedFile file = OpenForWriting(path);
+    if (file == nullptr)
+    {
+        kind.reportUnopened(path);
+        return false;
+    }
+    const bool isComplete = body.WriteTo(std::move(file), head);
+    if (isComplete || kind.keepsIncomplete)
+    {
+        return true;
+    }
+    (void)::unlink(path);
+    return false;
+}
+
+void ReplaceOutput(const std::string& path, std::string_view head, SharedText& body, const OutputKind& kind)
+{
+    const std::string temporaryPath = path + ".tmp";
+    if (WriteOutput(temporaryPath.c_str(), head, body, kind))
+    {
+        (void)std::rename(temporaryPath.c_str(), path.c_str());
+    }
+}

@@ -1,0 +1,63 @@
+#include "Tools/DocTools/VantorPagemeld/Write/SharedText.h"
+
+#include <algorithm>
+#include <utility>
+
+#ifdef PAGEMELD_HAVE_FILE_CLONES
+#include <linux/fs.h>
+#include <sys/ioctl.h>
+#include <sys/stat.h>
+#endif
+
+SharedText::SharedText(TextBuffer text) : m_text(std::move(text)) {}
+
+bool SharedText::WriteTo(ScopedFile file, std::string_view head)
+{
+    if (head.empty() && CloneTo(file.get()))
+    {
+        return true;
+    }
+    // A flush, since the buffer holds write errors back until then.
+    const bool isComplete =
+        WriteText(file.get(), head) && WriteText(file.get(), TextOf(m_text)) && std::fflush(file.get()) == 0;
+    if (isComplete && head.empty() && m_original == nullptr)
+    {
+        m_original = std::move(file);
+    }
+    return isComplete;
+}
+
+#ifdef PAGEMELD_HAVE_FILE_CLONES
+bool SharedText::CloneTo(std::FILE* file) const
+{
+    if (m_original == nullptr || ::ioctl(::fileno(file), FICLONE, ::fileno(m_original.get())) != 0)
+    {
+        return false;
+    }
+    // Opening the file may have emptied the original: under a name that leads to it, after a failed rename.
+    struct stat status = {};
+    return ::fstat(::fileno(file), &status) == 0 &&
+           static_cast<std::size_t>(status.st_size) == m_text.GetSize();
+}
+#else
+bool SharedText::CloneTo(std::FILE*) const
+{
+    return false;
+}
+#endif
+
+bool WriteText(std::FILE* stream, std::string_view text)
+{
+    // One write of all makes the kernel look for long runs of fresh memory, which takes ext4 two to four
+    // times as long; blocks of 64 KB cost more calls.
+    constexpr std::size_t kBlockSize = std::size_t{1} << 20;
+    for (; !text.empty(); text.remove_prefix(std::min(kBlockSize, text.size())))
+    {
+        const std::string_view block = text.substr(0, kBlockSize);
+        if (std::fwrite(block.data(), 1, block.size(), stream) != block.size())
+        {
+            return false;
+        }
+    }
+    return true;
+}
