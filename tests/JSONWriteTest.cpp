@@ -35,11 +35,9 @@ TEST(JSONWrite, AddsToObjectsAndArraysAndLogsAnErrorForOthers)
 
     json.CurrentNode().SetArray();
     Add(json, -1);
-    Add(json, 2U);
     Add(json, 3UL);
     Add(json, -5'000'000'000L);
-    Add(json, -6'000'000'000LL);
-    EXPECT_EQ("[-1,2,3,-5000000000,-6000000000]", TextOf(json, false));
+    EXPECT_EQ("[-1,3,-5000000000]", TextOf(json, false));
 
     json.CurrentNode().SetNull();
     Add(json, 1);
@@ -48,17 +46,17 @@ TEST(JSONWrite, AddsToObjectsAndArraysAndLogsAnErrorForOthers)
               console.GetText());
 }
 
-TEST(JSONWrite, GrowsBeyondTheFirstBlockAndFreesAll)
+TEST(JSONWrite, KeepsItsValuesWhileItsMemoryGrowsAndFreesAll)
 {
-    std::string expected = "{";
     {
         JSONWrite json(0, nullptr);
+        std::string expected;
         for (int i = 0; i < 40; ++i)
         {
             Add(json, i);
-            expected += (i > 0 ? ",\"same\":" : "\"same\":") + std::to_string(i);
+            expected += ",\"same\":" + std::to_string(i);
         }
-        EXPECT_EQ(expected + "}", TextOf(json, false));
+        EXPECT_EQ("{" + expected.substr(1) + "}", TextOf(json, false));
         EXPECT_EQ(1U, CountLiveBlocks(MemoryLabel::Json)); // short names need no block of their own
     }
     EXPECT_EQ(0U, CountLiveBlocks(MemoryLabel::Json));

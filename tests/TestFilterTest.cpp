@@ -45,9 +45,8 @@ TEST(TestFilter, SelectsByPartsOfNamesAndBeginningsOfCategories)
         filter.categoryPrefixes = c.categoryPrefixes;
         filter.runOnlyPrefixedTests = c.runOnlyPrefixedTests;
         std::string names;
-        tests.list.ForEach(
-            [&](const UnitTest::Test* test)
-            { names += filter.Filter(test) ? " " + GetDisplayedTestName(test->m_details) : ""; });
+        tests.ForEach([&](const UnitTest::Test* test)
+                      { names += filter.Filter(test) ? " " + GetDisplayedTestName(test->m_details) : ""; });
         EXPECT_EQ(c.expected, names) << "case " << &c - cases;
     }
 }
@@ -85,7 +84,7 @@ TEST(TestFilter, IgnoresByAttributeAndByNameAndNotesWhy)
         const DescribedTests tests({{c.suiteName, c.testName, "Unit", [] {}, c.attributes}});
         TestFilter filter;
         std::string outcome;
-        tests.list.ForEach([&](const UnitTest::Test* test) { outcome += filter(test) ? "runs" : ""; });
+        tests.ForEach([&](const UnitTest::Test* test) { outcome += filter(test) ? "runs" : ""; });
         for (const DisabledTestInfo& info : filter.ignoredTests)
         {
             outcome += std::to_string(info.kind) + "|" + info.reason + "|" + std::to_string(info.caseNumber);

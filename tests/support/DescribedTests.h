@@ -35,19 +35,17 @@ private:
     void (*m_body)();
 };
 
-/// A list of such tests.
-class DescribedTests
+/// A list of such tests, which it owns.
+class DescribedTests : public UnitTest::TestList
 {
 public:
     explicit DescribedTests(const std::vector<TestDescription>& descriptions)
     {
         for (const TestDescription& description : descriptions)
         {
-            list.AddProcedurallyGeneratedTest(&m_tests.emplace_back(description));
+            AddProcedurallyGeneratedTest(&m_tests.emplace_back(description));
         }
     }
-
-    UnitTest::TestList list;
 
 private:
     std::deque<DescribedTest> m_tests;
