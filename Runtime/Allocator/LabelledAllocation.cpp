@@ -1,7 +1,8 @@
 #include "Runtime/Allocator/LabelledAllocation.h"
 
+#include <algorithm>
 #include <array>
-#include <cstdlib>
+#include <new>
 
 namespace
 {
@@ -17,29 +18,23 @@ std::size_t& LiveBlocks(MemoryLabel label)
 
 void* AllocateLabelled(MemoryLabel label, std::size_t size)
 {
-    return ReallocateLabelled(label, nullptr, size);
+    void* const memory = ::operator new(size);
+    ++LiveBlocks(label);
+    return memory;
 }
 
-void* ReallocateLabelled(MemoryLabel label, void* memory, std::size_t size)
+void* ReallocateLabelled(MemoryLabel label, void* memory, std::size_t oldSize, std::size_t newSize)
 {
-    if (size == 0)
-    {
-        FreeLabelled(label, memory);
-        return nullptr;
-    }
-    void* const resized = std::realloc(memory, size);
-    if (resized == nullptr)
-    {
-        std::abort();
-    }
-    LiveBlocks(label) += memory == nullptr ? 1 : 0;
+    void* const resized = AllocateLabelled(label, newSize);
+    std::copy_n(static_cast<const char*>(memory), std::min(oldSize, newSize), static_cast<char*>(resized));
+    FreeLabelled(label, memory);
     return resized;
 }
 
 void FreeLabelled(MemoryLabel label, void* memory)
 {
     LiveBlocks(label) -= memory == nullptr ? 0 : 1;
-    std::free(memory);
+    ::operator delete(memory);
 }
 
 std::size_t CountLiveBlocks(MemoryLabel label)

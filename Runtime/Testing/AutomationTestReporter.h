@@ -2,28 +2,46 @@
 
 #include "Runtime/Testing/NativeTestReporter.h"
 
-/// Logs status lines for programs: one when a test begins, one when it ends, with its failures between them.
-/// A reader learns everything from these, so summary and ignored tests are not reported.
+#include <cstdint>
+
+/// Logs status lines for programs: one when a test begins, one when it ends, and the test's failures between
+/// them. Neither a summary nor ignored tests are reported.
 class AutomationTestReporter : public NativeTestReporter
 {
 public:
-    /// Whether performance data is wanted is only kept: no output depends on it yet.
-    explicit AutomationTestReporter(bool reportPerformanceData)
-        : m_reportPerformanceData(reportPerformanceData)
-    {
-    }
-
-    [[nodiscard]] bool ReportsPerformanceData() const { return m_reportPerformanceData; }
-
-    void ReportSummary(int totalTests, int failedTests, int failures, float seconds) override;
+    void ReportSummary(int totalTests, int failedTestCount, int failureCount, float seconds) override;
     void ReportIgnoredTests(std::vector<DisabledTestInfo>& ignoredTests) override;
-
-protected:
     void ReportTestNameOnTestStart(const UnitTest::TestDetails& details) override;
 
     /// A negative time is not clamped: the line shows it modulo 2^64.
     void ReportTestStatusOnFinish(const UnitTest::TestDetails& details, float seconds) override;
 
-private:
-    bool m_reportPerformanceData;
+    bool reportPerformanceData = false; ///< set by the run; no output depends on it yet
 };
+
+/// The texts of the status lines: "##qzm:" and a compact JSON object, without a line break. They show the
+/// time of the call and the process id. No argument may be null.
+namespace Testing
+{
+
+constexpr unsigned int kProtocolVersion = 2;
+constexpr const char* kPhaseBegin = "Begin";
+constexpr const char* kPhaseEnd = "End";
+
+enum class TestState : std::uint32_t
+{
+    NoResult = 0,
+    Passed = 4,
+    Failed = 5
+};
+
+/// Returns the line for a test that begins. (The spelling of both functions is kept.)
+core::string TestStatusBeginMesssageToQZMString(const char* name);
+
+/// Returns the line for a test that ended, with its failure text, which may be empty, and the place where it
+/// is defined.
+core::string TestStatusEndMesssageToQZMString(const char* name, TestState state,
+                                              unsigned long long durationMicroseconds, const char* message,
+                                              const char* fileName, int lineNumber);
+
+} // namespace Testing

@@ -1,8 +1,7 @@
 #include "Runtime/Testing/Checks.h"
 
-#include "Runtime/Testing/CurrentTest.h"
-#include "Runtime/Testing/MemoryOutStream.h"
-#include "Runtime/Testing/TestResults.h"
+#include "Runtime/Testing/TestReporter.h"
+#include "Runtime/Testing/TestRunner.h"
 
 #include <cstring>
 
@@ -17,7 +16,7 @@ bool AreEqual(const char* a, const char* b)
     return a == b || (a != nullptr && b != nullptr && std::strcmp(a, b) == 0);
 }
 
-/// Writes how two texts differ, of which at most one is null.
+/// Writes how two texts differ. At most one of them is null.
 void WriteDifference(MemoryOutStream& stream, const char* expected, const char* actual)
 {
     if (expected == nullptr)

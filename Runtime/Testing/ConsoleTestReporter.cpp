@@ -1,8 +1,7 @@
 #include "Runtime/Testing/ConsoleTestReporter.h"
 
-#include "Runtime/Testing/IgnoredTests.h"
 #include "Runtime/Utilities/ConsoleLog.h"
-#include "Runtime/Utilities/Format.h"
+#include "Runtime/Utilities/TextConversion.h"
 
 #include <algorithm>
 #include <cstdio>
@@ -12,7 +11,7 @@ using UnitTest::TestDetails;
 namespace
 {
 
-/// Returns how many blanks fill a column behind a text: none if the text is longer than the column.
+/// Returns how many spaces fill a column after a text: none if the text is longer than the column.
 int FillerWidth(int columnWidth, std::size_t textLength)
 {
     return std::max(0, columnWidth - static_cast<int>(textLength));
@@ -29,6 +28,90 @@ float ClampDuration(const TestDetails& details, float seconds)
     return 0;
 }
 
+core::string DescribePass(const NativeTestReporter& reporter, float seconds)
+{
+    core::string status = Format("PASS(%lldms", static_cast<long long>(seconds * 1000));
+    for (const auto& [name, property] : reporter.properties)
+    {
+        status += ", " + name + ": " + property.AsString();
+    }
+    return status + ")\n";
+}
+
+void PrintFailure(const NativeTestReporter::Failure& failure)
+{
+    const char* const file = failure.filename.c_str();
+    if (failure.message.empty())
+    {
+        printf_console("\tCHECK FAILURE: (%s:%i)\n", file, failure.line);
+    }
+    else
+    {
+        printf_console("\tCHECK FAILURE: %s (%s:%i)\n", failure.message.c_str(), file, failure.line);
+    }
+    printf_console("%s", ""); // on purpose: the log handler sees an empty message after each failure
+}
+
+const char* TestsWere(std::size_t count)
+{
+    return count == 1 ? "test was" : "tests were";
+}
+
+/// Whether a goes before b in the report on ignored tests.
+bool GroupByBugAndReason(const DisabledTestInfo& a, const DisabledTestInfo& b)
+{
+    if (a.caseNumber != b.caseNumber)
+    {
+        return a.caseNumber > b.caseNumber;
+    }
+    if (a.reason != b.reason)
+    {
+        return a.reason > b.reason;
+    }
+    return GetDisplayedTestName(a.details).size() < GetDisplayedTestName(b.details).size();
+}
+
+bool ShareLine(const DisabledTestInfo& a, const DisabledTestInfo& b)
+{
+    return !a.reason.empty() && a.caseNumber == b.caseNumber && a.reason == b.reason;
+}
+
+/// The space after a reason stays even if no case number follows.
+core::string DescribeReason(const DisabledTestInfo& info)
+{
+    core::string text = info.reason.empty() ? "" : info.reason + " ";
+    if (info.caseNumber != 0)
+    {
+        text += Format("(case %i)", info.caseNumber);
+    }
+    return text.empty() ? "No reason given" : text;
+}
+
+core::string DescribeGroup(const DisabledTestInfo& first, std::size_t otherCount)
+{
+    core::string line =
+        Format("[%s] %s", first.details.suiteName, GetDisplayedTestName(first.details).c_str());
+    if (otherCount > 0)
+    {
+        line += Format(" and %zu other %s ignored", otherCount, TestsWere(otherCount));
+    }
+    return line + ": " + DescribeReason(first) + "\n";
+}
+
+core::string DescribeGroups(const std::vector<DisabledTestInfo>& sortedTests)
+{
+    core::string lines;
+    for (auto first = sortedTests.begin(); first != sortedTests.end();)
+    {
+        const auto end =
+            std::find_if_not(first + 1, sortedTests.end(),
+                             [&](const DisabledTestInfo& info) { return ShareLine(*first, info); });
+        lines += DescribeGroup(*first, static_cast<std::size_t>(end - first) - 1);
+        first = end;
+    }
+    return lines;
+}
+
 } // namespace
 
 void ConsoleTestReporter::ReportTestNameOnTestStart(const TestDetails& details)
@@ -41,51 +124,23 @@ void ConsoleTestReporter::ReportTestNameOnTestStart(const TestDetails& details)
 
 void ConsoleTestReporter::ReportTestStatusOnFinish(const TestDetails& details, float seconds)
 {
-    if (HasCurrentTestFailed())
+    if (currentTestFailed)
     {
         printf_console("FAIL!!!!\n");
     }
     else
     {
-        PrintPass(details, seconds);
+        printf_console("%s", DescribePass(*this, ClampDuration(details, seconds)).c_str());
     }
-    PrintFailures();
+    std::for_each(failures.begin(), failures.end(), PrintFailure);
 }
 
-void ConsoleTestReporter::PrintPass(const TestDetails& details, float seconds) const
-{
-    const float milliseconds = ClampDuration(details, seconds) * 1000;
-    core::string status = Format("PASS(%lldms", static_cast<long long>(milliseconds));
-    for (const auto& [name, property] : GetProperties())
-    {
-        status += ", " + name + ": " + property.AsString();
-    }
-    status += ")\n";
-    printf_console("%s", status.c_str());
-}
-
-void ConsoleTestReporter::PrintFailures() const
-{
-    for (const Failure& failure : GetFailures())
-    {
-        if (failure.message.empty())
-        {
-            printf_console("\tCHECK FAILURE: (%s:%i)\n", failure.filename.c_str(), failure.line);
-        }
-        else
-        {
-            printf_console("\tCHECK FAILURE: %s (%s:%i)\n", failure.message.c_str(), failure.filename.c_str(),
-                           failure.line);
-        }
-        printf_console("%s", ""); // the log handler sees an empty message behind each failure
-    }
-}
-
-void ConsoleTestReporter::ReportSummary(int totalTests, int /*failedTests*/, int /*failures*/, float seconds)
+void ConsoleTestReporter::ReportSummary(int totalTests, int /*failedTestCount*/, int /*failureCount*/,
+                                        float seconds)
 {
     printf_console("Ran %i tests with %i failures in %.2f seconds\n", totalTests,
-                   static_cast<int>(GetFailedTests().size()), static_cast<double>(seconds));
-    for (const TestDetails& details : GetFailedTests())
+                   static_cast<int>(failedTests.size()), static_cast<double>(seconds));
+    for (const TestDetails& details : failedTests)
     {
         printf_console("\tFAILED: %s [%s]\n", GetDisplayedTestName(details).c_str(), details.suiteName);
     }
@@ -93,5 +148,11 @@ void ConsoleTestReporter::ReportSummary(int totalTests, int /*failedTests*/, int
 
 void ConsoleTestReporter::ReportIgnoredTests(std::vector<DisabledTestInfo>& ignoredTests)
 {
-    printf_console("%s", DescribeIgnoredTests(ignoredTests).c_str());
+    if (ignoredTests.empty())
+    {
+        return;
+    }
+    std::sort(ignoredTests.begin(), ignoredTests.end(), GroupByBugAndReason);
+    printf_console("\n%zu %s IGNORED!\n%s", ignoredTests.size(), TestsWere(ignoredTests.size()),
+                   DescribeGroups(ignoredTests).c_str());
 }

@@ -1,6 +1,5 @@
 #pragma once
 
-#include "Runtime/Testing/DisabledTestInfo.h"
 #include "Runtime/Testing/TestReporter.h"
 
 #include <map>
@@ -22,7 +21,8 @@ public:
 
     using IntraTestHandler = void (*)(const UnitTest::TestDetails& details, float seconds);
 
-    /// The name is reported before the test counts as in progress, so it still reaches the console.
+    /// The name is reported before the test counts as in progress, so that the log handler for tests lets it
+    /// through.
     void ReportTestStart(const UnitTest::TestDetails& details) override;
 
     /// A failure with the file, line and message of an earlier one in the same test is left out.
@@ -31,63 +31,36 @@ public:
     /// The status is reported when the test no longer counts as in progress.
     void ReportTestFinish(const UnitTest::TestDetails& details, float seconds) override;
 
-    /// Keeps the property until the test finishes, in the place of one with that name.
+    /// Keeps the property until the test finishes. It replaces an earlier one of the same name.
     void ReportTestProperty(const UnitTest::TestDetails& details, const char* name,
                             const UnitTest::TestProperty& property) override;
 
     /// Reports the selected tests that were not run, and may sort them.
     virtual void ReportIgnoredTests(std::vector<DisabledTestInfo>& ignoredTests) = 0;
 
-    [[nodiscard]] bool IsTestInProgress() const { return m_testInProgress; }
-
-    /// Whether a test was ever started.
-    [[nodiscard]] bool WasTestStarted() const { return m_testStarted; }
-
-    /// Returns the failed tests in the order in which they first failed, each once.
-    [[nodiscard]] const std::vector<UnitTest::TestDetails>& GetFailedTests() const { return m_failedTests; }
-
-    // Set by the run before its first test.
-    IntraTestHandler intraTestHandler = nullptr; ///< called behind every test, unless null
-    bool suppressNameOutput = false;             ///< whether to report neither names nor statuses
-    int longestSuiteNameLength = 0;              ///< column widths
-    int longestTestNameLength = 0;
-
-protected:
     /// Reports that a test starts; it is not the current one yet.
     virtual void ReportTestNameOnTestStart(const UnitTest::TestDetails& details) = 0;
 
     /// Reports the outcome of the current test.
     virtual void ReportTestStatusOnFinish(const UnitTest::TestDetails& details, float seconds) = 0;
 
-    [[nodiscard]] bool HasCurrentTestFailed() const { return m_currentTestFailed; }
-    [[nodiscard]] const std::vector<Failure>& GetFailures() const { return m_failures; }
-
-    /// Returns the properties of the current test, ordered by the bytes of their names.
-    [[nodiscard]] const std::map<core::string, UnitTest::TestProperty>& GetProperties() const
-    {
-        return m_properties;
-    }
-
-    /// Which of the attributes that only concern reporters the current test carries, by their types.
-    struct AttributeFlags
-    {
-        bool type3 = false;
-        bool type7 = false;
-        bool type8 = false;
-    };
-    [[nodiscard]] const AttributeFlags& GetAttributeFlags() const { return m_attributeFlags; }
-
-private:
+    /// Appends the current test to failedTests, unless it has failed before.
     void MarkCurrentTestAsFailure();
 
-    bool m_testInProgress = false;
-    bool m_testStarted = false;
-    std::vector<UnitTest::TestDetails> m_failedTests;
+    IntraTestHandler intraTestHandler = nullptr; ///< called after every test, unless null
+    bool testInProgress = false;
+    bool suppressNameOutput = false; ///< whether to report neither names nor statuses
+    bool testStarted = false;        ///< whether a test was ever started
+    int longestSuiteNameLength = 0;  ///< column widths
+    int longestTestNameLength = 0;
+    std::vector<UnitTest::TestDetails> failedTests; ///< in the order in which they first failed, each once
 
     // Of the current test.
-    bool m_currentTestFailed = false;
-    UnitTest::TestDetails m_currentTest;
-    std::map<core::string, UnitTest::TestProperty> m_properties;
-    std::vector<Failure> m_failures;
-    AttributeFlags m_attributeFlags;
+    bool currentTestFailed = false;
+    UnitTest::TestDetails currentTest;
+    std::map<core::string, UnitTest::TestProperty> properties; ///< ordered by the bytes of their names
+    std::vector<Failure> failures;
+    bool hasAttributeOfType3 = false;
+    bool hasAttributeOfType7 = false;
+    bool hasAttributeOfType8 = false;
 };

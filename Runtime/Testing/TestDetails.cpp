@@ -1,6 +1,6 @@
 #include "Runtime/Testing/TestDetails.h"
 
-#include "Runtime/Utilities/NonPrintableChars.h"
+#include "Runtime/Utilities/TextConversion.h"
 
 #include <algorithm>
 

@@ -1,26 +1,49 @@
 #pragma once
 
 #include "Runtime/Core/Containers/String.h"
-#include "Runtime/Testing/TestAttribute.h"
 
 #include <vector>
+
+// What is known of a test without running it.
+
+namespace Testing
+{
+
+constexpr const char* kUnitTestCategory = "Unit";
+constexpr const char* kPerformanceTestCategory = "Performance";
+
+} // namespace Testing
 
 namespace UnitTest
 {
 
+/// A mark that a test may carry. Only the three types named here keep a test from running.
+struct TestAttribute
+{
+    static constexpr int kIgnoredForCase = 0; ///< the only type whose case number is reported
+    static constexpr int kIgnored = 1;
+    static constexpr int kIgnoredIf = 2; ///< ignored if the predicate is set and holds
+
+    int type;
+    int caseNumber;
+    const char* text;    ///< the reason; may be null
+    bool (*predicate)(); ///< may be null
+};
+
 using TestAttributes = std::vector<const TestAttribute*>;
 
-/// What identifies a test. Copied by value; the texts are literals and belong to nobody.
+/// What identifies a test. Copied by value; the texts are string literals, so nobody owns them.
 struct TestDetails
 {
     /// An empty record.
     TestDetails() = default;
 
-    /// Mind the order: the test's name comes first here, the suite's among the fields.
+    /// The test's name comes before the suite's here, but after it among the members. Both orders are
+    /// intentional.
     TestDetails(const char* test, const char* suite, const char* testCategory, const char* file, int line,
                 const TestAttributes* testAttributes = nullptr);
 
-    /// The same test at another line, that of a failing check.
+    /// The same test at another line: that of a failing check.
     TestDetails(const TestDetails& details, int line);
 
     const char* suiteName = nullptr;
@@ -29,11 +52,11 @@ struct TestDetails
     const char* category = nullptr; ///< may be null or empty
     int lineNumber = -1;
 
-    /// May be null. They belong to the test, so a copy that outlives it must not look at them.
+    /// May be null. The test owns them, so they must not be read from a copy that outlives the test.
     const TestAttributes* attributes = nullptr;
 };
 
-/// Whether the test has a category of its own.
+/// Returns whether the test has a category of its own.
 bool HasCategory(const TestDetails& details);
 
 /// Returns the first attribute of that type, or null.
@@ -46,3 +69,12 @@ core::string GetDisplayedTestName(const TestDetails& details);
 core::string GetTestName(const TestDetails& details);
 
 } // namespace UnitTest
+
+/// A selected test that was not run, and why.
+struct DisabledTestInfo
+{
+    UnitTest::TestDetails details;
+    int kind = 0; ///< 0: by the prefix of a name alone; otherwise the type of the deciding attribute plus 1
+    core::string reason;
+    int caseNumber = 0;
+};

@@ -1,9 +1,10 @@
 #include "Runtime/Testing/TestFilter.h"
 
-#include "Runtime/Testing/TestCategories.h"
-#include "Runtime/Utilities/AsciiCase.h"
+#include "Runtime/Testing/TestRunner.h"
+#include "Runtime/Utilities/TextConversion.h"
 
 #include <algorithm>
+#include <deque>
 #include <string_view>
 
 using UnitTest::TestAttribute;
@@ -69,8 +70,9 @@ void SetReason(DisabledTestInfo& info, const TestAttribute& attribute)
     }
 }
 
-/// Says why a test is ignored. Where several attributes give a reason, the last kind of them counts. Only the
-/// first attribute of a type is asked, so a condition behind another one ignores a test without a reason.
+/// Describes why a test is ignored. If attributes of several types give a reason, the highest type counts.
+/// Only the first attribute of each type gives one, so a condition that holds after one that does not makes
+/// the test ignored without a reason. That is intentional.
 DisabledTestInfo DescribeIgnored(const TestDetails& details)
 {
     DisabledTestInfo info;
@@ -91,6 +93,22 @@ DisabledTestInfo DescribeIgnored(const TestDetails& details)
     }
     return info;
 }
+
+/// Collects the tests that need a substitute. The list can't grow while it is visited, so the substitutes are
+/// added afterwards.
+struct NoCategoryTestCollector
+{
+    void operator()(const UnitTest::Test* test)
+    {
+        if (filter.Filter(test) && !HasCategory(test->m_details))
+        {
+            collected.push_back(test->m_details);
+        }
+    }
+
+    const TestFilter& filter;
+    std::vector<TestDetails> collected;
+};
 
 } // namespace
 
@@ -129,4 +147,28 @@ bool TestFilter::Filter(const UnitTest::Test* test) const
 bool TestFilter::IsIgnored(const UnitTest::Test* test)
 {
     return IsIgnoredByAttribute(test->m_details) || HasPrefixedName(test->m_details, "DISABLED_");
+}
+
+NoCategoryTest::NoCategoryTest(const TestDetails& details)
+    : Test(TestDetails(details.testName, details.suiteName, Testing::kUnitTestCategory, details.filename,
+                       details.lineNumber))
+{
+}
+
+void NoCategoryTest::RunImpl() const
+{
+    UnitTest::CurrentTest::Results()->OnTestFailure(
+        m_details, "DOES NOT HAVE AN ASSOCIATED SUITE, PLEASE USE A SPECIFIC SUITE e.g. UNIT_TEST_SUITE, "
+                   "INTEGRATION_TEST_SUITE, etc.");
+}
+
+void AddNoCategoryTests(UnitTest::TestList& tests, const TestFilter& filter)
+{
+    static std::deque<NoCategoryTest> substitutes; // which the list refers to, also in later runs
+    NoCategoryTestCollector collector{filter, {}};
+    tests.ForEach(collector);
+    for (const TestDetails& details : collector.collected)
+    {
+        tests.AddProcedurallyGeneratedTest(&substitutes.emplace_back(details));
+    }
 }

@@ -3,13 +3,34 @@
 namespace UnitTest
 {
 
-TestList::~TestList()
+Test::Test(const TestDetails& details)
+    : m_details(details.testName, details.suiteName, details.category, details.filename, details.lineNumber,
+                &m_attributes)
 {
-    while (m_head != nullptr)
-    {
-        const std::unique_ptr<const Test> test(m_head);
-        m_head = test->m_nextTest;
-    }
+}
+
+void Test::Run() const
+{
+    CurrentTest::Details() = &m_details;
+    RunImpl();
+}
+
+TestList& Test::GetTestList()
+{
+    static TestList tests;
+    return tests;
+}
+
+TestResults*& CurrentTest::Results()
+{
+    static TestResults* results = nullptr;
+    return results;
+}
+
+const TestDetails*& CurrentTest::Details()
+{
+    static const TestDetails* details = nullptr;
+    return details;
 }
 
 void TestList::AddFactory(TestFactory* factory)

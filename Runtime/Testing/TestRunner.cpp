@@ -1,7 +1,5 @@
 #include "Runtime/Testing/TestRunner.h"
 
-#include "Runtime/Testing/CurrentTest.h"
-
 #include <cstring>
 
 namespace UnitTest
@@ -16,6 +14,38 @@ float SecondsOn(const TimerImplPosix& timer)
 }
 
 } // namespace
+
+void TestResults::OnTestStart(const TestDetails& details)
+{
+    ++totalTestCount;
+    currentTestFailed = false;
+    if (reporter != nullptr)
+    {
+        reporter->ReportTestStart(details);
+    }
+}
+
+void TestResults::OnTestFailure(const TestDetails& details, const char* message)
+{
+    ++failureCount;
+    if (!currentTestFailed)
+    {
+        ++failedTestCount;
+        currentTestFailed = true;
+    }
+    if (reporter != nullptr)
+    {
+        reporter->ReportFailure(details, message);
+    }
+}
+
+void TestResults::OnTestFinish(const TestDetails& details, float seconds)
+{
+    if (reporter != nullptr)
+    {
+        reporter->ReportTestFinish(details, seconds);
+    }
+}
 
 TestRunner::TestRunner(TestReporter& reporter)
     : m_reporter(reporter), m_results(std::make_unique<TestResults>(&reporter))

@@ -1,11 +1,10 @@
 #pragma once
 
-#include "Runtime/Testing/TestCategories.h"
 #include "Runtime/Testing/TestList.h"
 
-/// Defines a test of the category "Unit"; its body follows in braces. Without a REGISTER_UNIT_TEST it is
-/// never run. File and line are what the test is reported with: declared ones, which stay the same when the
-/// code moves.
+/// Defines a test of the category "Unit"; its body follows in braces. It runs only if a REGISTER_UNIT_TEST
+/// registers it. The test is reported with the file and line given here, so they stay the same when the code
+/// moves.
 #define UNIT_TEST(suite, name, file, line)                                                                   \
     namespace Suite##suite##kUnitTestCategory                                                                \
     {                                                                                                        \
@@ -25,7 +24,7 @@
     }                                                                                                        \
     void Suite##suite##kUnitTestCategory::Test##name::RunImpl() const
 
-/// Registers a test that UNIT_TEST defines in some file. All registrations of a program stand in one file:
+/// Registers a test that UNIT_TEST defines in some file. All registrations of a program belong in one file:
 /// their order is that of the run, and across files the linker would choose it.
 #define REGISTER_UNIT_TEST(suite, name)                                                                      \
     namespace Suite##suite##kUnitTestCategory                                                                \

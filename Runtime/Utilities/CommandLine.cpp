@@ -1,6 +1,6 @@
 #include "Runtime/Utilities/CommandLine.h"
 
-#include "Runtime/Utilities/AsciiCase.h"
+#include "Runtime/Utilities/TextConversion.h"
 
 #include <algorithm>
 
@@ -14,7 +14,7 @@ const char* const* argumentsEnd = nullptr;
 
 void SetCommandLine(int argc, const char* const* argv)
 {
-    firstArgument = argv + std::min(argc, 1); // behind the program's name
+    firstArgument = argv + std::min(argc, 1); // after the name of the program
     argumentsEnd = argv + argc;
 }
 

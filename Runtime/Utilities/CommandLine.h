@@ -4,6 +4,6 @@
 /// given to main do.
 void SetCommandLine(int argc, const char* const* argv);
 
-/// Returns whether some argument is the name behind "-" or "--", ignoring ASCII case. An argument counts
-/// wherever it stands, even if it serves another purpose too.
+/// Returns whether some argument is "-" or "--" followed by the name, ignoring ASCII case. Its position
+/// doesn't matter, even if the argument serves another purpose too.
 bool HasARGV(const char* name);

@@ -1,7 +1,6 @@
 #include "Runtime/Utilities/ConsoleLog.h"
 
-#include "Runtime/Core/Containers/String.h"
-#include "Runtime/Utilities/Format.h"
+#include "Runtime/Utilities/TextConversion.h"
 
 namespace
 {

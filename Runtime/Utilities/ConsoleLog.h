@@ -3,27 +3,27 @@
 #include <cstdarg>
 #include <cstdio>
 
-/// The program's console: one stream that all of the runtime prints to, with a handler that sees every
-/// message first. Used by one thread.
+// The program's console: one stream that all of the runtime prints to, with a handler that sees every message
+// first. For use by one thread.
 
 enum class LogType
 {
-    Error = 0,
-    Log = 3,
+    Error,
+    Log,
     Console = 5 ///< printed by printf_console
 };
 
 /// Sees a message before it is printed; returns whether to print it.
 using LogEntryHandler = bool (*)(LogType type, const char* format, std::va_list arguments);
 
-/// Puts a handler in the place of the one before; null lets every message through.
+/// Replaces the handler; null accepts every message.
 void SetLogEntryHandler(LogEntryHandler handler);
 
-/// Makes a stream the console, instead of standard output, to which null goes back. The caller keeps the
-/// stream and must set another before closing it.
+/// Makes the stream the console; null stands for standard output, which is the console at first. The caller
+/// owns the stream, and must set another before closing it.
 void SetConsoleStream(std::FILE* stream);
 
-/// Offers the message to the handler and, unless that refuses it, prints and flushes it.
+/// Prints and flushes the message, unless the handler refuses it.
 void printf_console(const char* format, ...) __attribute__((format(printf, 1, 2)));
 
 /// A message with the place in the source that it comes from.
@@ -35,6 +35,6 @@ struct LogEntry
     int line;
 };
 
-/// Prints an entry whole on lines of its own, through printf_console; the line break at the end may be left
-/// out of the message. A plain log entry shows the message alone, an error its origin too.
+/// Prints an entry with one call of printf_console. Adds a line break unless the message ends in one. A plain
+/// log entry shows the message alone; an error shows its origin too.
 void DebugStringToFile(const LogEntry& entry);

@@ -6,20 +6,15 @@
 #include <cstdlib>
 #include <string>
 
-/// Makes memory the console for as long as it lives, with no log handler at first and at last.
+/// Makes memory the console for as long as it lives.
 class CapturedConsole
 {
 public:
-    CapturedConsole() : m_stream(::open_memstream(&m_text, &m_size))
-    {
-        SetLogEntryHandler(nullptr);
-        SetConsoleStream(m_stream);
-    }
+    CapturedConsole() { SetConsoleStream(m_stream); }
 
     ~CapturedConsole()
     {
         SetConsoleStream(nullptr);
-        SetLogEntryHandler(nullptr);
         (void)std::fclose(m_stream);
         std::free(m_text);
     }
@@ -33,5 +28,5 @@ public:
 private:
     char* m_text = nullptr;
     std::size_t m_size = 0;
-    std::FILE* m_stream;
+    std::FILE* m_stream = ::open_memstream(&m_text, &m_size);
 };

@@ -10,9 +10,9 @@ public:
 
     void* Malloc(std::size_t size) { return AllocateLabelled(MemoryLabel::Json, size); }
 
-    void* Realloc(void* memory, std::size_t /*oldSize*/, std::size_t newSize)
+    void* Realloc(void* memory, std::size_t oldSize, std::size_t newSize)
     {
-        return ReallocateLabelled(MemoryLabel::Json, memory, newSize);
+        return ReallocateLabelled(MemoryLabel::Json, memory, oldSize, newSize);
     }
 
     static void Free(void* memory) { FreeLabelled(MemoryLabel::Json, memory); }

@@ -1,6 +1,5 @@
 #include "Modules/JSONSerialize/Public/JSONWrite.h"
 
-#include "Modules/JSONSerialize/Public/TempBufferWriter.h"
 #include "Runtime/Utilities/ConsoleLog.h"
 
 #include <rapidjson/prettywriter.h>
@@ -8,6 +7,21 @@
 
 namespace
 {
+
+/// A growing buffer that the JSON library's writers write to.
+class TempBufferWriter
+{
+public:
+    using Ch = char;
+
+    void Put(char character) { m_text += character; }
+    void Flush() {}
+
+    [[nodiscard]] const core::string& GetText() const { return m_text; }
+
+private:
+    core::string m_text;
+};
 
 template <class Writer>
 core::string WriteNode(const JSONWrite::Node& node)

@@ -1,19 +1,25 @@
-#include "Runtime/Utilities/NonPrintableChars.h"
+#include "Runtime/Utilities/TextConversion.h"
 
-#include "Runtime/Utilities/Format.h"
-
+#include <algorithm>
+#include <cstdarg>
 #include <cstdint>
-#include <string_view>
+#include <cstdio>
 
 namespace
 {
+
+char ToLowerByte(char byte)
+{
+    return byte >= 'A' && byte <= 'Z' ? static_cast<char>(byte - 'A' + 'a') : byte;
+}
 
 std::uint32_t ByteAt(std::string_view text, std::size_t position)
 {
     return static_cast<unsigned char>(text[position]);
 }
 
-/// The multi-byte forms, by the bits that are fixed in the first byte.
+/// The multi-byte forms of UTF-8 as first defined, with up to six bytes a character; each is recognised by
+/// the fixed bits of its first byte. Later definitions stop at four bytes, but names are shown by this one.
 struct Utf8Form
 {
     std::uint32_t leadMask;
@@ -74,6 +80,37 @@ std::size_t LengthOfPrintable(std::string_view text)
 }
 
 } // namespace
+
+core::string Format(const char* format, ...)
+{
+    std::va_list arguments;
+    std::va_list sameArguments;
+    va_start(arguments, format);
+    va_copy(sameArguments, arguments);
+    const int length = std::vsnprintf(nullptr, 0, format, arguments);
+    core::string text(static_cast<std::size_t>(length), '\0');
+    (void)std::vsnprintf(text.data(), text.size() + 1, format, sameArguments);
+    va_end(sameArguments);
+    va_end(arguments);
+    return text;
+}
+
+core::string ToLower(std::string_view text)
+{
+    core::string lower(text);
+    std::transform(lower.begin(), lower.end(), lower.begin(), ToLowerByte);
+    return lower;
+}
+
+bool EqualsIgnoringCase(std::string_view a, std::string_view b)
+{
+    return ToLower(a) == ToLower(b);
+}
+
+bool BeginsWithIgnoringCase(std::string_view text, std::string_view prefix)
+{
+    return EqualsIgnoringCase(text.substr(0, prefix.size()), prefix);
+}
 
 core::string ConvertNonPrintableCharsToHex(const char* text)
 {

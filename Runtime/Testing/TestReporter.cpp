@@ -1,6 +1,6 @@
-#include "Runtime/Testing/MemoryOutStream.h"
+#include "Runtime/Testing/TestReporter.h"
 
-#include "Runtime/Utilities/Format.h"
+#include "Runtime/Utilities/TextConversion.h"
 
 namespace UnitTest
 {
@@ -16,6 +16,11 @@ MemoryOutStream& MemoryOutStream::operator<<(int number)
     return *this << Format("%i", number);
 }
 
+MemoryOutStream& MemoryOutStream::operator<<(long number)
+{
+    return *this << static_cast<long long>(number);
+}
+
 MemoryOutStream& MemoryOutStream::operator<<(long long number)
 {
     return *this << Format("%lld", number);
@@ -29,6 +34,13 @@ MemoryOutStream& MemoryOutStream::operator<<(float number)
 MemoryOutStream& MemoryOutStream::operator<<(double number)
 {
     return *this << Format("%f", number);
+}
+
+core::string TestProperty::AsString() const
+{
+    MemoryOutStream stream;
+    std::visit([&stream](const auto& value) { stream << value; }, m_value);
+    return stream.GetText();
 }
 
 } // namespace UnitTest

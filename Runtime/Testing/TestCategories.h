@@ -1,9 +1,0 @@
-#pragma once
-
-namespace Testing
-{
-
-constexpr const char* kUnitTestCategory = "Unit";
-constexpr const char* kPerformanceTestCategory = "Performance";
-
-} // namespace Testing
