@@ -2,11 +2,10 @@
 #include "Tools/DocTools/VantorPagemeld/IndexCombiner.h"
 #include "Tools/DocTools/VantorPagemeld/Render/IndexScript.h"
 #include "fuzz/MergeProperty.h"
-#include "fuzz/ScriptForm.h"
 #include "tests/support/PlainMerge.h"
 
-// Search indexes that pass the structure check merge as a plain linear merge has it, and both writers
-// write what the merged one holds. The first module is a fixed one.
+// Search indexes that pass the structure check merge as a plain linear merge has it, and what is written of
+// the merged one reads back equal. The first module is a fixed one.
 
 namespace
 {
@@ -17,10 +16,10 @@ constexpr const char* kFirstModule = R"({"pages":[["a.html","A \"quoted\" \\ tit
                                      R"("info":[["text",0],["",1]],"common":{},)"
                                      R"("searchIndex":{"a":[0,1],"b":[1],"":[],"b":[0]}})";
 
-void RequireWritersAgree(const Value& merged)
+void RequireWritable(const Value& merged)
 {
     RequireReadsBack(merged, RenderPrettyJson(merged).GetString());
-    Require(IsIndexScript(TextOf(RenderIndexScript(merged)), merged), "the script has its form");
+    (void)RenderIndexScript(merged); // under the sanitizers
 }
 
 } // namespace
@@ -30,6 +29,6 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     std::vector<std::string> texts = SplitInput(data, size);
     texts.insert(texts.begin(), kFirstModule);
 
-    MergeLikePlain<PlainIndexMerge, IndexCombiner>(CheckIndexStructure, texts, RequireWritersAgree);
+    MergeLikePlain<PlainIndexMerge, IndexCombiner>(CheckIndexStructure, texts, RequireWritable);
     return 0;
 }

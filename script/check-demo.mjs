@@ -79,4 +79,4 @@ for (const set of Object.keys(sharedGroups)) {
         `${pageCounts[0]} pages of ${combined.join(", ")}`);
 }
 const strays = filesBelow(folder).filter((name) => name.endsWith(".tmp"));
-assert.deepEqual(strays, [], "temporary files left behind");
+assert.deepEqual(strays, [], "temporary files that stayed");

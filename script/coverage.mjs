@@ -48,7 +48,7 @@ for (const [name, { lines, branches }] of [...files].sort()) {
 let isEnough = files.size > 0;
 for (const [kind, least] of Object.entries(LEAST)) {
     const reached = percent([...files.values()].flatMap((file) => [...file[kind].values()]));
-    console.log(`${kind}: ${reached.toFixed(1)} % of ${files.size} files, at least ${least} % wanted`);
+    console.log(`${kind}: ${reached.toFixed(1)} % of ${files.size} files, at least ${least} % required`);
     isEnough &&= reached >= least;
 }
 process.exit(isEnough ? 0 : 1);

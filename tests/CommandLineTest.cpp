@@ -20,7 +20,7 @@ status 255
 ERROR: #Main:212 Usage: PROGRAM <path1> <path2> ...
  or PROGRAM -autopaths <rootdir>
 status 0
-)"}, // the same text, but no failure: wanted
+)"}, // the same text, but no failure, on purpose
         {{"-verify"}, R"(executing Pagemeld
 ERROR: #Main:192 Usage: PROGRAM -verify <rootDocPath>
 status 255
@@ -94,7 +94,7 @@ status 0
 status 0
 )text"},
         {{"no such test"}, "Ran 0 tests with 0 failures in N seconds\nstatus 0\n"},
-        {{"-automated"}, "status 0\n"}, // the switch stands in the filter's place, and so is the filter too
+        {{"-automated"}, "status 0\n"}, // the switch is in the filter's place, and so is the filter too
     };
     for (const auto& c : cases)
     {

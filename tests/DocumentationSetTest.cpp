@@ -1,3 +1,4 @@
+#include "tests/support/ParsedJson.h"
 #include "tests/support/RunProgram.h"
 #include "tests/support/WholeFile.h"
 
@@ -52,69 +53,15 @@ std::string OutputNames(const TemporaryFolder& folder)
     return names;
 }
 
-const char* const kIndexJson = R"({
-    "pages": [
-        [
-            "a.html",
-            "Say \"A\"",
-            0
-        ],
-        [
-            "b.html",
-            "Ä/B",
-            1
-        ]
-    ],
-    "info": [
-        [
-            "About \"A\"",
-            0
-        ],
-        [
-            "b\n",
-            1
-        ]
-    ],
-    "common": {
-        "the": 1
-    },
-    "searchIndex": {
-        "say": [
-            0,
-            1
-        ],
-        "b": [
-            1
-        ]
-    }
-})";
+const char* const kIndexJson =
+    R"({"pages":[["a.html","Say \"A\"",0],["b.html","Ä/B",1]],"info":[["About \"A\"",0],["b\n",1]],"common":{"the":1},"searchIndex":{"say":[0,1],"b":[1]}})";
+const char* const kTocJson =
+    R"({"link":"toc","title":"toc","children":[{"link":"a.html","title":"Say \"A\"","children":null,"module":0},{"link":"null","title":"B","children":[{"link":"b.html","title":"","children":[],"module":1}],"module":1}],"module":0})";
 
-const char* const kTocJson = R"({
-    "link": "toc",
-    "title": "toc",
-    "children": [
-        {
-            "link": "a.html",
-            "title": "Say \"A\"",
-            "children": null,
-            "module": 0
-        },
-        {
-            "link": "null",
-            "title": "B",
-            "children": [
-                {
-                    "link": "b.html",
-                    "title": "",
-                    "children": [],
-                    "module": 1
-                }
-            ],
-            "module": 1
-        }
-    ],
-    "module": 0
-})";
+std::string Pretty(const char* json)
+{
+    return std::string(TextOf(RenderPrettyJson(ParsedJson(json))));
+}
 
 const char* const kIndexScript = R"(pages = [
 [p0 + "a.html", "Say \"A\""],
@@ -139,7 +86,7 @@ TEST(DocumentationSet, EveryModuleReceivesAllFourFiles)
     AddModule(folder, "docs/c/Manual", "{}", "{}"); // is skipped, but receives the files
     WriteWholeFile(folder / "docs/a/Manual/docdata/global_toc.js",
                    "of an earlier run, and longer than what follows");
-    WriteWholeFile(folder / "docs/b/Manual/docdata/global_index.js.tmp", "left behind");
+    WriteWholeFile(folder / "docs/b/Manual/docdata/global_index.js.tmp", "of a killed run");
 
     EXPECT_EQ(R"(executing Pagemeld
 WARNING: #IndexCombiner:290 Pages is not an array or absent
@@ -158,9 +105,9 @@ status 0
     for (const auto& [module, lines] : prefixes)
     {
         const std::string docdata = "docs/" + module + "/Manual/docdata/";
-        expected[docdata + "global_index.json"] = kIndexJson;
+        expected[docdata + "global_index.json"] = Pretty(kIndexJson);
         expected[docdata + "global_index.js"] = lines + kIndexScript;
-        expected[docdata + "global_toc.json"] = kTocJson;
+        expected[docdata + "global_toc.json"] = Pretty(kTocJson);
         expected[docdata + "global_toc.js"] = lines + kTocScript;
 
         const ProgramResult check = RunProgram(NODE_PROGRAM, {CHECK_SCRIPTS, folder / docdata});
@@ -204,23 +151,24 @@ toc = {
               ReadWholeFile(folder / "a/ScriptReference/docdata/global_toc.js"));
 }
 
-TEST(DocumentationSet, UnwritableSearchIndexScriptEndsTheRun)
+TEST(DocumentationSet, UnwritableScripts)
 {
     const TemporaryFolder folder;
     for (const char* modulePath : {"a/Manual", "c/Manual", "a/ScriptReference", "c/ScriptReference"})
     {
         AddModule(folder, modulePath, kIndexA, kTocA);
     }
+    std::filesystem::create_directory(folder / "a/Manual/docdata/global_toc.js.tmp");
     EXPECT_EQ(R"(executing Pagemeld
 WARNING: #RapidJsonIoUtil:47 Unable to read @/b/Manual/docdata/index.json
 WARNING: #RapidJsonIoUtil:47 Unable to read @/b/Manual/docdata/toc.json
+ERROR: #TocCombiner:314 Failed to open output file @/a/Manual/docdata/global_toc.js.tmp
 WARNING: #RapidJsonIoUtil:23 Failed to open @/b/Manual/docdata/global_index.json.tmp for writing
 CRITICAL: #IndexCombiner:176 Unable to open file @/b/Manual/docdata/global_index.js.tmp for writingstatus 255
 )",
               ReportOfRun(folder, {"@/a", "@/b", "@/c"}));
     EXPECT_EQ(R"(a/Manual/docdata/global_index.js
 a/Manual/docdata/global_index.json
-a/Manual/docdata/global_toc.js
 a/Manual/docdata/global_toc.json
 )",
               OutputNames(folder));

@@ -52,7 +52,6 @@ TEST(JsonCombiner, NothingToMergeIsAFailure)
     OpenCombiner combiner;
     EXPECT_FALSE(combiner.CombineJson({}, "index.json"));
     EXPECT_TRUE(combiner.modulePathTable.empty());
-    EXPECT_TRUE(combiner.OutputPrefixVars("/r/A/Manual", nullptr)) << "writes nothing";
     EXPECT_EQ(R"({"pages":[],"info":[],"common":{},"searchIndex":{}})",
               RapidJsonIoUtil::OutputJsonValueToString(combiner.combinedDocument));
 }

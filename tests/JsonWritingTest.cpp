@@ -57,7 +57,7 @@ TEST(JsonWriting, FailsOnlyIfTheFileCannotBeOpened)
     std::filesystem::create_symlink("/dev/full", full);
     CapturedStderr captured;
     EXPECT_FALSE(RapidJsonIoUtil::OutputJsonValueToFile(ParsedJson("1"), missing.c_str()));
-    EXPECT_TRUE(RapidJsonIoUtil::OutputJsonValueToFile(ParsedJson("1"), full.c_str())); // wanted
+    EXPECT_TRUE(RapidJsonIoUtil::OutputJsonValueToFile(ParsedJson("1"), full.c_str())); // on purpose
     EXPECT_EQ("WARNING: ./Tools/DocTools/VantorPagemeld/RapidJsonIoUtil:23 Failed to open " + missing +
                   " for writing\n",
               captured.Text());

@@ -14,10 +14,10 @@ TEST(RelativePrefix, ClimbsToTheCommonFolder)
         {"a/b/Manual", "a/b/Manual/", ""},
         {"/Users/me/docs1/Manual", "/Users/me/docs2/Manual/", "../../docs2/Manual/"},
         {"/r/m1/Manual", "/r/m12/Manual/", "../../m12/Manual/"},
-        {"/r/m12/Manual", "/r/m1/Manual/", "../Manual/"},               // stops at the other's slash: wanted
-        {"docs1/Manual", "docs2/Manual/", "../docs2/Manual/"},          // no common folder, one short: wanted
+        {"/r/m12/Manual", "/r/m1/Manual/", "../Manual/"},      // stops at the other's slash, on purpose
+        {"docs1/Manual", "docs2/Manual/", "../docs2/Manual/"}, // no common directory: one short, on purpose
         {"/docs/a//Manual", "/docs/b//Manual/", "../../../b//Manual/"}, // every slash counts
-        {"/r/a//Manual", "/r/a///Manual/", "Manual/"}, // all slashes behind the split are passed
+        {"/r/a//Manual", "/r/a///Manual/", "Manual/"}, // all slashes after the split are passed
         {"/r/a/Manual", "", "../../../"},
         {"", "x/Manual/", "x/Manual/"},
         {"/r/a\"b\\/Manual", "/r/c\"d\\/Manual/", "../../c\"d\\/Manual/"},

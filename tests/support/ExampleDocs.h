@@ -36,7 +36,7 @@ public:
     /// Returns a letter for every output: "NNNN NNNN" after an undisturbed run.
     ///
     /// N is the new file, O the earlier one, C a new one that was cut short, E an empty one, D a folder, -
-    /// nothing, ? anything else. A temporary file that is left stands in brackets behind its output.
+    /// nothing, ? anything else. A temporary file that is left is in brackets after its output.
     [[nodiscard]] std::string Describe() const;
 
 private:

@@ -5,7 +5,7 @@
 #include <vector>
 
 /// Returns text with every occurrence of from replaced by to: paths that differ from run to run by a sign
-/// that stands in a literal.
+/// that is in a literal.
 inline std::string ReplaceAll(std::string text, const std::string& from, const std::string& to)
 {
     for (auto at = text.find(from); at != std::string::npos; at = text.find(from, at + to.size()))
@@ -21,7 +21,7 @@ inline std::string Neutral(const std::string& report, const TemporaryFolder& fol
     return ReplaceAll(ReplaceAll(report, folder.Path(), "@"), "./Tools/DocTools/VantorPagemeld/", "#");
 }
 
-/// Returns the output of self-tests with N for the numbers that differ from run to run: those behind the
+/// Returns the output of self-tests with N for the numbers that differ from run to run: those after the
 /// labels.
 inline std::string WithoutNumbers(std::string text,
                                   const std::vector<std::string>& labels = {

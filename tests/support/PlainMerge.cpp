@@ -25,11 +25,11 @@ bool IsSameEntry(const Value& a, const Value& b)
            std::strcmp(a["title"].GetString(), b["title"].GetString()) == 0;
 }
 
-Value* FindEntry(Value& list, const Value& wanted)
+Value* FindEntry(Value& list, const Value& like)
 {
     for (Value& entry : list.GetArray())
     {
-        if (IsSameEntry(entry, wanted))
+        if (IsSameEntry(entry, like))
         {
             return &entry;
         }

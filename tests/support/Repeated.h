@@ -2,7 +2,7 @@
 
 #include <string>
 
-/// Returns the text so many times in a row.
+/// Returns the text repeated count times.
 inline std::string Repeated(const std::string& text, std::size_t count)
 {
     std::string all;

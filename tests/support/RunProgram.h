@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-/// What a process left behind.
+/// What became of a process.
 struct ProgramResult
 {
     int status; ///< exit status, or minus the number of the signal that ended it
