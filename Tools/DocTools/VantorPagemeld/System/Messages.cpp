@@ -4,7 +4,7 @@
 #include <cstdarg>
 #include <cstdio>
 #include <cstdlib>
-#include <string>
+#include <new>
 
 #include <fcntl.h>
 #include <unistd.h>
@@ -12,34 +12,43 @@
 namespace
 {
 
-__attribute__((format(printf, 2, 0))) void AppendFormatted(std::string& text, const char* format,
-                                                           std::va_list arguments)
+/// A message that is put together in memory, and written to standard error at the end of its life. Standard
+/// error has no buffer, so what is handed over in one piece is written by one call.
+class Message
 {
-    std::va_list again;
-    va_copy(again, arguments);
-    const int length = std::vsnprintf(nullptr, 0, format, again);
-    va_end(again);
-    if (length > 0)
+public:
+    Message() : m_stream(::open_memstream(&m_text, &m_size))
     {
-        const std::size_t start = text.size();
-        text.resize(start + static_cast<std::size_t>(length) + 1); // and the NUL, taken off again
-        (void)std::vsnprintf(&text[start], static_cast<std::size_t>(length) + 1, format, arguments);
-        text.pop_back();
+        if (m_stream == nullptr)
+        {
+            throw std::bad_alloc();
+        }
     }
-}
 
-/// Standard error has no buffer, so what is handed over in one piece is written by one call.
-void Write(const std::string& message)
-{
-    (void)std::fwrite(message.data(), 1, message.size(), stderr);
-}
+    ~Message()
+    {
+        (void)std::fclose(m_stream);
+        (void)std::fwrite(m_text, 1, m_size, stderr);
+        std::free(m_text);
+    }
+
+    Message(const Message&) = delete;
+    Message& operator=(const Message&) = delete;
+
+    [[nodiscard]] std::FILE* Stream() const { return m_stream; }
+
+private:
+    char* m_text = nullptr;
+    std::size_t m_size = 0;
+    std::FILE* m_stream;
+};
 
 __attribute__((format(printf, 4, 0))) void Report(const char* level, const char* sourceFile, int number,
                                                   const char* format, std::va_list arguments)
 {
-    std::string message = std::string(level) + ": " + sourceFile + ":" + std::to_string(number) + " ";
-    AppendFormatted(message, format, arguments);
-    Write(message);
+    const Message message;
+    (void)std::fprintf(message.Stream(), "%s: %s:%d ", level, sourceFile, number);
+    (void)std::vfprintf(message.Stream(), format, arguments);
 }
 
 } // namespace
@@ -71,12 +80,11 @@ void Diagnostics::CriticalAndExit(int number, const char* format, ...) const
 
 void ReportProgress(const char* format, ...)
 {
-    std::string line;
+    const Message message;
     std::va_list arguments;
     va_start(arguments, format);
-    AppendFormatted(line, format, arguments);
+    (void)std::vfprintf(message.Stream(), format, arguments);
     va_end(arguments);
-    Write(line);
 }
 
 void SecureStandardStreams()
