@@ -21,7 +21,7 @@ import re
 import sys
 import unicodedata
 from html.parser import HTMLParser
-from urllib.parse import unquote, urlsplit
+from urllib.parse import unquote
 
 COMMON = dict.fromkeys("a an and are as at be by for from has in is it its of on one or that the to with".split(), 1)
 # Queries are split into runs of letters, marks, digits and "_". To \w belong all of these but the marks.
@@ -35,14 +35,19 @@ SCHEME = re.compile("[a-zA-Z][a-zA-Z0-9+.-]*:")
 
 HEADINGS = {"h1", "h2", "h3", "h4", "h5", "h6"}
 LISTS = {"ul", "ol"}
-BLOCKS = HEADINGS | LISTS | set("blockquote body br dd div dl dt hr li main p pre section table td th title tr".split())
+BLOCKS = HEADINGS | LISTS | set("blockquote body dd div dl dt hr li main p pre section table td th title tr".split())
 UNREAD_TAGS = {"nav", "noscript", "script", "style", "template"}
-UNREAD_CLASSES = {"headerlink", "permalink", "arrow", "icon", "tablist", "navpath"}  # of Sphinx and Doxygen
+UNREAD_PARTS = {("a", "headerlink"),  # of Sphinx, the others of Doxygen
+                ("span", "permalink"), ("span", "arrow"), ("span", "icon"), ("ul", "tablist"), ("div", "navpath")}
 FOLDER_PAGES = ("index.html", "index.htm", "package-summary.html")
 
 
+def say(message):
+    print(f"make-docdata.py: {message}", file=sys.stderr)
+
+
 def warn(message):
-    print(f"make-docdata.py: warning: {message}", file=sys.stderr)
+    say(f"warning: {message}")
 
 
 def make_title(text, place):
@@ -75,10 +80,12 @@ def decode(data, place):
 
 class Page(HTMLParser):
     """What a page says of itself: its title, its main heading, its texts (each heading with the first paragraph after
-    it) and its list items (depth, address or None, text, where in the text the link begins)."""
+    it) and its list items (depth, address or None, text, where in the text the link begins). Items are those of lists,
+    the rows of Doxygen's tables and the first cells of javadoc's."""
 
     def __init__(self, html, place):
         super().__init__()
+        self.place = place
         self.title = self.heading = ""
         self.texts, self.items = [["", ""]], []
         self.unread = None  # the tag that is passed over, and how often it is open
@@ -94,39 +101,37 @@ class Page(HTMLParser):
     def handle_starttag(self, tag, attributes):
         attributes = {name: value or "" for name, value in attributes}
         classes = set(attributes.get("class", "").split())
-        if self.unread:
+        if tag == "br":
+            self.handle_data(" ")
+        elif self.unread:
             self.unread[1] += tag == self.unread[0]
-        elif tag in UNREAD_TAGS or attributes.get("role") == "navigation" or UNREAD_CLASSES & classes:
+        elif tag in UNREAD_TAGS or attributes.get("role") == "navigation" or any(
+                (tag, name) in UNREAD_PARTS for name in classes):
             self.unread = [tag, 1]
         else:
             if tag == "main" or attributes.get("role") == "main":
                 self.heading, self.texts, self.items = "", [["", ""]], []
-            self.start_text(tag, attributes, classes)
+            self.start_block(tag, attributes, classes)
             self.start_item(tag, attributes, classes)
 
-    def start_text(self, tag, attributes, classes):
-        if tag == "br":
-            self.data += " "
-        elif tag in BLOCKS:
+    def start_block(self, tag, attributes, classes):
+        if tag in BLOCKS:
             self.end_block()
-        if tag in HEADINGS or tag in ("p", "title"):
-            self.block = tag
+        if tag == "div" and "title" in classes:
+            self.block = "h1"
         elif tag == "dt" and "id" in attributes:
             self.block = "h6"
-        elif tag == "div" and "title" in classes:
-            self.block = "h1"
+        elif tag in HEADINGS | {"p", "title"}:
+            self.block = tag
         elif tag == "div" and classes & {"block", "textblock"}:
             self.block = "p"
 
     def start_item(self, tag, attributes, classes):
-        """Items are those of lists, the rows of Doxygen's tables and the first cells of javadoc's."""
+        row = attributes.get("id", "") if tag == "tr" else ""
         if tag in LISTS:
             self.list_depth, self.item = self.list_depth + 1, None
-        elif tag == "tr" and attributes.get("id", "").startswith("row_"):
-            self.item = [attributes["id"].count("_") - 1, None, "", 0]
-            self.items.append(self.item)
-        elif tag == "li" or "col-first" in classes:
-            self.item = [max(self.list_depth, 1), None, "", 0]
+        elif tag == "li" or row.startswith("row_") or "col-first" in classes:
+            self.item = [row.count("_") - 1 if row else max(self.list_depth, 1), None, "", 0]
             self.items.append(self.item)
         elif tag == "a" and self.item and "href" in attributes:
             self.item[1], self.item[3] = attributes["href"], len(self.item[2])
@@ -169,14 +174,16 @@ def read_pages(folder):
         for name in sorted(names, key=lambda name: (name not in FOLDER_PAGES, name)):
             path = os.path.relpath(os.path.join(place, name), folder)
             files.add(path)
-            if re.search(r"\.x?html?$", name, re.IGNORECASE) and UNWRITABLE.search(path):
-                warn(f"{ascii(path)}: left out: the scripts can't hold its path")
-            elif re.search(r"\.x?html?$", name, re.IGNORECASE):
-                try:
-                    with open(os.path.join(place, name), "rb") as file:
-                        pages[path] = Page(decode(file.read(), path), path)
-                except OSError as error:
-                    warn(f"{path}: left out: {error.strerror}")
+            if not name.lower().endswith((".html", ".htm", ".xhtml")):
+                continue
+            if UNWRITABLE.search(path):
+                warn(f"{ascii(os.path.join(place, name))}: left out: the scripts can't hold its path")
+                continue
+            try:
+                with open(os.path.join(place, name), "rb") as file:
+                    pages[path] = Page(decode(file.read(), file.name), file.name)
+            except OSError as error:
+                warn(f"left out: {error}")
     choose_titles(pages)
     return pages, files
 
@@ -186,7 +193,7 @@ def choose_titles(pages):
     uses = collections.Counter(page.title for page in pages.values())
     for path, page in pages.items():
         title = page.title if page.title and uses[page.title] == 1 else page.heading or page.title
-        page.title = make_title(title or path, path)
+        page.title = make_title(title or path, page.place)
 
 
 def make_index(pages):
@@ -210,7 +217,7 @@ def list_folders(pages, start):
     rows, last_parents = [], []
     for path, page in pages.items():
         *parents, name = path.split("/")
-        rows += [(depth, "null", make_title(parent, path)) for depth, parent in enumerate(parents, 1)
+        rows += [(depth, "null", parent) for depth, parent in enumerate(parents, 1)
                  if parents[:depth] != last_parents[:depth]]
         if parents != last_parents and name in FOLDER_PAGES:
             rows[-1] = (len(parents), make_link(path), page.title)
@@ -220,34 +227,30 @@ def list_folders(pages, start):
     return rows
 
 
+def resolve(address, base, files):
+    """Returns path and fragment of an address in the page base; the path is empty if it leads out of the set."""
+    place, _, fragment = address.strip().partition("#")
+    place = unquote(place.partition("?")[0])
+    path = posixpath.normpath(posixpath.join(posixpath.dirname(base), place)) if place else base
+    if SCHEME.match(address) or path.startswith(("..", "/")):
+        return "", ""
+    own = posixpath.normpath(f"{path}/index.html")
+    return own if path not in files and own in files else path, unquote(fragment)
+
+
 def list_links(pages, files, base):
     """Returns the list items of the page base as rows; those that lead to no page of the set are "null"."""
     rows = []
     for depth, address, text, start in pages[base].items:
-        path, fragment = resolve(address, base, files) if address else (None, "")
-        title = " ".join(text[start if path in pages else 0:].split())
+        path, fragment = resolve(address or "//", base, files)
+        title = make_title(" ".join(text[start if path in pages else 0:].split()), pages[base].place)
         if path in pages:
-            rows.append((depth, make_link(path, fragment), make_title(title, base) or pages[path].title))
+            rows.append((depth, make_link(path, fragment), title or pages[path].title))
         else:
-            rows.append((depth, "null", make_title(title, base)))
+            rows.append((depth, "null", title))
+        if path and path not in files:
+            warn(f"{pages[base].place}: {ascii(address)} leads to no file")
     return rows
-
-
-def resolve(address, base, files):
-    """Returns path and fragment of an address in the page base, the path None if it leads to no file of the set."""
-    try:
-        parts = urlsplit(address)
-    except ValueError:
-        return None, ""
-    if parts.scheme or parts.netloc:
-        return None, ""
-    path = posixpath.normpath(posixpath.join(posixpath.dirname(base), unquote(parts.path))) if parts.path else base
-    for target in (path, posixpath.normpath(posixpath.join(path, "index.html"))):
-        if target in files:
-            return target, unquote(parts.fragment)
-    if not path.startswith(("..", "/")):
-        warn(f"{base}: {ascii(address)} leads to no file")
-    return None, ""
 
 
 def take_nodes(rows, above):
@@ -267,23 +270,23 @@ def make_contents(root, module, rows):
     return {**root, "children": [node for node in nodes if node["link"] == "null"] + [module]}
 
 
-def make_docdata(folder, root_link, root_title, list_page):
-    """Returns the texts of both files."""
+def make_docdata(folder, root, list_page):
+    """Returns the values of both files. The root is its link and title."""
     pages, files = read_pages(folder)
-    if list_page and list_page not in pages:
-        warn(f"{folder}: {list_page} is no page there: the contents are made from the folders")
-    rows = list_links(pages, files, list_page) if list_page in pages else list_folders(pages, root_link)
-    root = {"link": root_link, "title": make_title(root_title, folder)}
-    if root_link in pages:
-        module = {"link": root_link, "title": pages[root_link].title}
+    module = {"link": "null", "title": make_title(os.path.basename(os.path.dirname(folder)), folder)}
+    if root["link"] in pages:
+        module = {"link": root["link"], "title": pages[root["link"]].title}
     else:
-        warn(f"{folder}: {root_link}, where the root of the contents leads, is no page there")
-        module = {"link": "null", "title": make_title(os.path.basename(os.path.dirname(folder)), folder)}
+        warn(f"{folder}: there is no page {root['link']}, where the root of the contents leads")
+    if list_page in pages:
+        rows = list_links(pages, files, list_page)
+    else:
+        rows = list_folders(pages, root["link"])
+        if list_page:
+            warn(f"{folder}: there is no page {list_page}: the contents are made from the folders")
     index = make_index(pages)
-    print(f"{folder}: {len(pages)} pages, {len(index['info'])} texts, {len(index['searchIndex'])} terms")
-    # One entry a line: pages and info by number, then the words.
-    index = json.dumps(index, ensure_ascii=False)
-    return index, json.dumps(make_contents(root, module, rows), ensure_ascii=False, indent=2)
+    say(f"{folder}: {len(pages)} pages, {len(index['info'])} texts, {len(index['searchIndex'])} terms")
+    return {"index.json": index, "toc.json": make_contents(root, module, rows)}
 
 
 def main():
@@ -299,11 +302,12 @@ def main():
         if not os.path.isdir(folder):
             parser.error(f"{folder} is no folder")
     for folder in map(os.path.abspath, options.set_folders):
-        texts = make_docdata(folder, options.root_link, options.root_title or os.path.basename(folder), options.toc)
+        title = make_title(options.root_title or os.path.basename(folder), folder)
+        files = make_docdata(folder, {"link": options.root_link, "title": title}, options.toc)
         os.makedirs(os.path.join(folder, "docdata"), exist_ok=True)
-        for name, text in zip(("index.json", "toc.json"), texts):
+        for name, value in files.items():
             with open(os.path.join(folder, "docdata", name), "w", encoding="utf-8", newline="\n") as file:
-                file.write(text + "\n")
+                file.write(json.dumps(value, ensure_ascii=False, indent=1) + "\n")
 
 
 if __name__ == "__main__":
