@@ -1,0 +1,314 @@
+#!/usr/bin/env python3
+"""Makes docdata/index.json and docdata/toc.json of documentation sets from their HTML pages.
+
+The search index has every page below a set folder, with each heading and the first paragraph after it. The contents
+have an entry for the module, its start page, and below it the folders with their pages; or, with --toc, the links of
+a list that the documentation has: a page FILE in each set folder, such as Doxygen's annotated.html, Sphinx's
+contents.html or javadoc's overview-tree.html. Pages that the list passes over are found by the search alone.
+
+Groups without a page at the top stand beside the module's entry, so that all modules with such a group share it. All
+modules of a set need the same root; by default it has the name of the set folder and leads to index.html.
+
+Paths are as on disk, nothing is percent-encoded; after a "#" in a link of the contents comes the place in the page.
+Where a page has a <main>, what comes before it is passed over. The same pages always give the same files.
+"""
+import argparse
+import collections
+import json
+import os
+import posixpath
+import re
+import sys
+import unicodedata
+from html.parser import HTMLParser
+from urllib.parse import unquote
+
+COMMON = dict.fromkeys("a an and are as at be by for from has in is it its of on one or that the to with".split(), 1)
+# Queries are split into runs of letters, marks, digits and "_". To \w belong all of these but the marks.
+MARKS = "".join(c for c in map(chr, range(0x300, 0xE0200)) if unicodedata.category(c)[0] == "M")
+WORD = re.compile(f"[\\w{MARKS}]+")
+
+# The scripts escape the quotes of titles and nothing else, in paths and links not even these; "#" would end a path.
+LOOK_ALIKES = {ord("\\"): "\u2216", 0x7F: "\u2421", **{code: 0x2400 + code for code in range(0x20)}}
+UNWRITABLE = re.compile('["\\\\#\0-\x1f\x7f\ud800-\udfff]')
+SCHEME = re.compile("[a-zA-Z][a-zA-Z0-9+.-]*:")
+
+HEADINGS = {"h1", "h2", "h3", "h4", "h5", "h6"}
+LISTS = {"ul", "ol"}
+BLOCKS = HEADINGS | LISTS | set("blockquote body dd div dl dt hr li main p pre section table td th title tr".split())
+UNREAD_TAGS = {"nav", "noscript", "script", "style", "template"}
+UNREAD_PARTS = {("a", "headerlink"),  # of Sphinx, the others of Doxygen
+                ("span", "permalink"), ("span", "arrow"), ("span", "icon"), ("ul", "tablist"), ("div", "navpath")}
+FOLDER_PAGES = ("index.html", "index.htm", "package-summary.html")
+
+
+def say(message):
+    print(f"make-docdata.py: {message}", file=sys.stderr)
+
+
+def warn(message):
+    say(f"warning: {message}")
+
+
+def make_title(text, place):
+    title = text.translate(LOOK_ALIKES)
+    if title != text:
+        warn(f'{place}: what would break the scripts is replaced in the title "{title}"')
+    return title
+
+
+def make_link(path, fragment=""):
+    """Foo:Bar.html would be an address; ./Foo:Bar.html is a path. A fragment that can't be written is left off."""
+    return ("./" if SCHEME.match(path) else "") + path + (
+        "#" + fragment if fragment and not UNWRITABLE.search(fragment) else "")
+
+
+def decode(data, place):
+    if data[:2] in (b"\xff\xfe", b"\xfe\xff"):
+        return data.decode("utf-16", "replace")
+    try:
+        return data.decode("utf-8-sig")
+    except UnicodeDecodeError:
+        declared = re.search(rb"""(?:charset|encoding)\s*=\s*["']?\s*([\w.:-]+)""", data[:4096])
+    name = declared[1].decode("ascii", "replace").lower() if declared else "no encoding"
+    try:  # as browsers do, which take ISO 8859-1 for its superset
+        return data.decode("cp1252" if name == "iso-8859-1" else name, "replace")
+    except (LookupError, ValueError):
+        warn(f"{place}: is no UTF-8 and declares {name}: read as windows-1252")
+        return data.decode("cp1252", "replace")
+
+
+class Page(HTMLParser):
+    """What a page says of itself: its title, its main heading, its texts (each heading with the first paragraph after
+    it) and its list items (depth, address or None, text, where in the text the link begins). Items are those of lists,
+    the rows of Doxygen's tables and the first cells of javadoc's."""
+
+    def __init__(self, html, place):
+        super().__init__()
+        self.place = place
+        self.title = self.heading = ""
+        self.texts, self.items = [["", ""]], []
+        self.unread = None  # the tag that is passed over, and how often it is open
+        self.block, self.data = None, ""
+        self.item, self.list_depth = None, 0
+        try:
+            self.feed(html)
+            self.close()
+        except AssertionError as error:  # a declaration that the parser can't read
+            warn(f"{place}: read in part: {error}")
+        self.end_block()
+
+    def handle_starttag(self, tag, attributes):
+        attributes = {name: value or "" for name, value in attributes}
+        classes = set(attributes.get("class", "").split())
+        if tag == "br":
+            self.handle_data(" ")
+        elif self.unread:
+            self.unread[1] += tag == self.unread[0]
+        elif tag in UNREAD_TAGS or attributes.get("role") == "navigation" or any(
+                (tag, name) in UNREAD_PARTS for name in classes):
+            self.unread = [tag, 1]
+        else:
+            if tag == "main" or attributes.get("role") == "main":
+                self.heading, self.texts, self.items = "", [["", ""]], []
+            self.start_block(tag, attributes, classes)
+            self.start_item(tag, attributes, classes)
+
+    def start_block(self, tag, attributes, classes):
+        if tag in BLOCKS:
+            self.end_block()
+        if tag == "div" and "title" in classes:
+            self.block = "h1"
+        elif tag == "dt" and "id" in attributes:
+            self.block = "h6"
+        elif tag in HEADINGS | {"p", "title"}:
+            self.block = tag
+        elif tag == "div" and classes & {"block", "textblock"}:
+            self.block = "p"
+
+    def start_item(self, tag, attributes, classes):
+        row = attributes.get("id", "") if tag == "tr" else ""
+        if tag in LISTS:
+            self.list_depth, self.item = self.list_depth + 1, None
+        elif tag == "li" or row.startswith("row_") or "col-first" in classes:
+            self.item = [row.count("_") - 1 if row else max(self.list_depth, 1), None, "", 0]
+            self.items.append(self.item)
+        elif tag == "a" and self.item and "href" in attributes:
+            self.item[1], self.item[3] = attributes["href"], len(self.item[2])
+
+    def handle_data(self, data):
+        if self.block and not self.unread:
+            self.data += data
+        if self.item and not self.unread:
+            self.item[2] += data
+
+    def handle_endtag(self, tag):
+        if self.unread:
+            self.unread[1] -= tag == self.unread[0]
+            self.unread = self.unread if self.unread[1] else None
+            return
+        if tag in BLOCKS:
+            self.end_block()
+        if tag in LISTS:
+            self.list_depth = max(self.list_depth - 1, 0)
+        if tag in LISTS or tag in ("li", "td") or (tag == "a" and self.item and self.item[1] is not None):
+            self.item = None
+
+    def end_block(self):
+        text, block = " ".join(self.data.split()), self.block
+        self.block, self.data = None, ""
+        if block == "title":
+            self.title = self.title or text
+        elif block in HEADINGS and text:
+            self.texts.append([text, ""])
+            self.heading = self.heading or (text if block == "h1" else "")
+        elif block == "p":
+            self.texts[-1][1] = self.texts[-1][1] or text
+
+
+def read_pages(folder):
+    """Returns the pages by path, each folder's own page first and its subfolders last, and the paths of all files."""
+    pages, files = {}, set()
+    for place, folders, names in os.walk(folder):
+        folders[:] = sorted(name for name in folders if (place, name) != (folder, "docdata"))
+        for name in sorted(names, key=lambda name: (name not in FOLDER_PAGES, name)):
+            path = os.path.relpath(os.path.join(place, name), folder)
+            files.add(path)
+            if not name.lower().endswith((".html", ".htm", ".xhtml")):
+                continue
+            if UNWRITABLE.search(path):
+                warn(f"{ascii(os.path.join(place, name))}: left out: the scripts can't hold its path")
+                continue
+            try:
+                with open(os.path.join(place, name), "rb") as file:
+                    pages[path] = Page(decode(file.read(), file.name), file.name)
+            except OSError as error:
+                warn(f"left out: {error}")
+    choose_titles(pages)
+    return pages, files
+
+
+def choose_titles(pages):
+    """A <title> that several pages have says nothing: then the main heading is better."""
+    uses = collections.Counter(page.title for page in pages.values())
+    for path, page in pages.items():
+        title = page.title if page.title and uses[page.title] == 1 else page.heading or page.title
+        page.title = make_title(title or path, page.place)
+
+
+def make_index(pages):
+    info, terms = [], {}
+    for number, (path, page) in enumerate(pages.items()):
+        texts = [" \u2013 ".join(part for part in text if part and part != page.title) for text in page.texts]
+        extra = page.title
+        for text in list(filter(None, texts)) or [page.title]:
+            # A member __proto__ of an object literal is none.
+            words = set(WORD.findall(f"{extra} {text}".lower())) - COMMON.keys() - {"__proto__"}
+            extra = ""
+            for word in words:
+                terms.setdefault(word, []).append(len(info))
+            info += [[text, number]] if words else []
+    return {"pages": [[make_link(path), page.title] for path, page in pages.items()],
+            "info": info, "common": COMMON, "searchIndex": dict(sorted(terms.items()))}
+
+
+def list_folders(pages, start):
+    """Returns folders and pages as rows (depth, link or "null", title); a folder leads to its own page."""
+    rows, last_parents = [], []
+    for path, page in pages.items():
+        *parents, name = path.split("/")
+        rows += [(depth, "null", parent) for depth, parent in enumerate(parents, 1)
+                 if parents[:depth] != last_parents[:depth]]
+        if parents != last_parents and name in FOLDER_PAGES:
+            rows[-1] = (len(parents), make_link(path), page.title)
+        elif path != start:
+            rows.append((len(parents) + 1, make_link(path), page.title))
+        last_parents = parents
+    return rows
+
+
+def resolve(address, base, files):
+    """Returns path and fragment of an address in the page base; the path is empty if it leads out of the set."""
+    place, _, fragment = address.strip().partition("#")
+    place = unquote(place.partition("?")[0])
+    path = posixpath.normpath(posixpath.join(posixpath.dirname(base), place)) if place else base
+    if SCHEME.match(address) or path.startswith(("..", "/")):
+        return "", ""
+    own = posixpath.normpath(f"{path}/index.html")
+    return own if path not in files and own in files else path, unquote(fragment)
+
+
+def list_links(pages, files, base):
+    """Returns the list items of the page base as rows; those that lead to no page of the set are "null"."""
+    rows = []
+    for depth, address, text, start in pages[base].items:
+        path, fragment = resolve(address or "//", base, files)
+        title = make_title(" ".join(text[start if path in pages else 0:].split()), pages[base].place)
+        if path in pages:
+            rows.append((depth, make_link(path, fragment), title or pages[path].title))
+        else:
+            rows.append((depth, "null", title))
+        if path and path not in files:
+            warn(f"{pages[base].place}: {ascii(address)} leads to no file")
+    return rows
+
+
+def take_nodes(rows, above):
+    """Takes the next rows that are deeper than above, last row next; those with nothing to open fall away."""
+    nodes = []
+    while rows and rows[-1][0] > above:
+        depth, link, title = rows.pop()
+        children = take_nodes(rows, depth)
+        if link != "null" or children:
+            nodes.append({"link": link, "title": title, "children": children})
+    return nodes or None
+
+
+def make_contents(root, module, rows):
+    nodes = take_nodes(rows[::-1], 0) or []
+    module["children"] = [node for node in nodes if node["link"] != "null"] or None
+    return {**root, "children": [node for node in nodes if node["link"] == "null"] + [module]}
+
+
+def make_docdata(folder, root, list_page):
+    """Returns the values of both files. The root is its link and title."""
+    pages, files = read_pages(folder)
+    module = {"link": "null", "title": make_title(os.path.basename(os.path.dirname(folder)), folder)}
+    if root["link"] in pages:
+        module = {"link": root["link"], "title": pages[root["link"]].title}
+    else:
+        warn(f"{folder}: there is no page {root['link']}, where the root of the contents leads")
+    if list_page in pages:
+        rows = list_links(pages, files, list_page)
+    else:
+        rows = list_folders(pages, root["link"])
+        if list_page:
+            warn(f"{folder}: there is no page {list_page}: the contents are made from the folders")
+    index = make_index(pages)
+    say(f"{folder}: {len(pages)} pages, {len(index['info'])} texts, {len(index['searchIndex'])} terms")
+    return {"index.json": index, "toc.json": make_contents(root, module, rows)}
+
+
+def main():
+    parser = argparse.ArgumentParser(description="Makes index.json and toc.json from HTML pages.")
+    parser.add_argument("--root-title", metavar="T", help="default: the name of the set folder")
+    parser.add_argument("--root-link", metavar="L", default="index.html", help="default: %(default)s")
+    parser.add_argument("--toc", metavar="FILE", help="page in each set folder whose lists are the contents")
+    parser.add_argument("set_folders", metavar="SET_FOLDER", nargs="+")
+    options = parser.parse_args()
+    if UNWRITABLE.search(options.root_link):
+        parser.error("the scripts can't hold this root link")
+    for folder in options.set_folders:
+        if not os.path.isdir(folder):
+            parser.error(f"{folder} is no folder")
+    for folder in map(os.path.abspath, options.set_folders):
+        title = make_title(options.root_title or os.path.basename(folder), folder)
+        files = make_docdata(folder, {"link": options.root_link, "title": title}, options.toc)
+        os.makedirs(os.path.join(folder, "docdata"), exist_ok=True)
+        for name, value in files.items():
+            with open(os.path.join(folder, "docdata", name), "w", encoding="utf-8", newline="\n") as file:
+                file.write(json.dumps(value, ensure_ascii=False, indent=1) + "\n")
+
+
+if __name__ == "__main__":
+    main()
