@@ -1,0 +1,356 @@
+// Search and contents of all combined modules, in a documentation page.
+//
+// A page may be opened from a folder on disk, where nothing can be fetched, so the outputs run as classic scripts.
+// They assign globals, which a page's own "const p0" would make a syntax error. So each runs in a hidden frame,
+// which is removed once its values are taken. The contents wait until the page is idle, the search index until the
+// reader turns to the box: a script of 35 MB takes half a second. Titles and texts enter the page as text only.
+
+(function () {
+    "use strict";
+
+    const RESULTS_AT_ONCE = 30;
+    const EXCERPT_LENGTH = 300;
+    const LEAD_LENGTH = 80; // of an excerpt, before the first word found
+    const LETTER = "[\\p{L}\\p{M}\\p{N}_]";
+
+    const { document, history, Event, Map, Set, URL } = window; // whatever the page's scripts call so
+    const tag = document.currentScript;
+    const shared = tag.dataset.docdata?.replace(/\/?$/, "/");
+    const docdata = shared === undefined ? new URL(".", tag.src) : new URL(shared, document.URL);
+    const setFolder = new URL("..", docdata).href;
+
+    const box = create("input", { type: "search", autocomplete: "off", spellcheck: "false" });
+    const filter = create("select", {}, create("option", { value: "" }, "All"));
+    const form = create("form", { role: "search" }, create("label", {}, "Search all modules ", box));
+    const status = create("p", { role: "status" });
+    const results = create("ul", { class: "pagemeld-results" });
+    const more = create("button", { type: "button", hidden: "" }, "More results");
+    const finder = create("div", {}, form, status, results, more);
+    const contents = create("div", { class: "pagemeld-contents" });
+    const contentsButton = createButton("Contents", contents);
+    const nav = create("nav", { "aria-label": "Contents" }, contentsButton, contents);
+    const view = create("div", { class: "pagemeld-view", hidden: "" }, finder, nav);
+
+    let index = null; // until it is loaded
+    let found = { pages: [] };
+
+    function create(name, attributes, ...children) {
+        const element = document.createElementNS("http://www.w3.org/1999/xhtml", name);
+        Object.entries(attributes).forEach(([key, value]) => element.setAttribute(key, value));
+        element.append(...children);
+        return element;
+    }
+
+    // The named globals, and p0, p1, ... as prefixes, longest first; null if a name is missing.
+    function takeGlobals(source, names) {
+        const values = Object.fromEntries(names.map((name) => [name, source[name]]));
+        const prefixes = Object.keys(source).filter((key) => /^p\d+$/.test(key)).map((key) => source[key]);
+        prefixes.sort((a, b) => b.length - a.length);
+        return names.every((name) => values[name] instanceof source.Object) ? { ...values, prefixes } : null;
+    }
+
+    const loaded = (element, parent) =>
+        new Promise((done) => { element.onload = element.onerror = done; parent.append(element); });
+
+    // A script that throws has a load event too: what it assigned tells whether it ran.
+    async function runOutput(name, globals, subject, complaint) {
+        const frame = create("iframe", {});
+        frame.style.display = "none";
+        await loaded(frame, view);
+        const script = frame.contentDocument.createElement("script");
+        script.charset = "utf-8";
+        script.src = new URL(name, docdata);
+        await loaded(script, frame.contentDocument.head);
+        const values = takeGlobals(frame.contentWindow, globals);
+        frame.remove();
+        complaint.textContent = values ? "" : `${subject} not available: ${name} did not run`;
+        return values;
+    }
+
+    // Names on disk need not be UTF-8.
+    const decode = (text) => { try { return decodeURIComponent(text); } catch { return text; } };
+    const encode = (path, special) => path.replace(special, encodeURIComponent);
+    const prefixOf = (link, prefixes) => prefixes.find((prefix) => link.startsWith(prefix)) || "";
+
+    // A link is a path on disk, in which only "#" has its meaning of an address. The outputs put the prefix
+    // before whole addresses too; "std::list.html" is none, and a script is none for readers to follow.
+    function addressOf(link, prefixes) {
+        const prefix = prefixOf(link, prefixes);
+        const rest = link.slice(prefix.length);
+        if (/^(?!javascript:)[a-z][a-z\d+.-]+:(?!:)/i.test(rest)) {
+            return rest;
+        }
+        const end = `${rest}#`.indexOf("#");
+        const path = encode(prefix, /[\0- %?#\\]/g) + encode(rest.slice(0, end), /[\0- %?\\]/g);
+        return setFolder + path + rest.slice(end);
+    }
+
+    const createLink = (link, title, prefixes) =>
+        create("a", { href: addressOf(link, prefixes), target: "_self" }, title.trim() || link);
+
+    const wordsOf = (text) => text.toLowerCase().match(new RegExp(`${LETTER}+`, "gu")) || [];
+
+    // The name of the module folder: ".../charts/Manual/" is of "charts".
+    const moduleName = (prefix) => decode(new URL(addressOf(prefix, [prefix])).pathname.split("/").at(-3) ?? "");
+    const moduleOf = (page) => index.modules.get(prefixOf(index.pages[page][0], index.prefixes));
+
+    // What a search needs beside the lists themselves. Of pages with the same path the first stands for all.
+    function orderIndex(lists) {
+        const { pages, info, searchIndex, prefixes } = lists;
+        const firstPages = new Map();
+        const titles = new Map();
+        pages.forEach(([path, title], page) => {
+            firstPages.has(path) || firstPages.set(path, page);
+            for (const word of wordsOf(title)) {
+                titles.has(word) || titles.set(word, []);
+                titles.get(word).push(firstPages.get(path));
+            }
+        });
+        return {
+            ...lists,
+            titles,
+            words: [...new Set(Object.keys(searchIndex).concat([...titles.keys()]))],
+            pageOfText: info.map(([, page]) => firstPages.get(pages[page][0])),
+            modules: new Map(["", ...prefixes].map((prefix) => [prefix, moduleName(prefix)])),
+        };
+    }
+
+    // Marks the texts and pages that hold a word: a page 4, in its title 2 more, whole 1 more.
+    function lookUp(word, isPrefix) {
+        const { searchIndex, titles, words, pageOfText } = index;
+        const texts = new Uint8Array(pageOfText.length);
+        const pages = new Uint8Array(index.pages.length);
+        for (const term of isPrefix ? words.filter((other) => other.startsWith(word)) : [word]) {
+            const whole = term === word ? 1 : 0;
+            for (const text of Object.hasOwn(searchIndex, term) ? searchIndex[term] : []) {
+                texts[text] = 1;
+                pages[pageOfText[text]] |= 4 | whole;
+            }
+            titles.get(term)?.forEach((page) => { pages[page] |= 4 | 2 | whole; });
+        }
+        return { texts, pages };
+    }
+
+    // The pages that hold every word, those with the larger sum of marks first, then in their own order; and of
+    // each page the text that holds most of the words.
+    function search(words) {
+        const scores = new Float64Array(index.pages.length);
+        const counts = new Uint16Array(index.info.length);
+        words.forEach((word, i) => {
+            const { texts, pages } = lookUp(word, i === words.length - 1);
+            texts.forEach((mark, text) => { counts[text] += mark; });
+            pages.forEach((mark, page) => { scores[page] += mark || -Infinity; });
+        });
+        const [ranks, bestTexts] = [[], []];
+        scores.forEach((score, page) => score > 0 && (ranks[score] ??= []).push(page));
+        index.pageOfText.forEach((page, text) => {
+            bestTexts[page] = counts[text] > (counts[bestTexts[page]] ?? -1) ? text : bestTexts[page];
+        });
+        return { words, pages: ranks.reverse().flat(), bestTexts };
+    }
+
+    // Common words are left out, but for a last one that may become another: "the" finds "theory" while typed.
+    function searchFor(query) {
+        const words = [...new Set(wordsOf(query))];
+        const rare = words.filter((word) => !Object.hasOwn(index.common, word));
+        const isGrowing = rare.at(-1) !== words.at(-1) && query.toLowerCase().endsWith(words.at(-1));
+        const grown = isGrowing ? search([...rare, words.at(-1)]) : null;
+        return grown?.pages.length > 0 ? grown
+            : rare.length > 0 ? search(rare) : { pages: [], isCommonOnly: words.length > 0 };
+    }
+
+    // Some lines of a text around the first of the words, the last of which is a prefix; all are marked.
+    function excerpt(text, words) {
+        const word = new RegExp(`(?<!${LETTER})(${words.join("|")}${LETTER}*)(?!${LETTER})`, "giu");
+        const first = text.search(word);
+        const end = first > LEAD_LENGTH ? text.slice(first - LEAD_LENGTH).replace(/^\S{0,40}\s/, "\u2026 ") : text;
+        const cut = end.length > EXCERPT_LENGTH ? end.slice(0, EXCERPT_LENGTH).replace(/\s\S{0,40}$/, " \u2026") : end;
+        return cut.split(word).map((piece, i) => (i % 2 === 1 ? create("mark", {}, piece) : piece));
+    }
+
+    function createResult(page) {
+        const [path, title] = index.pages[page];
+        const [text] = index.info[found.bestTexts[page]] ?? [""];
+        return create("li", {}, createLink(path, title, index.prefixes), " ",
+            create("span", {}, moduleOf(page)), create("p", {}, ...excerpt(text, found.words)));
+    }
+
+    // Returns the first of the results that it adds.
+    function showMore() {
+        const shown = results.childElementCount;
+        results.append(...found.pages.slice(shown, shown + RESULTS_AT_ONCE).map(createResult));
+        more.hidden = results.childElementCount === found.pages.length;
+        return results.children[shown];
+    }
+
+    function describeFound({ isCommonOnly, words, pages: { length: count } }) {
+        return isCommonOnly ? "Only common words, which are not searched for"
+            : !words ? "" : count === 0 ? "Nothing found" : count === 1 ? "1 page found" : `${count} pages found`;
+    }
+
+    function update() {
+        if (index) {
+            found = searchFor(box.value);
+            found.pages = found.pages.filter((page) => !filter.value || moduleOf(page) === filter.value);
+            results.replaceChildren();
+            showMore();
+            status.textContent = describeFound(found);
+        }
+    }
+
+    async function loadIndex() {
+        status.textContent = "Loading the search index";
+        const globals = ["pages", "info", "common", "searchIndex"];
+        const lists = await runOutput("global_index.js", globals, "Search is", status);
+        if (lists) {
+            index = orderIndex(lists);
+            const names = [...new Set(index.prefixes.map((prefix) => index.modules.get(prefix)))].sort();
+            filter.append(...names.map((name) => create("option", {}, name)));
+            names.length > 1 && form.append(create("label", {}, "Module ", filter));
+            update();
+        }
+    }
+
+    // Writes the query into the address. Leaves all else there as it is: the page may read it.
+    function keepQuery() {
+        const address = new URL(document.URL);
+        const others = address.search.slice(1).split("&").filter((part) => part && !part.startsWith("pagemeld="));
+        const query = box.value.trim();
+        address.search = others.concat(query ? "pagemeld=" + encodeURIComponent(query) : []).join("&");
+        history.replaceState(history.state, "", address);
+    }
+
+    // A button that shows and hides a list, and calls fill before it shows an empty one.
+    function createButton(title, list, fill = () => {}) {
+        const button = create("button", { type: "button" }, title);
+        button.onclick = () => {
+            list.hasChildNodes() || fill();
+            list.hidden = !list.hidden;
+            button.setAttribute("aria-expanded", !list.hidden);
+        };
+        button.setAttribute("aria-expanded", false);
+        list.hidden = true;
+        return button;
+    }
+
+    const pathOf = ({ pathname }) => decode(pathname.replace(/\/$/, "/index.html"));
+
+    // A test whether a link leads to the page being read; only few links are taken apart for it.
+    function createPageTest(prefixes) {
+        const path = pathOf(document.location);
+        const name = path.slice(path.lastIndexOf("/") + 1);
+        return (link) => {
+            const address = link.includes(name) && new URL(addressOf(link, prefixes));
+            return address && address.host === document.location.host && pathOf(address) === path;
+        };
+    }
+
+    // The nodes from a list down to the first whose link passes the test, or null.
+    function findWay(nodes, test) {
+        for (const node of nodes || []) {
+            const below = test(node.link) ? [] : findWay(node.children, test);
+            if (below) {
+                return [node, ...below];
+            }
+        }
+        return null;
+    }
+
+    // The entries of a list. Of the nodes on the way to the page all are opened but the last, which is the page.
+    function createEntries(nodes, way, prefixes) {
+        return nodes.map((node) => {
+            const { link, title, children } = node;
+            const isLink = link !== "null";
+            const name = isLink ? createLink(link, title, prefixes) : create("span", {}, title.trim() || link);
+            if (node === way.at(-1)) {
+                name.setAttribute("aria-current", "page");
+            }
+            if (!children?.length) {
+                return create("li", {}, name);
+            }
+            const list = create("ul", {});
+            const fill = () => list.append(...createEntries(children, way, prefixes));
+            const button = createButton(isLink ? "" : name, list, fill);
+            isLink && button.setAttribute("aria-label", `Below ${title}`);
+            way.slice(0, -1).includes(node) && button.click();
+            return create("li", {}, button, isLink ? name : "", list);
+        });
+    }
+
+    async function loadContents() {
+        const output = await runOutput("global_toc.js", ["toc"], "Contents are", contents);
+        if (output) {
+            const { toc, prefixes } = output;
+            const isPage = createPageTest(prefixes);
+            const way = findWay(toc.children, (link) => !link.includes("#") && isPage(link)) ??
+                findWay(toc.children, isPage) ?? [];
+            const list = create("ul", {}, ...createEntries(toc.children, way, prefixes));
+            contents.append(create("p", {}, toc.title), list);
+            const current = list.querySelector("[aria-current]");
+            contents.scrollTop = current ? current.offsetTop - contents.clientHeight / 2 : 0;
+        }
+    }
+
+    const isPlain = (event) => !event.isComposing &&
+        !["Control", "Alt", "Meta", "AltGraph"].some((key) => event.getModifierState(key));
+
+    // "/" leads to the box, unless it is typed somewhere or the page has taken it.
+    function onPageKey(event) {
+        const [target] = event.composedPath();
+        const isTyped = target.isContentEditable || /^(input|textarea|select)$/.test(target.localName);
+        if (event.key === "/" && !isTyped && !event.defaultPrevented && isPlain(event)) {
+            event.preventDefault();
+            box.focus();
+            box.select();
+        }
+    }
+
+    // Down and Up lead through the box and the results, Escape to the box, and clears it there.
+    function onFinderKey(event) {
+        const { key, target } = event;
+        const stops = [box, ...results.querySelectorAll("a"), more];
+        const step = stops.includes(target) ? { ArrowDown: 1, ArrowUp: -1 }[key] : 0;
+        const next = key === "Escape" ? box : step && stops[stops.indexOf(target) + step];
+        if (next && !event.shiftKey && isPlain(event)) {
+            event.preventDefault();
+            next.focus();
+            if (next === target) {
+                box.value = "";
+                update();
+            }
+        }
+    }
+
+    function listen() {
+        addEventListener("keydown", onPageKey);
+        finder.addEventListener("keydown", onFinderKey);
+        box.addEventListener("focus", loadIndex, { once: true });
+        box.addEventListener("input", update);
+        box.addEventListener("blur", keepQuery);
+        filter.addEventListener("change", update);
+        more.addEventListener("click", () => showMore().querySelector("a").focus());
+        results.addEventListener("click", keepQuery);
+        form.addEventListener("submit", (event) => {
+            event.preventDefault();
+            results.querySelector("a")?.click();
+        });
+    }
+
+    async function start() {
+        if (document.body?.localName !== "body") {
+            return; // a frame set
+        }
+        const place = document.getElementById("pagemeld") ?? create("div", { id: "pagemeld", class: "pagemeld-top" });
+        place.isConnected || document.body.prepend(place);
+        place.append(view);
+        listen();
+        matchMedia("(min-width: 48em)").matches && contentsButton.click();
+        box.value = new URLSearchParams(document.location.search).get("pagemeld") ?? "";
+        box.value && box.dispatchEvent(new Event("focus"));
+        await loaded(create("link", { rel: "stylesheet", href: new URL("pagemeld.css", tag.src) }), place);
+        view.hidden = false;
+        (window.requestIdleCallback ?? setTimeout)(loadContents);
+    }
+
+    document.readyState === "loading" ? addEventListener("DOMContentLoaded", start) : start();
+}());
