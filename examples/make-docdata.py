@@ -67,7 +67,7 @@ def decode(data, place):
     if data[:2] in (b"\xff\xfe", b"\xfe\xff"):
         return data.decode("utf-16", "replace")
     try:
-        return data.decode("utf-8-sig")
+        return data.decode()
     except UnicodeDecodeError:
         declared = re.search(rb"""(?:charset|encoding)\s*=\s*["']?\s*([\w.:-]+)""", data[:4096])
     name = declared[1].decode("ascii", "replace").lower() if declared else "no encoding"
