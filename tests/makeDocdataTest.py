@@ -9,8 +9,10 @@ import unittest
 SCRIPT = sys.argv.pop(1)
 PAGES = {
     "index.html": """<title>Start</title><h1>Site</h1><main><nav><h2>Here</h2></nav><h1>Start</h1>
-        <p>The <b>first</b><br>paragraph.<p>No other.<ul><li>Group<ul><li><a href="a%20b.html#caf%C3%A9">Café</a><li><a href="./Foo%3ABar.html">Path</a>
-        </ul><li><a href="sub/#&quot;">C:\\new</a><li><a href="gone.html">Gone</a><li><a href="ftp://x/">Away</a></ul>
+        <p>The <b>first</b><br>paragraph.<p>No other.
+        <ul><li>Group<ul><li><a href="a%20b.html#caf%C3%A9">Café</a><li><a href="./Foo%3ABar.html">Path</a></ul>
+        <li><a href="sub/#&quot;">C:\\new</a><li><a href="ftp://x/">Away</a>
+        <li><a href="gone.html">Gone</a><li><a href="gone.html#x">Gone</a></ul>
         <tr id="row_0_"><td><span class="arrow">v</span>ns</td><tr id="row_0_0_"><td><a href="latin.htm">Class</a>""",
     "Foo:Bar.html": "<title>Same</title><h1>By “heading”</h1><h2>__proto__</h2><dl><dt id=x>नमस्ते x_1</dt><dd><p>It.",
     "a b.html": b"<meta charset=koi8-r><p>\xcd\xc9\xd2",
@@ -54,7 +56,7 @@ latin.htm: read in part: unknown status keyword 'odd' in marked section
 'sharp#.html': left out: the scripts can't hold its path
 sub/index.html: what would break the scripts is replaced in the title "C:∖new␀"
 index.html: what would break the scripts is replaced in the title "C:∖new"
-index.html: 'gone.html' leads to no file""".split("\n")
+index.html: links to 'gone.html', which does not exist, are left out""".split("\n")
 
 
 class MakeDocdata(unittest.TestCase):
