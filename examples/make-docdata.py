@@ -67,7 +67,7 @@ def decode(data, place):
     if data[:2] in (b"\xff\xfe", b"\xfe\xff"):
         return data.decode("utf-16", "replace")
     try:
-        return data.decode("utf-8-sig")
+        return data.decode()
     except UnicodeDecodeError:
         declared = re.search(rb"""(?:charset|encoding)\s*=\s*["']?\s*([\w.:-]+)""", data[:4096])
     name = declared[1].decode("ascii", "replace").lower() if declared else "no encoding"
@@ -240,7 +240,7 @@ def resolve(address, base, files):
 
 def list_links(pages, files, base):
     """Returns the list items of the page base as rows; those that lead to no page of the set are "null"."""
-    rows = []
+    rows, missing = [], set()
     for depth, address, text, start in pages[base].items:
         path, fragment = resolve(address or "//", base, files)
         title = make_title(" ".join(text[start if path in pages else 0:].split()), pages[base].place)
@@ -249,7 +249,9 @@ def list_links(pages, files, base):
         else:
             rows.append((depth, "null", title))
         if path and path not in files:
-            warn(f"{pages[base].place}: {ascii(address)} leads to no file")
+            missing.add(path)
+    for path in sorted(missing):
+        warn(f"{pages[base].place}: links to {ascii(path)}, which does not exist, are left out")
     return rows
 
 
