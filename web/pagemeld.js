@@ -15,8 +15,11 @@
 
     const { document, history, Event, Map, Set, URL } = window; // whatever the page's scripts call so
     const tag = document.currentScript;
+    // A <base> after the tag had no part in finding this script.
+    const isBeforeBase = document.querySelector("base[href]")?.compareDocumentPosition(tag) & 2;
+    const ownAddress = isBeforeBase ? new URL(tag.getAttribute("src"), document.URL) : tag.src;
     const shared = tag.dataset.docdata?.replace(/\/?$/, "/");
-    const docdata = shared === undefined ? new URL(".", tag.src) : new URL(shared, document.URL);
+    const docdata = shared === undefined ? new URL(".", ownAddress) : new URL(shared, document.URL);
     const setFolder = new URL("..", docdata).href;
 
     const box = create("input", { type: "search", autocomplete: "off", spellcheck: "false" });
@@ -347,7 +350,7 @@
         matchMedia("(min-width: 48em)").matches && contentsButton.click();
         box.value = new URLSearchParams(document.location.search).get("pagemeld") ?? "";
         box.value && box.dispatchEvent(new Event("focus"));
-        await loaded(create("link", { rel: "stylesheet", href: new URL("pagemeld.css", tag.src) }), place);
+        await loaded(create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress) }), place);
         view.hidden = false;
         (window.requestIdleCallback ?? setTimeout)(loadContents);
     }

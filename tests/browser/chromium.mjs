@@ -7,25 +7,22 @@ import path from "node:path";
 export const program = ["/usr/bin/chromium", "/usr/bin/chromium-browser"].find(existsSync);
 
 const flags = ["--headless", "--remote-debugging-pipe", "--disable-gpu", "--disable-quic", "--no-first-run",
-    "--disable-background-networking", "--disable-component-update", "--disable-sync"];
+    "--disable-background-networking", "--disable-component-update", "--disable-sync",
+    ...(process.getuid() === 0 ? ["--no-sandbox"] : [])];
+const keyCodes = { Tab: 9, Enter: 13, Escape: 27, ArrowUp: 38, ArrowDown: 40, "/": 191 };
+const keyTexts = { Enter: "\r", "/": "/" };
 
-// What a key is called in the browser's protocol, where that differs from its name.
-const keyCodes = { Enter: [13, "\r"], Escape: [27], Tab: [9], ArrowUp: [38], ArrowDown: [40], "/": [191, "/"] };
-
-// One page in a browser and a profile of its own. Collects the errors and the requests of the page.
+// One page, in a browser with a profile of its own. Collects the errors and the requests since it went somewhere.
 export class Page {
-    errors = [];
-    requests = [];
     #profile = mkdtempSync(path.join(tmpdir(), "pagemeld-chromium-"));
-    #waiting = new Map(); // for the answer with a number, or for an event
+    #browser = spawn(program, [...flags, `--user-data-dir=${this.#profile}`],
+        { stdio: ["ignore", "ignore", "ignore", "pipe", "pipe"] });
+    #waiting = new Map(); // who waits for the answer with a number, or for an event
     #lastId = 0;
     #session;
-    #browser;
 
     static async open() {
         const page = new Page();
-        const ownFlags = [`--user-data-dir=${page.#profile}`, ...(process.getuid() === 0 ? ["--no-sandbox"] : [])];
-        page.#browser = spawn(program, [...flags, ...ownFlags], { stdio: ["ignore", "ignore", "ignore", "pipe", "pipe"] });
         page.#read(page.#browser.stdio[4].setEncoding("utf8"));
         const { targetId } = await page.ask("Target.createTarget", { url: "about:blank" });
         page.#session = (await page.ask("Target.attachToTarget", { targetId, flatten: true })).sessionId;
@@ -81,47 +78,41 @@ export class Page {
         await loaded;
     }
 
-    // The value of a function in the page, given the arguments.
-    async evaluate(callee, ...args) {
-        const expression = `(${callee})(...${JSON.stringify(args)})`;
-        const { result, exceptionDetails } = await this.ask("Runtime.evaluate",
+    // The value of an expression, or of a function with arguments, in the page.
+    async evaluate(code, ...args) {
+        const expression = typeof code === "string" ? code : `(${code})(...${JSON.stringify(args)})`;
+        const { result, exceptionDetails: fault } = await this.ask("Runtime.evaluate",
             { expression, awaitPromise: true, returnByValue: true, userGesture: true });
-        if (exceptionDetails) {
-            throw new Error(exceptionDetails.exception?.description ?? exceptionDetails.text);
+        if (fault) {
+            throw new Error(`${expression}: ${fault.exception?.description ?? fault.text}`);
         }
         return result.value;
     }
 
-    // Waits until a function in the page returns something true, and returns it.
-    async until(callee, ...args) {
-        for (const end = Date.now() + 10000; Date.now() < end; ) {
-            const value = await this.evaluate(callee, ...args);
-            if (value) {
-                return value;
+    // Waits for something true, also across pages.
+    async until(code, ...args) {
+        for (const end = Date.now() + 10000; Date.now() < end;) {
+            if (await this.evaluate(code, ...args).catch(() => false)) {
+                return;
             }
-            await new Promise((resolve) => setTimeout(resolve, 20));
+            await new Promise((resolve) => setTimeout(resolve, 10));
         }
-        throw new Error(`never true: ${callee} ${JSON.stringify(args)}`);
+        throw new Error(`never true: ${code} ${JSON.stringify(args)}`);
     }
 
     async press(key, modifiers = 0) {
-        const [windowsVirtualKeyCode, text] = keyCodes[key];
-        const params = { key, code: key, windowsVirtualKeyCode, modifiers, text };
-        await this.ask("Input.dispatchKeyEvent", { type: text && !modifiers ? "keyDown" : "rawKeyDown", ...params });
+        const params = { key, code: key, windowsVirtualKeyCode: keyCodes[key], modifiers, text: keyTexts[key] };
+        await this.ask("Input.dispatchKeyEvent", { type: "keyDown", ...params });
         await this.ask("Input.dispatchKeyEvent", { ...params, type: "keyUp" });
-    }
-
-    type(text) {
-        return this.ask("Input.insertText", { text });
     }
 
     async picture() {
         return Buffer.from((await this.ask("Page.captureScreenshot")).data, "base64");
     }
 
-    // A window of a width, in CSS pixels, for a reader who likes it light or dark.
-    async resize(width, height, scheme = "light", scale = 1) {
-        await this.ask("Emulation.setDeviceMetricsOverride", { width, height, deviceScaleFactor: scale, mobile: false });
+    // Gives the window a size in CSS pixels, and the reader a liking for light or dark.
+    async setWindow(width, height, scheme = "light", deviceScaleFactor = 1) {
+        await this.ask("Emulation.setDeviceMetricsOverride", { width, height, deviceScaleFactor, mobile: false });
         await this.ask("Emulation.setEmulatedMedia", { features: [{ name: "prefers-color-scheme", value: scheme }] });
     }
 }
