@@ -46,6 +46,9 @@ const index = {
 
 function makeSite() {
     cpSync(path.join(tree, "examples"), root, { recursive: true });
+    const modules = ["acquire", "charts", "logbook"].flatMap((name) => [`${name}/Manual`, `${name}/ScriptReference`]);
+    execFileSync(path.join(root, "make-docdata.py"), ["--toc", "index.html", "--root-title", toc.title, ...modules],
+        { cwd: root, stdio: "ignore" });
     for (const [name, text] of Object.entries(pages)) {
         mkdirSync(path.dirname(path.join(root, sea, name)), { recursive: true });
         writeFileSync(path.join(root, sea, name), text);
