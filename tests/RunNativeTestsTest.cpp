@@ -35,6 +35,7 @@ std::string ReportOf(Arguments&&... arguments)
 void PrintAndLog()
 {
     EXPECT_NE(nullptr, Testing::g_TestReporter);
+    EXPECT_FALSE(IsNativeTestExpectingAssertionFailure("any text"));
     printf_console("swallowed\n");
     DebugStringToFile({"swallowed too", LogType::Error, "file", 1});
 }
