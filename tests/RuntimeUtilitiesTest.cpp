@@ -4,6 +4,8 @@
 
 #include <gtest/gtest.h>
 
+#include <chrono>
+
 TEST(HasARGV, FindsASwitchAnywhereWithOneHyphenOrTwo)
 {
     const char* const arguments[] = {"-program", "-first",    "filter",  "--SECOND",
@@ -55,6 +57,15 @@ TEST(ConvertNonPrintableCharsToHex, KeepsPrintableAsciiAndWellFormedSequences)
     {
         EXPECT_EQ(c.expected, ConvertNonPrintableCharsToHex(c.text));
     }
+}
+
+TEST(GetCurrentTimeAsDateTime, CountsTenthsOfMicrosecondsSinceTheYear1)
+{
+    using std::chrono::microseconds;
+    const std::int64_t time = GetCurrentTimeAsDateTime() - 621'355'968'000'000'000;
+    const auto now = std::chrono::system_clock::now().time_since_epoch();
+    EXPECT_LE(microseconds(time / 10), now);
+    EXPECT_GT(microseconds(time / 10) + std::chrono::milliseconds(100), now);
 }
 
 TEST(TimerImplPosix, SubtractsSecondsAndMicrosecondsSeparately)
