@@ -63,7 +63,7 @@ TEST(ValuePlaces, AnswersInTheOrderOfTheQuestion)
 {
     const char* const text = "{\"a\":[1,\n2],\"b\":3}";
     const rapidjson::Document document = ParsedJson(text);
-    const rapidjson::Value& list = document["a"];
+    const rapidjson::Value& list = document.MemberBegin()->value;
     EXPECT_EQ("2:1 1:1 2:1 1:6 ", Places(text, document, {&list[1], &document, &list[1], &list}));
     EXPECT_EQ("", Places(text, document, {}));
     EXPECT_EQ(9U, LocateValues(text, document, {&list[1]})[0].offset);
@@ -79,5 +79,5 @@ TEST(ValuePlaces, ReachesTheDeepestValue)
     {
         inner = &(*inner)[0];
     }
-    EXPECT_EQ("10000:6 ", Places(text, document, {&(*inner)["a"]}));
+    EXPECT_EQ("10000:6 ", Places(text, document, {&inner->MemberBegin()->value}));
 }

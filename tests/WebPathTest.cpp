@@ -13,7 +13,8 @@ namespace
 
 constexpr char kBetween = '\x7F'; // between a directory and a link
 
-/// Where a link leads. Addresses begin with http, since Windows drives in those of files have own rules.
+/// Where a link leads. Addresses begin with http, since Windows drives in those of files have rules of their
+/// own.
 constexpr const char* kPathInNode = R"(
     const { unescape } = require('querystring');
     function answer(text) {
