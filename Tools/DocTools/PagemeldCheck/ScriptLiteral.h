@@ -7,7 +7,7 @@
 /// Returns the value of a JavaScript string literal, or nothing when the text is not one whole literal in
 /// double quotes: it ends early, never ends, or has an escape that a script engine refuses.
 ///
-/// literal is in UTF-8, with its quotes, as it stands in a script that is not in strict mode. The value is in
+/// literal is in UTF-8, with its quotes, as a script that is not in strict mode holds it. The value is in
 /// UTF-8 too. Half of a surrogate pair, which only an escape can make, becomes the three bytes that its
 /// number would have; two halves in a row become their character. Every escape is longer than what it makes,
 /// so a title or link that holds a backslash never comes back unchanged.

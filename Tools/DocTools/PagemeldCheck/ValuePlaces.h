@@ -21,5 +21,5 @@ struct ValuePlace
 [[nodiscard]] std::vector<ValuePlace> LocateValues(const char* text, const rapidjson::Value& document,
                                                    const std::vector<const rapidjson::Value*>& values);
 
-/// Returns the place of a byte of the text. Reads all that stands before it, NUL included.
+/// Returns the place of a byte of the text. Reads all bytes before it, NUL included.
 [[nodiscard]] ValuePlace PlaceOfOffset(const char* text, std::size_t offset);

@@ -10,12 +10,11 @@ void AppendPage(TextBuffer& script, const rapidjson::Value& page)
 {
     AppendText(script, "[");
     AppendPrefixVariable(script, page[2].GetInt());
-    AppendText(script, " + \"");
-    // The page path is deliberately not escaped.
-    AppendText(script, CStringOf(page[0]));
-    AppendText(script, "\", \"");
-    AppendEscapingQuotes(script, CStringOf(page[1]));
-    AppendText(script, "\"]");
+    AppendText(script, " + ");
+    AppendPathLiteral(script, CStringOf(page[0]));
+    AppendText(script, ", ");
+    AppendTitleLiteral(script, CStringOf(page[1]));
+    AppendText(script, "]");
 }
 
 void AppendPages(TextBuffer& script, const rapidjson::Value& pages)

@@ -30,6 +30,20 @@ void AppendEscapingQuotes(TextBuffer& buffer, std::string_view text)
     AppendText(buffer, rest);
 }
 
+void AppendTitleLiteral(TextBuffer& buffer, const char* text)
+{
+    AppendText(buffer, "\"");
+    AppendEscapingQuotes(buffer, text);
+    AppendText(buffer, "\"");
+}
+
+void AppendPathLiteral(TextBuffer& buffer, const char* text)
+{
+    AppendText(buffer, "\"");
+    AppendText(buffer, text);
+    AppendText(buffer, "\"");
+}
+
 void AppendCompactJson(TextBuffer& buffer, const rapidjson::Value& value)
 {
     rapidjson::Writer<TextBuffer> writer(buffer);

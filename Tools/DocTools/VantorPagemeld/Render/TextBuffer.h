@@ -21,6 +21,12 @@ void AppendText(TextBuffer& buffer, std::string_view text);
 /// titles: backslashes, control characters and bytes above 0x7F pass as they are, on purpose.
 void AppendEscapingQuotes(TextBuffer& buffer, std::string_view text);
 
+/// Appends a title as the scripts hold it: in double quotes, with AppendEscapingQuotes.
+void AppendTitleLiteral(TextBuffer& buffer, const char* text);
+
+/// Appends a page path or link as the scripts hold it: in double quotes, deliberately not escaped at all.
+void AppendPathLiteral(TextBuffer& buffer, const char* text);
+
 /// Appends the value as compact JSON: no white space between tokens.
 void AppendCompactJson(TextBuffer& buffer, const rapidjson::Value& value);
 

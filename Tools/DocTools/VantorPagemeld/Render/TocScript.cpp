@@ -55,10 +55,8 @@ void AppendLink(TextBuffer& script, const rapidjson::Value& node, const TocScrip
         AppendPrefixVariable(script, *module);
         AppendText(script, "+");
     }
-    // A tagged link is deliberately not escaped.
-    AppendText(script, "\"");
-    AppendText(script, link);
-    AppendText(script, "\",");
+    AppendPathLiteral(script, link);
+    AppendText(script, ",");
     AppendLineBreak(script, layout);
 }
 
@@ -154,9 +152,7 @@ void AppendTocString(TextBuffer& script, const char* text, const char* extra, in
                      const TocScriptLayout& layout)
 {
     AppendIndent(script, indent, layout);
-    AppendText(script, "\"");
-    AppendEscapingQuotes(script, text);
-    AppendText(script, "\"");
+    AppendTitleLiteral(script, text);
     AppendText(script, extra);
     if (newLine)
     {

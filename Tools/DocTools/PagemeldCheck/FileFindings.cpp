@@ -1,0 +1,104 @@
+#include "Tools/DocTools/PagemeldCheck/FileFindings.h"
+
+void FileFindings::AddAtValue(const char* rule, const rapidjson::Value& value, const JsonPointer& pointer,
+                              const Wording& wording)
+{
+    if (Item* item = AddItem(rule))
+    {
+        item->finding.message = wording();
+        item->finding.pointer = pointer.Text();
+        item->value = &value;
+    }
+}
+
+void FileFindings::AddAtOffset(const char* rule, std::size_t offset, const Wording& wording)
+{
+    if (Item* item = AddItem(rule))
+    {
+        item->finding.message = wording();
+        item->offset = offset;
+    }
+}
+
+void FileFindings::Add(const char* rule, const Wording& wording)
+{
+    if (Item* item = AddItem(rule))
+    {
+        item->finding.message = wording();
+    }
+}
+
+void FileFindings::HandTo(Report& report, const char* text, const rapidjson::Value* document)
+{
+    Locate(text, document);
+    for (Item& item : m_items)
+    {
+        report.Add(std::move(item.finding));
+    }
+    AddCounts(report);
+    m_items.clear();
+    m_counts.clear();
+}
+
+FileFindings::Item* FileFindings::AddItem(const char* rule)
+{
+    if (++m_counts[rule] > m_scope.limit && m_scope.limit != 0)
+    {
+        return nullptr;
+    }
+    Item& item = m_items.emplace_back();
+    item.finding.rule = &RuleOf(rule);
+    item.finding.module = m_scope.module;
+    item.finding.set = m_scope.set;
+    item.finding.file = m_scope.path;
+    return &item;
+}
+
+void FileFindings::Locate(const char* text, const rapidjson::Value* document)
+{
+    std::vector<const rapidjson::Value*> values;
+    for (const Item& item : m_items)
+    {
+        if (item.value != nullptr)
+        {
+            values.push_back(item.value);
+        }
+    }
+    std::vector<ValuePlace> places;
+    if (!values.empty())
+    {
+        places = LocateValues(text, *document, values);
+    }
+    auto place = places.begin();
+    for (Item& item : m_items)
+    {
+        if (item.value != nullptr)
+        {
+            item.finding.place = *place++;
+        }
+        else if (item.offset)
+        {
+            item.finding.place = PlaceOfOffset(text, *item.offset);
+        }
+    }
+}
+
+void FileFindings::AddCounts(Report& report) const
+{
+    for (const auto& [id, count] : m_counts)
+    {
+        if (m_scope.limit == 0 || count <= m_scope.limit)
+        {
+            continue;
+        }
+        const std::size_t hidden = count - m_scope.limit;
+        Finding more;
+        more.rule = &RuleOf(id);
+        more.message = std::to_string(hidden) + " more of this rule; --limit=0 shows all";
+        more.module = m_scope.module;
+        more.set = m_scope.set;
+        more.file = m_scope.path;
+        report.Add(std::move(more));
+        report.Count(RuleOf(id), hidden - 1);
+    }
+}

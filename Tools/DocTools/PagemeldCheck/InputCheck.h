@@ -1,0 +1,46 @@
+#pragma once
+
+#include "Tools/DocTools/PagemeldCheck/FileFindings.h"
+#include "Tools/DocTools/PagemeldCheck/ScriptTexts.h"
+
+#include <set>
+#include <string>
+
+/// What became of an input file, and what the checks of a whole set need of it.
+struct InputFacts
+{
+    enum class State
+    {
+        Missing,
+        Unreadable,
+        Refused, ///< no JSON, or of another structure: pagemeld skips the module for it
+        Sound,
+    };
+
+    State state = State::Missing;
+
+    std::set<std::string> commonWords; ///< of a sound index
+
+    // Of a sound toc, as pagemeld compares them: up to the first NUL.
+    std::string rootLink;
+    std::string rootTitle;
+
+    [[nodiscard]] bool IsSound() const { return state == State::Sound; }
+};
+
+/// The two input files of a set.
+enum class InputKind
+{
+    Index,
+    Toc,
+};
+
+/// Reads the file of the scope, reports everything that is wrong inside it, and returns what became of it. A
+/// file that is missing or can't be read is left to the caller to report. moduleName is what messages call
+/// the module.
+InputFacts CheckInput(InputKind kind, const FileScope& scope, const std::string& moduleName,
+                      const TextChecks& checks, Report& report);
+
+/// Returns the places of the root's link and title of a toc.json that was sound when it was checked; nothing
+/// if it can't be read any more.
+std::vector<ValuePlace> LocateRoot(const std::string& path);

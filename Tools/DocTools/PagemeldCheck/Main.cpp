@@ -1,0 +1,85 @@
+#include "Tools/DocTools/PagemeldCheck/Options.h"
+#include "Tools/DocTools/PagemeldCheck/RootCheck.h"
+#include "Tools/DocTools/PagemeldCheck/SetCheck.h"
+#include "Tools/DocTools/PagemeldCheck/ShownText.h"
+#include "Tools/DocTools/VantorPagemeld/System/Messages.h"
+
+#include <cstdio>
+#include <cstdlib>
+
+#include <unistd.h>
+
+namespace
+{
+
+constexpr int kSound = 0;
+constexpr int kFaulty = 1;
+constexpr int kUnusable = 2;
+
+/// Prints a text on standard output. Returns the exit status.
+int Show(const std::string& text)
+{
+    (void)std::fputs(text.c_str(), stdout);
+    return std::fflush(stdout) == 0 ? kSound : kUnusable;
+}
+
+int Explain(const std::string& id)
+{
+    const std::optional<std::string> text = ExplainRule(id);
+    return text ? Show(*text) : kUnusable;
+}
+
+bool IsColored()
+{
+    const char* const noColor = std::getenv("NO_COLOR");
+    return ::isatty(STDOUT_FILENO) == 1 && (noColor == nullptr || *noColor == '\0');
+}
+
+int Check(const Options& options)
+{
+    Report report;
+    std::vector<std::string> roots = options.roots;
+    if (options.discover)
+    {
+        DiscoverRoots(*options.discover, roots, report);
+    }
+    CheckRoots(roots, report);
+    const SetChecks checks = {options.checksTargets, options.checksOutputs, options.limit,
+                              options.isJson ? SIZE_MAX : kLongText};
+    for (std::size_t set = 0; set < std::size(kSetNames); ++set)
+    {
+        CheckSet(set, roots, checks, report);
+    }
+    const ReportForm form = {options.isJson, options.showsErrorsOnly, !options.isJson && IsColored(),
+                             options.countsWarningsAsErrors};
+    report.Print(stdout, form, roots);
+    if (std::fflush(stdout) != 0 || std::ferror(stdout) != 0)
+    {
+        (void)std::fputs("pagemeld-check: standard output can't be written\n", stderr);
+        return kUnusable;
+    }
+    return report.HasErrors(form) ? kFaulty : kSound;
+}
+
+} // namespace
+
+int main(int argc, char* argv[])
+{
+    SecureStandardStreams();
+    const std::optional<Options> options = ParseOptions(argc, argv);
+    if (!options)
+    {
+        return kUnusable;
+    }
+    switch (options->action)
+    {
+    case Options::Action::Explain:
+        return Explain(options->ruleToExplain);
+    case Options::Action::ShowHelp:
+        return Show(HelpText());
+    case Options::Action::ShowVersion:
+        return Show("pagemeld-check " PAGEMELD_VERSION "\n");
+    default:
+        return Check(*options);
+    }
+}

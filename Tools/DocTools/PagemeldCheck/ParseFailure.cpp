@@ -1,0 +1,121 @@
+#include "Tools/DocTools/PagemeldCheck/ParseFailure.h"
+
+#include "Tools/DocTools/PagemeldCheck/ShownText.h"
+#include "Tools/DocTools/VantorPagemeld/Read/JsonReader.h"
+#include "Tools/DocTools/VantorPagemeld/Read/NumberGuard.h"
+
+#include <rapidjson/error/en.h>
+
+#include <cstring>
+
+namespace
+{
+
+constexpr const char* kWhiteSpace = " \t\r\n";
+
+bool BeginsWith(std::string_view text, std::string_view start)
+{
+    return text.substr(0, start.size()) == start;
+}
+
+/// Whether the last character before the offset, but for white space, is a comma.
+bool FollowsComma(std::string_view text, std::size_t offset)
+{
+    const std::size_t last = text.substr(0, offset).find_last_not_of(kWhiteSpace);
+    return last != std::string_view::npos && text[last] == ',';
+}
+
+/// Returns what is wrong with the file as a whole.
+std::string DescribeEncoding(std::string_view text, std::size_t size)
+{
+    if (BeginsWith(text, "\xFF\xFE") || BeginsWith(text, "\xFE\xFF") || (text.size() == 1 && size > 1))
+    {
+        return "the file is in UTF-16: save it as UTF-8";
+    }
+    if (BeginsWith(text, "\xEF\xBB\xBF"))
+    {
+        return "the file begins with a byte order mark: save it without";
+    }
+    if (text.find_first_not_of(kWhiteSpace) == std::string_view::npos)
+    {
+        return size == 0 ? "the file is empty" : "the file holds nothing but white space";
+    }
+    return "";
+}
+
+/// Returns which of the reader's limits the text exceeds at the offset.
+std::string DescribeLimit(std::string_view text, std::size_t offset)
+{
+    const char last = offset > 0 ? text[offset - 1] : '\0';
+    if (offset > 0 && (last == '[' || last == '{') && offset <= text.size())
+    {
+        return "nested deeper than " + std::to_string(kMaxNestingDepth) + " levels";
+    }
+    const char first = offset < text.size() ? text[offset] : '\0';
+    return std::strchr("-0123456789", first) != nullptr && first != '\0'
+               ? "a number is too large"
+               : "a string is longer than " + std::to_string(kMaxStringBytes) + " bytes";
+}
+
+/// Returns what the character at the offset tells of the cause, or an empty text.
+std::string DescribeCharacter(std::string_view text, std::size_t offset)
+{
+    const char c = offset < text.size() ? text[offset] : '\0';
+    switch (c)
+    {
+    case ']':
+    case '}':
+        return FollowsComma(text, offset) ? "there is a comma before the closing bracket" : "";
+    case '/':
+    case '#':
+        return "JSON has no comments";
+    case '\'':
+        return "strings need double quotes";
+    case '\\':
+        return "a backslash in a string must be doubled";
+    case '\n':
+    case '\r':
+        return "a line break in a string must be written as \\n";
+    case '\t':
+        return "a tab in a string must be written as \\t";
+    default:
+        return "";
+    }
+}
+
+std::string DescribeCause(std::string_view text, std::size_t size, const rapidjson::ParseResult& failure)
+{
+    std::string cause = DescribeEncoding(text, size);
+    if (!cause.empty())
+    {
+        return cause;
+    }
+    switch (failure.Code())
+    {
+    case rapidjson::kParseErrorTermination:
+        return DescribeLimit(text, failure.Offset());
+    case rapidjson::kParseErrorNumberTooBig:
+        return "a number is too large";
+    case rapidjson::kParseErrorDocumentRootNotSingular:
+        cause = DescribeCharacter(text, failure.Offset());
+        return cause.empty() ? "there is a second root after the first" : cause;
+    default:
+        return DescribeCharacter(text, failure.Offset());
+    }
+}
+
+} // namespace
+
+std::string DescribeParseFailure(std::string_view text, std::size_t size,
+                                 const rapidjson::ParseResult& failure)
+{
+    std::string cause = DescribeCause(text, size, failure);
+    if (cause.empty())
+    {
+        cause = rapidjson::GetParseError_En(failure.Code());
+        cause.erase(cause.find_last_not_of('.') + 1);
+    }
+    const std::string found = failure.Offset() < text.size() ? Quoted(text.substr(failure.Offset(), 12), 12)
+                                                             : "the end of the text";
+    return "no JSON: " + cause + "; refused at byte " + std::to_string(failure.Offset()) + ", at " + found;
+}

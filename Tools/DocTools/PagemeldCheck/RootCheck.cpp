@@ -1,0 +1,204 @@
+#include "Tools/DocTools/PagemeldCheck/RootCheck.h"
+
+#include "Tools/DocTools/PagemeldCheck/ShownText.h"
+#include "Tools/DocTools/PagemeldCheck/WebPath.h"
+#include "Tools/DocTools/VantorPagemeld/ModuleDiscovery.h"
+#include "Tools/DocTools/VantorPagemeld/ModulePath.h"
+#include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"
+
+#include <algorithm>
+#include <map>
+
+#include <sys/stat.h>
+
+namespace
+{
+
+Finding AtRoot(const char* rule, std::size_t module, const std::string& root, std::string message)
+{
+    Finding finding;
+    finding.rule = &RuleOf(rule);
+    finding.message = std::move(message);
+    finding.module = module;
+    finding.file = root;
+    return finding;
+}
+
+const char* DescribePassedOver(PassedOver reason)
+{
+    switch (reason)
+    {
+    case PassedOver::Link:
+        return "a link to a module is not followed: its pages will be missing";
+    case PassedOver::Hidden:
+        return "a hidden module is not taken: its pages will be missing";
+    default:
+        return "has ScriptReference/docdata but no Manual/docdata, so it is not taken: its pages will be "
+               "missing";
+    }
+}
+
+void ReportDuplicates(const std::vector<std::string>& roots, Report& report)
+{
+    std::map<std::pair<dev_t, ino_t>, std::size_t> known;
+    for (std::size_t i = 0; i < roots.size(); ++i)
+    {
+        struct stat status = {};
+        if (::stat(roots[i].c_str(), &status) != 0)
+        {
+            continue;
+        }
+        const auto [first, isNew] = known.try_emplace({status.st_dev, status.st_ino}, i);
+        if (!isNew)
+        {
+            report.Add(AtRoot("duplicate-root", i, roots[i],
+                              "is the same directory as " + Visible(roots[first->second]) +
+                                  ": its pages will be in the search twice"));
+        }
+    }
+}
+
+/// One root as the scripts and the web see it. Both sets give the same result; the links are those of Manual.
+struct RootPath
+{
+    explicit RootPath(const std::string& root) : module(root, kSetNames[0]), webPath(WebPathOf(module.Text()))
+    {
+    }
+
+    ModulePath module;
+    std::string webPath;
+};
+
+/// Where the links from a root lead, if it is not where they should.
+struct WrongLinks
+{
+    std::size_t first = 0; ///< the first root that is not reached
+    std::size_t count = 0;
+    std::string reached; ///< instead of the first; empty if it is no directory at all
+};
+
+WrongLinks FindWrongLinks(const std::vector<RootPath>& paths, std::size_t from)
+{
+    WrongLinks wrong;
+    for (std::size_t to = 0; to < paths.size(); ++to)
+    {
+        const std::string prefix = RelativePrefix(paths[from].module.Text(), paths[to].module.AsLinkTarget());
+        const std::optional<std::string> reached = FollowLink(paths[from].module.Text(), prefix);
+        if (to == from || reached == paths[to].webPath)
+        {
+            continue;
+        }
+        if (wrong.count++ == 0)
+        {
+            wrong.first = to;
+            wrong.reached = reached.value_or("");
+        }
+    }
+    return wrong;
+}
+
+/// Returns a web path as people write it: without "./" before it and "/" after it.
+std::string AsTyped(std::string_view webPath)
+{
+    if (webPath.substr(0, 2) == "./")
+    {
+        webPath.remove_prefix(2);
+    }
+    return Visible(webPath.substr(0, webPath.find_last_not_of('/') + 1));
+}
+
+bool EndsInSlash(const std::string& root)
+{
+    return !root.empty() && root.back() == '/';
+}
+
+/// Whether one name begins with the other, apart from being in the same directory.
+bool ShareBeginning(const std::string& a, const std::string& b)
+{
+    const std::size_t length = std::min(a.size(), b.size());
+    return a.compare(0, length, b, 0, length) == 0;
+}
+
+std::string Remedy(const std::string& from, const std::string& to)
+{
+    if (EndsInSlash(from) || EndsInSlash(to))
+    {
+        return "give the roots without a slash at the end";
+    }
+    if (ShareBeginning(from, to))
+    {
+        return "one name begins with the other: rename one";
+    }
+    return from[0] == '/' && to[0] == '/' ? "rename the directory" : "give absolute paths";
+}
+
+std::string DescribeWrongLinks(const std::vector<std::string>& roots, std::size_t from,
+                               const WrongLinks& wrong)
+{
+    const std::string& to = roots[wrong.first];
+    const std::string others = wrong.count > 1 ? " and " + std::to_string(wrong.count - 1) + " more" : "";
+    const std::string lead =
+        wrong.reached.empty() ? " will lead elsewhere" : " will lead to " + AsTyped(wrong.reached);
+    return "links to " + Visible(to) + others + lead + ": " + Remedy(roots[from], to);
+}
+
+/// Returns the first root in whose scripts the prefix to another one breaks the string, or nothing.
+std::optional<std::size_t> FindUnnamable(const std::vector<RootPath>& paths, std::size_t to)
+{
+    for (std::size_t from = 0; from < paths.size(); ++from)
+    {
+        const std::string prefix = RelativePrefix(paths[from].module.Text(), paths[to].module.AsLinkTarget());
+        if (prefix.find_first_of("\"\\\n\r") != std::string::npos)
+        {
+            return from;
+        }
+    }
+    return std::nullopt;
+}
+
+} // namespace
+
+void DiscoverRoots(const std::string& directory, std::vector<std::string>& roots, Report& report)
+{
+    std::string converted = directory;
+    std::replace(converted.begin(), converted.end(), '\\', '/');
+    std::list<std::string> found;
+    FindModules(converted, found,
+                [&](const std::string& path, PassedOver reason)
+                {
+                    Finding finding;
+                    finding.rule = &RuleOf("passed-over");
+                    finding.message = DescribePassedOver(reason);
+                    finding.file = path;
+                    report.Add(std::move(finding));
+                });
+    roots.assign(found.begin(), found.end());
+    if (roots.empty())
+    {
+        Finding finding;
+        finding.rule = &RuleOf("no-modules");
+        finding.message = "no directory below it has Manual/docdata: nothing will be combined";
+        finding.file = directory;
+        report.Add(std::move(finding));
+    }
+}
+
+void CheckRoots(const std::vector<std::string>& roots, Report& report)
+{
+    ReportDuplicates(roots, report);
+    const std::vector<RootPath> paths(roots.begin(), roots.end());
+    for (std::size_t i = 0; i < roots.size(); ++i)
+    {
+        if (const std::optional<std::size_t> from = FindUnnamable(paths, i))
+        {
+            report.Add(AtRoot("wrong-link-path", i, roots[i],
+                              "a quote, backslash or line break in the path breaks both scripts of " +
+                                  Visible(roots[*from]) + ": rename the directory"));
+        }
+        const WrongLinks wrong = FindWrongLinks(paths, i);
+        if (wrong.count > 0)
+        {
+            report.Add(AtRoot("wrong-link-path", i, roots[i], DescribeWrongLinks(roots, i, wrong)));
+        }
+    }
+}

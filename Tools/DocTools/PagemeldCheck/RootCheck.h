@@ -1,0 +1,13 @@
+#pragma once
+
+#include "Tools/DocTools/PagemeldCheck/Report.h"
+
+#include <string>
+#include <vector>
+
+/// Appends the modules that "pagemeld -autopaths DIRECTORY" would take to roots, and reports what it passes
+/// over, or that there are none.
+void DiscoverRoots(const std::string& directory, std::vector<std::string>& roots, Report& report);
+
+/// Reports roots that are the same directory, and roots whose links to others lead astray.
+void CheckRoots(const std::vector<std::string>& roots, Report& report);

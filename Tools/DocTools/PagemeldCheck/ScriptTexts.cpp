@@ -1,0 +1,230 @@
+#include "Tools/DocTools/PagemeldCheck/ScriptTexts.h"
+
+#include "Tools/DocTools/PagemeldCheck/ScriptLiteral.h"
+#include "Tools/DocTools/PagemeldCheck/ShownText.h"
+#include "Tools/DocTools/PagemeldCheck/WebPath.h"
+#include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
+#include "Tools/DocTools/VantorPagemeld/Render/TextBuffer.h"
+
+#include <sys/stat.h>
+
+namespace
+{
+
+using rapidjson::Value;
+
+/// How the scripts hold a text.
+enum class TextKind
+{
+    Title,
+    Path,
+};
+
+bool IsFile(const std::string& path)
+{
+    struct stat status = {};
+    return ::stat(path.c_str(), &status) == 0 && !S_ISDIR(status.st_mode);
+}
+
+int HexValue(char digit)
+{
+    const std::string_view digits = "0123456789abcdef";
+    const auto lower = static_cast<char>(digit >= 'A' && digit <= 'F' ? digit + ('a' - 'A') : digit);
+    const std::size_t value = digits.find(lower);
+    return value == std::string_view::npos ? -1 : static_cast<int>(value);
+}
+
+std::string PercentDecoded(std::string_view path)
+{
+    std::string decoded;
+    for (std::size_t i = 0; i < path.size(); ++i)
+    {
+        const int high = path[i] == '%' && i + 2 < path.size() ? HexValue(path[i + 1]) : -1;
+        const int low = high >= 0 ? HexValue(path[i + 2]) : -1;
+        decoded += low >= 0 ? static_cast<char>(high * 16 + low) : path[i];
+        i += low >= 0 ? 2 : 0;
+    }
+    return decoded;
+}
+
+/// Whether a link leads to a file below the directory: as it is, without what begins with "#" or "?", or
+/// percent-decoded.
+bool LeadsToFile(const std::string& directory, const std::string& link)
+{
+    const std::string path = link.substr(0, link.find('#'));
+    const std::string withoutQuery = path.substr(0, path.find('?'));
+    return IsFile(directory + "/" + link) || IsFile(directory + "/" + path) ||
+           IsFile(directory + "/" + withoutQuery) || IsFile(directory + "/" + PercentDecoded(withoutQuery));
+}
+
+/// Whether the link is an address of its own. "std::list.html" is a file.
+bool IsAddress(std::string_view link)
+{
+    return HasScheme(link) && link.substr(link.find(':'), 2) != "::";
+}
+
+/// Looks at the texts of one file.
+class TextCheck
+{
+public:
+    TextCheck(const char* script, const TextChecks& checks, FileFindings& findings)
+        : m_script(script), m_checks(checks), m_findings(findings)
+    {
+    }
+
+    /// pagePath is that of the page whose title this is; null for other texts.
+    void CheckText(TextKind kind, const char* name, const Value& text, const JsonPointer& pointer,
+                   const Value* pagePath = nullptr)
+    {
+        if (!NeedsLook(kind, BytesOf(text)))
+        {
+            return;
+        }
+        const std::optional<std::string> value = ValueOfScriptLiteral(LiteralOf(kind, text));
+        const auto named = [&]
+        {
+            return std::string(name) + " " + Quote(BytesOf(text)) +
+                   (pagePath == nullptr ? "" : " of page " + Quote(BytesOf(*pagePath)));
+        };
+        if (!value)
+        {
+            m_findings.AddAtValue("script-broken", text, pointer,
+                                  [&] { return named() + " breaks " + m_script + " in every module"; });
+        }
+        else if (*value != BytesOf(text))
+        {
+            m_findings.AddAtValue("script-altered", text, pointer,
+                                  [&] { return named() + " is " + Quote(*value) + " in " + m_script; });
+        }
+    }
+
+    /// A page path, or a link below the root, which the scripts put a prefix before.
+    void CheckLink(const char* name, const Value& link, const JsonPointer& pointer)
+    {
+        CheckText(TextKind::Path, name, link, pointer);
+        if (IsAddress(BytesOf(link)))
+        {
+            m_findings.AddAtValue("prefixed-url", link, pointer,
+                                  [&]
+                                  {
+                                      return std::string(name) + " " + Quote(BytesOf(link)) +
+                                             " gets the module's prefix, and is dead without the page script";
+                                  });
+        }
+        else
+        {
+            CheckTarget(name, link, pointer);
+        }
+    }
+
+    void CheckTarget(const char* name, const Value& link, const JsonPointer& pointer)
+    {
+        if (m_checks.checksTargets && !IsAddress(BytesOf(link)) &&
+            !LeadsToFile(m_checks.setDirectory, CStringOf(link)))
+        {
+            m_findings.AddAtValue(
+                "missing-target", link, pointer,
+                [&] { return std::string(name) + " " + Quote(BytesOf(link)) + " leads to no file"; });
+        }
+    }
+
+    void CheckNames(const Value& object, const char* kind, const JsonPointer& pointer)
+    {
+        for (const auto& member : object.GetObject())
+        {
+            if (BytesOf(member.name) == "__proto__")
+            {
+                m_findings.AddAtValue(
+                    "special-term", member.value, {pointer, BytesOf(member.name)},
+                    [&] {
+                        return std::string(kind) +
+                               " \"__proto__\" sets a prototype in the scripts: readers do not find it";
+                    });
+            }
+        }
+    }
+
+    [[nodiscard]] std::string Quote(std::string_view text) const
+    {
+        return Quoted(text, m_findings.Scope().quoteSize);
+    }
+
+private:
+    /// Cheap pre-check, false for nearly all texts.
+    static bool NeedsLook(TextKind kind, std::string_view text)
+    {
+        constexpr std::string_view kSpecial("\\\n\r\0\"", 5);
+        return text.find_first_of(kSpecial.substr(0, kind == TextKind::Title ? 4 : 5)) !=
+               std::string_view::npos;
+    }
+
+    static std::string LiteralOf(TextKind kind, const Value& text)
+    {
+        TextBuffer literal;
+        (kind == TextKind::Title ? AppendTitleLiteral : AppendPathLiteral)(literal, CStringOf(text));
+        return std::string(TextOf(literal));
+    }
+
+    const char* m_script;
+    const TextChecks& m_checks;
+    FileFindings& m_findings;
+};
+
+void CheckNodes(TextCheck& check, const Value& children, const JsonPointer& pointer);
+
+void CheckNode(TextCheck& check, const Value& node, const JsonPointer& pointer)
+{
+    const Value& link = *FindMember(node, "link");
+    check.CheckText(TextKind::Title, "title", *FindMember(node, "title"), {pointer, "title"});
+    if (std::string_view(CStringOf(link)) != "null")
+    {
+        check.CheckLink("link", link, {pointer, "link"});
+    }
+    else
+    {
+        check.CheckText(TextKind::Path, "link", link, {pointer, "link"}); // a NUL cuts "null\0x" to "null"
+    }
+    CheckNodes(check, *FindMember(node, "children"), {pointer, "children"});
+}
+
+void CheckNodes(TextCheck& check, const Value& children, const JsonPointer& pointer)
+{
+    for (rapidjson::SizeType i = 0; children.IsArray() && i < children.Size(); ++i)
+    {
+        CheckNode(check, children[i], {pointer, i});
+    }
+}
+
+} // namespace
+
+void CheckIndexTexts(const Value& index, const TextChecks& checks, FileFindings& findings)
+{
+    TextCheck check("global_index.js", checks, findings);
+    const JsonPointer root;
+    const JsonPointer pagesPointer(root, "pages");
+    const Value& pages = *FindMember(index, "pages");
+    for (rapidjson::SizeType i = 0; i < pages.Size(); ++i)
+    {
+        const JsonPointer page(pagesPointer, i);
+        const Value& path = pages[i][0];
+        check.CheckLink("page path", path, {page, 0U});
+        check.CheckText(TextKind::Title, "title", pages[i][1], {page, 1U}, &path);
+    }
+    check.CheckNames(*FindMember(index, "common"), "common word", {root, "common"});
+    check.CheckNames(*FindMember(index, "searchIndex"), "term", {root, "searchIndex"});
+}
+
+void CheckTocTexts(const Value& toc, const TextChecks& checks, FileFindings& findings)
+{
+    TextCheck check("global_toc.js", checks, findings);
+    const JsonPointer root;
+    const Value& link = *FindMember(toc, "link");
+    // The root's link is escaped as a title is, and gets no prefix.
+    check.CheckText(TextKind::Title, "title", *FindMember(toc, "title"), {root, "title"});
+    check.CheckText(TextKind::Title, "link", link, {root, "link"});
+    if (std::string_view(CStringOf(link)) != "null")
+    {
+        check.CheckTarget("link", link, {root, "link"});
+    }
+    CheckNodes(check, *FindMember(toc, "children"), {root, "children"});
+}

@@ -1,0 +1,169 @@
+#include "Tools/DocTools/PagemeldCheck/ShownText.h"
+
+#include <cstdint>
+#include <cstring>
+
+namespace
+{
+
+constexpr std::size_t kNone = std::string_view::npos;
+
+/// Returns how many of the bytes at the start of text are ASCII. Takes eight at a time.
+std::size_t CountAscii(std::string_view text)
+{
+    std::size_t count = 0;
+    for (std::uint64_t word = 0; text.size() - count >= sizeof word; count += sizeof word)
+    {
+        std::memcpy(&word, text.data() + count, sizeof word);
+        if ((word & 0x8080808080808080U) != 0)
+        {
+            break;
+        }
+    }
+    while (count < text.size() && static_cast<unsigned char>(text[count]) < 0x80)
+    {
+        ++count;
+    }
+    return count;
+}
+
+struct Character
+{
+    std::uint32_t code = 0;
+    std::size_t length = 0; ///< in bytes; 0 if there is no well-formed one
+};
+
+Character ReadCharacter(std::string_view text)
+{
+    const auto lead = static_cast<unsigned char>(text.front());
+    if (lead < 0x80)
+    {
+        return {lead, 1};
+    }
+    const std::size_t length = lead >= 0xF0 ? 4 : lead >= 0xE0 ? 3 : 2;
+    if (lead < 0xC2 || lead > 0xF4 || text.size() < length)
+    {
+        return {};
+    }
+    std::uint32_t code = lead & (0x7FU >> length);
+    for (std::size_t i = 1; i < length; ++i)
+    {
+        const auto next = static_cast<unsigned char>(text[i]);
+        if ((next & 0xC0U) != 0x80)
+        {
+            return {};
+        }
+        code = code << 6 | (next & 0x3FU);
+    }
+    constexpr std::uint32_t kSmallest[] = {0, 0, 0x80, 0x800, 0x10000};
+    const bool isSurrogate = code >= 0xD800 && code <= 0xDFFF;
+    return code < kSmallest[length] || isSurrogate || code > 0x10FFFF ? Character{} : Character{code, length};
+}
+
+bool IsUnsafe(std::uint32_t code)
+{
+    return code < 0x20 || (code >= 0x7F && code <= 0x9F) || (code >= 0x200E && code <= 0x200F) ||
+           (code >= 0x2028 && code <= 0x202E) || (code >= 0x2066 && code <= 0x2069);
+}
+
+/// Returns an escape: the prefix, then the code in as many upper-case hexadecimal digits.
+std::string HexEscape(const char* prefix, std::uint32_t code, unsigned digits)
+{
+    std::string escape = prefix;
+    for (unsigned shift = 4 * digits; shift > 0;)
+    {
+        shift -= 4;
+        escape += "0123456789ABCDEF"[code >> shift & 0xFU];
+    }
+    return escape;
+}
+
+std::string EscapeOf(std::uint32_t code)
+{
+    switch (code)
+    {
+    case '\n':
+        return "\\n";
+    case '\r':
+        return "\\r";
+    case '\t':
+        return "\\t";
+    default:
+        return code < 0x80 ? HexEscape("\\x", code, 2) : HexEscape("\\u", code, 4);
+    }
+}
+
+/// Appends the first character of text in its visible form. Returns how many bytes it has.
+std::size_t AppendVisible(std::string& visible, std::string_view text)
+{
+    const Character character = ReadCharacter(text);
+    if (character.length == 0)
+    {
+        visible += HexEscape("\\x", static_cast<unsigned char>(text.front()), 2);
+        return 1;
+    }
+    if (IsUnsafe(character.code))
+    {
+        visible += EscapeOf(character.code);
+    }
+    else
+    {
+        visible += text.substr(0, character.length);
+    }
+    return character.length;
+}
+
+} // namespace
+
+std::size_t FindInvalidUtf8(std::string_view text)
+{
+    for (std::size_t i = CountAscii(text); i < text.size(); i += CountAscii(text.substr(i)))
+    {
+        const std::size_t length = ReadCharacter(text.substr(i)).length;
+        if (length == 0)
+        {
+            return i;
+        }
+        i += length;
+    }
+    return kNone;
+}
+
+std::string Visible(std::string_view text)
+{
+    std::string visible;
+    for (std::size_t i = 0; i < text.size();)
+    {
+        i += AppendVisible(visible, text.substr(i));
+    }
+    return visible;
+}
+
+std::string Quoted(std::string_view text, std::size_t maxBytes)
+{
+    std::string quoted = "\"";
+    for (std::size_t i = 0; i < text.size();)
+    {
+        if (quoted.size() > maxBytes)
+        {
+            return quoted + "\"...";
+        }
+        if (text[i] == '"' || text[i] == '\\')
+        {
+            quoted += '\\';
+        }
+        i += AppendVisible(quoted, text.substr(i));
+    }
+    return quoted + "\"";
+}
+
+std::string NameOfRoot(std::string_view root)
+{
+    const std::size_t last = root.find_last_not_of('/');
+    if (last == kNone)
+    {
+        return std::string(root);
+    }
+    const std::string_view path = root.substr(0, last + 1);
+    return std::string(path.substr(path.rfind('/') + 1));
+}

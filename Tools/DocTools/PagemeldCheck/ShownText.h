@@ -1,0 +1,26 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+
+// Texts of input files and names on disk come from strangers. They are shown so that they can neither change
+// the terminal nor pass for something else.
+
+/// The length at which long texts are cut in the lines for people.
+constexpr std::size_t kLongText = 80;
+
+/// Returns the position of the first byte that is no UTF-8, or npos. Surrogates and forms that are too long
+/// are none.
+std::size_t FindInvalidUtf8(std::string_view text);
+
+/// Returns text with control characters, marks that reverse the direction of text and bytes that are no UTF-8
+/// as escapes: "\n", "\x1B", "\xE9", "\u202E". All else stays as it is.
+std::string Visible(std::string_view text);
+
+/// Returns text in double quotes, visible and with a backslash before quotes and backslashes. One of more
+/// than maxBytes ends there, at a character, with "..." after it.
+std::string Quoted(std::string_view text, std::size_t maxBytes);
+
+/// Returns the path without the slashes at its end and all before its last name: "docs/charts/" is "charts".
+std::string NameOfRoot(std::string_view root);
