@@ -49,7 +49,7 @@ bool IsLowSurrogate(std::uint32_t codePoint)
     return codePoint >= 0xDC00 && codePoint <= 0xDFFF;
 }
 
-/// Reads what stands between the quotes of a literal.
+/// Reads what is between the quotes of a literal.
 class LiteralBody
 {
 public:
@@ -156,7 +156,7 @@ private:
                TakeIf("\xE2\x80\xA9");
     }
 
-    /// Any other character stands for a control character or for itself. Of one that has several bytes this
+    /// Any other character means a control character or itself. Of one that has several bytes this
     /// takes the first; the others follow as ordinary text.
     void TakeCharacter()
     {

@@ -20,7 +20,7 @@ using rapidjson::SizeType;
 using rapidjson::Value;
 
 /// A value asked for, by its number in document order.
-struct WantedValue
+struct SoughtValue
 {
     std::size_t number;
     ValuePlace* place;
@@ -68,9 +68,9 @@ void VisitValues(const Value& document, const Visit& visit)
 using PlaceTable = std::unordered_map<const Value*, ValuePlace>;
 
 /// Returns the values of the table in document order.
-std::vector<WantedValue> NumberValues(const Value& document, PlaceTable& places)
+std::vector<SoughtValue> NumberValues(const Value& document, PlaceTable& places)
 {
-    std::vector<WantedValue> wanted;
+    std::vector<SoughtValue> sought;
     std::size_t number = 0;
     VisitValues(document,
                 [&](const Value& value)
@@ -78,11 +78,11 @@ std::vector<WantedValue> NumberValues(const Value& document, PlaceTable& places)
                     const auto found = places.find(&value);
                     if (found != places.end())
                     {
-                        wanted.push_back({number, &found->second});
+                        sought.push_back({number, &found->second});
                     }
                     ++number;
                 });
-    return wanted;
+    return sought;
 }
 
 /// A string stream of which the library's reader makes no copy while it reads a token, so that a handler can
@@ -92,15 +92,15 @@ struct TrackedStream : rapidjson::StringStream
     explicit TrackedStream(const char* text) : rapidjson::StringStream(text) {}
 };
 
-/// Takes the events of a parse, notes where the wanted values begin, and ends the parse after the last.
+/// Takes the events of a parse, notes where the sought values begin, and ends the parse after the last.
 ///
 /// An event comes when its token has been read; for an opening bracket, before. Between the end of one token
 /// and the next value stand only white space, commas, colons and closing brackets.
 class PlaceFinder : public rapidjson::BaseReaderHandler<rapidjson::UTF8<>, PlaceFinder>
 {
 public:
-    PlaceFinder(const char* text, const TrackedStream& stream, const std::vector<WantedValue>& wanted)
-        : m_text(text), m_stream(stream), m_wanted(wanted)
+    PlaceFinder(const char* text, const TrackedStream& stream, const std::vector<SoughtValue>& sought)
+        : m_text(text), m_stream(stream), m_sought(sought)
     {
     }
 
@@ -109,11 +109,11 @@ public:
     {
         const std::size_t start = m_tokenEnd + std::strspn(m_text + m_tokenEnd, " \t\r\n,:]}");
         m_tokenEnd = std::max(m_stream.Tell(), start + 1);
-        if (m_wanted[m_foundCount].number == m_number++)
+        if (m_sought[m_foundCount].number == m_number++)
         {
-            m_wanted[m_foundCount++].place->offset = start;
+            m_sought[m_foundCount++].place->offset = start;
         }
-        return m_foundCount < m_wanted.size();
+        return m_foundCount < m_sought.size();
     }
 
     bool Key(const char*, SizeType, bool)
@@ -128,18 +128,18 @@ public:
 private:
     const char* m_text;
     const TrackedStream& m_stream;
-    const std::vector<WantedValue>& m_wanted;
+    const std::vector<SoughtValue>& m_sought;
     std::size_t m_foundCount = 0;
     std::size_t m_number = 0; ///< of the next value
     std::size_t m_tokenEnd = 0;
 };
 
-void FindOffsets(const char* text, const std::vector<WantedValue>& wanted)
+void FindOffsets(const char* text, const std::vector<SoughtValue>& sought)
 {
     // Numbers as strings, because the library's conversion can't take all that ParseJson accepts.
     constexpr unsigned kFlags = rapidjson::kParseIterativeFlag | rapidjson::kParseNumbersAsStringsFlag;
     TrackedStream stream(text);
-    PlaceFinder finder(text, stream, wanted);
+    PlaceFinder finder(text, stream, sought);
     rapidjson::Reader().Parse<kFlags>(stream, finder);
 }
 
@@ -163,13 +163,13 @@ std::vector<ValuePlace> LocateValues(const char* text, const Value& document,
     {
         placeOf.try_emplace(value);
     }
-    const std::vector<WantedValue> wanted = NumberValues(document, placeOf);
-    if (!wanted.empty())
+    const std::vector<SoughtValue> sought = NumberValues(document, placeOf);
+    if (!sought.empty())
     {
-        FindOffsets(text, wanted);
+        FindOffsets(text, sought);
     }
     ValuePlace reached;
-    for (const WantedValue& value : wanted)
+    for (const SoughtValue& value : sought)
     {
         MoveTo(reached, text, value.place->offset);
         *value.place = reached;

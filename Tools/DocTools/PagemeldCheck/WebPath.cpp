@@ -60,7 +60,7 @@ std::string Encoded(std::string_view path)
     return encoded;
 }
 
-/// A "%" that two hexadecimal digits don't follow stands for itself.
+/// A "%" that two hexadecimal digits don't follow is itself.
 std::string Decoded(std::string_view path)
 {
     std::string decoded;
