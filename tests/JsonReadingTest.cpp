@@ -84,7 +84,7 @@ TEST(JsonReading, AcceptsOneRootOrNamesTheOffset)
     }
 }
 
-TEST(JsonReading, WarnsOfWhatHasNoTextToRead)
+TEST(JsonReading, WarnsAboutFilesThatCannotBeReadWhole)
 {
     const TemporaryFolder folder;
     std::filesystem::create_directory(folder / "folder");
@@ -98,7 +98,7 @@ TEST(JsonReading, WarnsOfWhatHasNoTextToRead)
     EXPECT_EQ(unread + "-1, got 0 bytes\n", Read(folder / "pipe", document));
     EXPECT_EQ(unread + "5, got 0 bytes\n", Read(folder / "huge", document)); // in 32 bits
     EXPECT_EQ(unread + "-1, got 0 bytes\n", Read(folder / "folder", document));
-    EXPECT_EQ(unread + "-1, got 0 bytes\n", Read("/proc", document)); // a folder of size 0
+    EXPECT_EQ(unread + "-1, got 0 bytes\n", Read("/proc", document)); // a directory of size 0
     EXPECT_EQ("[1]", RapidJsonIoUtil::OutputJsonValueToString(document))
         << "an unread file leaves the document alone";
 }

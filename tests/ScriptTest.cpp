@@ -97,7 +97,7 @@ TEST(TocScript, LayoutOptionsAddSpacesAndLineBreaks)
               TocScript(toc, {false, true}));
 }
 
-TEST(ScriptWriting, PiecesOfATocTellOfAFailedWrite)
+TEST(ScriptWriting, FailedWritesOfPiecesOfATocAreReported)
 {
     TocCombiner toc;
     const rapidjson::Document node = ParsedJson(R"({"link":"a","title":"A","children":[],"module":1})");

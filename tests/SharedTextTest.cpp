@@ -78,7 +78,7 @@ int Clone(int file, unsigned long request, int original)
     return 0;
 }
 
-TEST(SharedText, EveryFileIsWholeAndAsManyAsCanBeAreClones)
+TEST(SharedText, EveryFileIsWholeAndACloneWherePossible)
 {
     constexpr std::size_t kSize = (std::size_t{1} << 20) + 1;
     const struct

@@ -50,7 +50,7 @@ TEST(WriteFault, FileSizeLimitAtAnyByteLeavesWholeScripts)
     }
 }
 
-TEST(WriteFault, ObstaclesLeaveWhatTheyMust)
+TEST(WriteFault, ObstaclesHaveTheirDocumentedOutcome)
 {
     using Prepare = void (*)(const std::string& path);
     const Prepare putFolder = [](const std::string& path)
