@@ -4,21 +4,6 @@
 
 #include <gtest/gtest.h>
 
-TEST(ArrayRecycler, KeepTheElementsInTheirOrder)
-{
-    rapidjson::Document lists = ParsedJson(R"([[],[],[1],[],["text that is not short",[2]],[{"a":3},4,5]])");
-    ArrayRecycler recycler;
-    for (rapidjson::Value& list : lists.GetArray())
-    {
-        if (&list != lists.Begin())
-        {
-            recycler.MoveElements(lists[0], list, lists.GetAllocator());
-        }
-    }
-    EXPECT_EQ(R"([[1,"text that is not short",[2],{"a":3},4,5],null,null,null,null,null])",
-              RapidJsonIoUtil::OutputJsonValueToString(lists));
-}
-
 TEST(ArrayRecycler, ListsGrowIntoStorageThatOthersLeft)
 {
     rapidjson::Document lists =
