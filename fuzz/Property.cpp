@@ -7,6 +7,7 @@
 #include <cmath>
 #include <cstdio>
 #include <cstdlib>
+#include <string_view>
 
 namespace
 {
@@ -70,7 +71,7 @@ void RequireReadsBack(const rapidjson::Value& value, const char* written)
 std::vector<std::string> SplitInput(const std::uint8_t* data, std::size_t size)
 {
     std::vector<std::string> texts(1);
-    for (const char c : InputText(data, size))
+    for (const char c : std::string_view(reinterpret_cast<const char*>(data), size))
     {
         if (c == '\0')
         {

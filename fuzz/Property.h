@@ -5,7 +5,6 @@
 #include <cstddef>
 #include <cstdint>
 #include <string>
-#include <string_view>
 #include <vector>
 
 // What the fuzz targets have in common: inputs made of several texts, and checks that end the process.
@@ -25,9 +24,3 @@ void RequireReadsBack(const rapidjson::Value& value, const char* written);
 
 /// Returns the texts that a fuzzer's input holds, each up to a NUL byte. There is always one.
 std::vector<std::string> SplitInput(const std::uint8_t* data, std::size_t size);
-
-/// Returns the bytes as a text.
-inline std::string_view InputText(const std::uint8_t* data, std::size_t size)
-{
-    return {reinterpret_cast<const char*>(data), size};
-}

@@ -4,7 +4,7 @@
 #include "fuzz/MergeProperty.h"
 #include "tests/support/PlainMerge.h"
 
-// Search indexes that pass the structure check merge as a plain linear merge has it, and what is written of
+// Search indexes that pass the structure check merge as in a plain linear merge, and what is written of
 // the merged one reads back equal. The first module is a fixed one.
 
 namespace

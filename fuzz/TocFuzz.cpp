@@ -3,7 +3,7 @@
 #include "fuzz/MergeProperty.h"
 #include "tests/support/PlainMerge.h"
 
-// Tables of contents that pass the structure check merge as a plain linear merge has it, and what is written
+// Tables of contents that pass the structure check merge as in a plain linear merge, and what is written
 // of the merged one reads back equal.
 
 namespace

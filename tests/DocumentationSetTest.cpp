@@ -6,7 +6,7 @@
 
 #include <filesystem>
 
-// Texts say @ for the temporary folder.
+// In the texts, @ is the temporary directory.
 
 namespace
 {

@@ -44,7 +44,7 @@ TEST(Environment, OutputsNeverTakeTheDescriptorsOfMessages)
     }
 }
 
-TEST(Environment, StandardErrorThatNobodyReadsCostsNoOutput)
+TEST(Environment, UnreadStandardErrorLosesNoOutput)
 {
     const ExampleDocs docs;
     int ends[2] = {};

@@ -130,11 +130,12 @@ TEST(IndexCombiner, MergesIntoWhatItsCallerChanged)
 {
     const char* const module = R"({"pages":[],"info":[],"common":{},"searchIndex":{"a":[],"b":[1]}})";
     rapidjson::Document first = ParsedJson(module);
-    rapidjson::Document second = ParsedJson(module);
+    rapidjson::Document second =
+        ParsedJson(R"({"pages":[],"info":[],"common":{},"searchIndex":{"c":[2],"b":[1]}})");
     IndexCombiner combiner;
     combiner.AppendJsonDocument(first);
     combiner.combinedDocument["searchIndex"].MemberBegin()->name.SetString("c");
     combiner.AppendJsonDocument(second);
-    EXPECT_EQ(R"({"pages":[],"info":[],"common":{},"searchIndex":{"c":[],"b":[1,1],"a":[]}})",
+    EXPECT_EQ(R"({"pages":[],"info":[],"common":{},"searchIndex":{"c":[2],"b":[1,1]}})",
               RapidJsonIoUtil::OutputJsonValueToString(combiner.combinedDocument));
 }

@@ -84,7 +84,7 @@ TEST(JsonReading, AcceptsOneRootOrNamesTheOffset)
     }
 }
 
-TEST(JsonReading, WarnsOfWhatHasNoTextToRead)
+TEST(JsonReading, WarnsAboutFilesThatCannotBeReadWhole)
 {
     const TemporaryFolder folder;
     std::filesystem::create_directory(folder / "folder");
@@ -98,7 +98,7 @@ TEST(JsonReading, WarnsOfWhatHasNoTextToRead)
     EXPECT_EQ(unread + "-1, got 0 bytes\n", Read(folder / "pipe", document));
     EXPECT_EQ(unread + "5, got 0 bytes\n", Read(folder / "huge", document)); // in 32 bits
     EXPECT_EQ(unread + "-1, got 0 bytes\n", Read(folder / "folder", document));
-    EXPECT_EQ(unread + "-1, got 0 bytes\n", Read("/proc", document)); // a folder of size 0
+    EXPECT_EQ(unread + "-1, got 0 bytes\n", Read("/proc", document)); // a directory of size 0
     EXPECT_EQ("[1]", RapidJsonIoUtil::OutputJsonValueToString(document))
         << "an unread file leaves the document alone";
 }
@@ -132,6 +132,8 @@ TEST(JsonReading, DocumentCarriesTheErrorOfTheLastParse)
         {"[1,]", rapidjson::kParseErrorValueInvalid, 3},
         {"{\"a\":1,}", rapidjson::kParseErrorObjectMissName, 7},
         {"[1e400]", rapidjson::kParseErrorNumberTooBig, 1},
+        {"[0.00000000001e-2147483639,]", rapidjson::kParseErrorValueInvalid, 27},
+        {"[1.8e308]", rapidjson::kParseErrorDocumentEmpty, 1}, // our own limit; the code says nothing
         {"[1,2,\"x\"], oops", rapidjson::kParseErrorDocumentRootNotSingular, 9},
     };
     for (const auto& c : cases)

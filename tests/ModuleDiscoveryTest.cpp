@@ -38,8 +38,8 @@ TEST(ModuleDiscovery, WalksInByteOrderAndStopsAtModules)
     {
         text += ReplaceAll(path, folder.Path(), "@") + "\n";
     }
-    // The folder itself is no candidate, though it has a Manual/docdata; a linked docdata counts, and a
-    // socket, which has a folder's bit.
+    // The directory itself is no candidate, though it has a Manual/docdata; a linked docdata counts, and a
+    // socket, which has the directory bit.
     EXPECT_EQ("kept\n@//Zeta\n@//a\n@//b\n@//deep/er/m\n@//deep/er/m-1\n@//deep-er\n@//file/n\n@//linked\n"
               "@//socket\n@//x\n",
               text);

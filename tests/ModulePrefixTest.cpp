@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-TEST(RelativePrefix, ClimbsToTheCommonFolder)
+TEST(RelativePrefix, ClimbsToTheCommonDirectory)
 {
     const struct
     {

@@ -1,6 +1,5 @@
 #include "Tools/DocTools/VantorPagemeld/Write/SharedText.h"
 
-#include "tests/support/FullDevice.h"
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/WholeFile.h"
 
@@ -16,6 +15,9 @@
 #include <linux/fs.h>
 #endif
 
+#if defined(PAGEMELD_HAVE_FILE_CLONES) && defined(PAGEMELD_HAVE_LINKER_WRAP)
+// The linker redirects ioctl to the function here (--wrap), which clones on every file system.
+
 namespace
 {
 
@@ -25,27 +27,6 @@ TextBuffer BufferOf(const std::string& text)
     AppendText(buffer, text);
     return buffer;
 }
-
-} // namespace
-
-TEST(SharedText, IsWrittenOnlyIfEveryByteReachesTheDevice)
-{
-    const std::string head = "var p0 = \"\";\n";
-    const std::string text = "toc = {};\n";
-    for (std::size_t capacity = 0; capacity <= (head + text).size(); ++capacity)
-    {
-        FullDevice device(capacity);
-        SharedText shared(BufferOf(text));
-        EXPECT_EQ(capacity == (head + text).size(), shared.WriteTo(device.Take(), head)) << capacity;
-        EXPECT_EQ((head + text).substr(0, capacity), device.Arrived());
-    }
-}
-
-#if defined(PAGEMELD_HAVE_FILE_CLONES) && defined(PAGEMELD_HAVE_LINKER_WRAP)
-// The linker redirects ioctl to the function here (--wrap), which clones on every file system.
-
-namespace
-{
 
 int s_refusal = EOPNOTSUPP;            ///< the error that clones end with, or 0 for clones that succeed
 std::vector<std::size_t> s_cloneSizes; ///< of all clones that succeeded
@@ -78,7 +59,7 @@ int Clone(int file, unsigned long request, int original)
     return 0;
 }
 
-TEST(SharedText, EveryFileIsWholeAndAsManyAsCanBeAreClones)
+TEST(SharedText, EveryFileIsWholeAndACloneWherePossible)
 {
     constexpr std::size_t kSize = (std::size_t{1} << 20) + 1;
     const struct

@@ -28,7 +28,7 @@ public:
     }
 };
 
-/// What a combiner reports of a document, with "sound" or "refused" in front.
+/// What a combiner reports of a document, after "sound" or "refused".
 std::string Verify(JsonCombiner& combiner, const rapidjson::Value& document)
 {
     CapturedStderr captured;
@@ -110,8 +110,7 @@ TEST(IndexStructure, FirstFaultIsReportedAndEveryFaultIsFound)
          "396/searchIndex//1 396/searchIndex//2 396/searchIndex//3 401/searchIndex/a/1 "},
         {R"({"pages":[["a","b"]],"info":[["t",0]],"common":{},"searchIndex":{"a":[0,0,1,-1]}})",
          "401 Value in index is out of bounds", "401/searchIndex/a/2 401/searchIndex/a/3 "},
-        {R"({"pages":0,"info":[["t",5]],"common":{},"searchIndex":{"a":[0]}})", // no page numbers to hold it
-                                                                                // to
+        {R"({"pages":0,"info":[["t",5]],"common":{},"searchIndex":{"a":[0]}})", // no pages to refer to
          "290 Pages is not an array or absent", "290/pages "},
         {R"({"pages":[["A","A"]],"info":[["A text",0]],"common":{"a":1},"searchIndex":{"a":[1]}})",
          "401 Value in index is out of bounds", "401/searchIndex/a/0 "},

@@ -119,3 +119,16 @@ TEST(TocCombiner, PublicMergesAreRightForAnyValues)
         EXPECT_EQ(c.merged, RapidJsonIoUtil::OutputJsonValueToString(destination));
     }
 }
+
+TEST(TocCombiner, MergesIntoWhatItsCallerChanged)
+{
+    const char* const module =
+        R"({"link":"l","title":"t","children":[{"link":"a","title":"a","children":null}]})";
+    rapidjson::Document documents[] = {ParsedJson(module), ParsedJson(module), ParsedJson(module)};
+    TocCombiner combiner;
+    combiner.AppendJsonDocument(documents[0]);
+    combiner.AppendJsonDocument(documents[1]);
+    combiner.combinedDocument["children"].Clear();
+    combiner.AppendJsonDocument(documents[2]);
+    EXPECT_EQ(module, RapidJsonIoUtil::OutputJsonValueToString(combiner.combinedDocument));
+}

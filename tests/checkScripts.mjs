@@ -1,4 +1,4 @@
-// Loads the scripts of a docdata folder as a page does, and holds them against the JSON files next to them.
+// Loads the scripts of a docdata directory as a page does, and compares them with the JSON files next to them.
 
 import assert from 'node:assert/strict';
 import { readFileSync } from 'node:fs';

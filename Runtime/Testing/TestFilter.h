@@ -33,12 +33,11 @@ public:
     std::vector<DisabledTestInfo> ignoredTests;
 };
 
-/// Stands in for a test that was registered without a category: fails under its name, with a message that
-/// says so.
+/// Replaces a test that was registered without a category: fails under its name, with a message that says so.
 class NoCategoryTest : public UnitTest::Test
 {
 public:
-    /// Takes name, suite, file and line of the test that it stands in for; its own category is "Unit".
+    /// Takes name, suite, file and line of the test that it replaces; its own category is "Unit".
     explicit NoCategoryTest(const UnitTest::TestDetails& details);
 
     void RunImpl() const override;

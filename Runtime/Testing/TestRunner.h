@@ -31,7 +31,7 @@ public:
     bool currentTestFailed = false;
 };
 
-/// Runs tests one after another, and tells a reporter.
+/// Runs tests one after another, and reports each to a reporter.
 class TestRunner
 {
 public:

@@ -6,7 +6,7 @@
 #include <cstdlib>
 #include <string>
 
-/// Makes memory the console for as long as it lives.
+/// Captures what is printed on the console during its lifetime.
 class CapturedConsole
 {
 public:

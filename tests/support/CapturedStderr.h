@@ -5,7 +5,7 @@
 #include <string>
 #include <utility>
 
-/// Takes what is written to standard error, until it is asked for the text or dies.
+/// Takes what is written to standard error, until it is asked for the text or destroyed.
 class CapturedStderr
 {
 public:

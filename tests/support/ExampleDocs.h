@@ -7,20 +7,20 @@
 #include <vector>
 
 /// Two small modules, a and b, with the Manual set only, whose outputs are those of an earlier run. They lie
-/// in a folder that goes with this object.
+/// in a temporary directory that is removed with this object.
 class ExampleDocs
 {
 public:
     struct Output
     {
-        std::string path; ///< below the folder
+        std::string path; ///< below the directory
         bool isScript;
         std::string newBytes; ///< what an undisturbed run writes
     };
 
     ExampleDocs();
 
-    /// Returns the path of something below the folder.
+    /// Returns the path of something below the directory.
     [[nodiscard]] std::string operator/(const std::string& name) const { return m_folder / name; }
 
     /// Runs pagemeld over both modules; through a command that runs another one, if given.
@@ -35,7 +35,7 @@ public:
 
     /// Returns a letter for every output: "NNNN NNNN" after an undisturbed run.
     ///
-    /// N is the new file, O the earlier one, C a new one that was cut short, E an empty one, D a folder, -
+    /// N is the new file, O the earlier one, C a new one that was cut short, E an empty one, D a directory, -
     /// nothing, ? anything else. A temporary file that is left is in brackets after its output.
     [[nodiscard]] std::string Describe() const;
 

@@ -4,8 +4,8 @@
 
 #include <vector>
 
-/// Returns text with every occurrence of from replaced by to: paths that differ from run to run by a sign
-/// that is in a literal.
+/// Returns text with every occurrence of from replaced by to. It makes paths that differ from run to run
+/// comparable with a literal.
 inline std::string ReplaceAll(std::string text, const std::string& from, const std::string& to)
 {
     for (auto at = text.find(from); at != std::string::npos; at = text.find(from, at + to.size()))
@@ -15,7 +15,7 @@ inline std::string ReplaceAll(std::string text, const std::string& from, const s
     return text;
 }
 
-/// Returns a report with @ for the folder and # for the place of the sources in the tags of messages.
+/// Returns a report with @ for the directory and # for the place of the sources in the tags of messages.
 inline std::string Neutral(const std::string& report, const TemporaryFolder& folder)
 {
     return ReplaceAll(ReplaceAll(report, folder.Path(), "@"), "./Tools/DocTools/VantorPagemeld/", "#");

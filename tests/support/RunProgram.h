@@ -16,8 +16,8 @@ struct ProgramResult
 /// Runs a program, found on the search path unless it has a slash, to its end.
 ProgramResult RunProgram(const std::string& program, const std::vector<std::string>& arguments);
 
-/// Runs the built pagemeld to its end, with @ in its arguments standing for the folder.
+/// Runs the built pagemeld to its end, with the directory for @ in its arguments.
 ///
-/// Returns its standard output, its standard error and a line that reads "status 0", with @ for the folder
+/// Returns its standard output, its standard error and a line that reads "status 0", with @ for the directory
 /// and PROGRAM for its own path.
 std::string ReportOfRun(const TemporaryFolder& folder, const std::vector<std::string>& arguments);

@@ -4,7 +4,7 @@
 #include <filesystem>
 #include <string>
 
-/// A new empty folder that is removed, with all that it holds, at the end of this object's life.
+/// A new empty directory that is removed, with its contents, at the end of this object's life.
 class TemporaryFolder
 {
 public:
@@ -27,7 +27,7 @@ public:
 
     [[nodiscard]] const std::string& Path() const { return m_path; }
 
-    /// Returns the path of something below the folder.
+    /// Returns the path of something below the directory.
     [[nodiscard]] std::string operator/(const std::string& name) const { return m_path + "/" + name; }
 
 private:

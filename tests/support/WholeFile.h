@@ -13,14 +13,14 @@ inline std::string ReadWholeFile(const std::string& path)
     return file ? std::string(std::istreambuf_iterator<char>(file), {}) : "(no file " + path + ")";
 }
 
-/// Writes a file, and makes the folders above it that are missing.
+/// Writes a file, and makes the directories above it that are missing.
 inline void WriteWholeFile(const std::string& path, const std::string& bytes)
 {
     std::filesystem::create_directories(std::filesystem::path(path).parent_path());
     std::ofstream(path, std::ios::binary) << bytes;
 }
 
-/// Returns the content of every regular file below a folder, by its path relative to the folder.
+/// Returns the content of every regular file below a directory, by its path relative to that.
 inline std::map<std::string, std::string> ReadTree(const std::string& folder)
 {
     std::map<std::string, std::string> files;

@@ -40,7 +40,7 @@ public:
     void CombineSearchIndexJson(rapidjson::Value& combined, rapidjson::Value& input, int infoOffset);
 
 private:
-    /// What one merge leaves to the next: where the terms are, and arrays to reuse.
+    /// What one merge keeps for the next: where the terms are, and arrays to reuse.
     struct Merge
     {
         Merge(rapidjson::Value& searchIndex, LargeObjectPool& pool) : terms(searchIndex, pool) {}

@@ -14,7 +14,7 @@
 
 /// Merges one JSON file of every documentation module into one document.
 ///
-/// What the file holds is the business of the derived class. A combiner is created, combines once, is asked
+/// Only the derived class knows what the file holds. A combiner is created, combines once, is asked
 /// for its outputs and is destroyed; it is used by one thread.
 class JsonCombiner
 {
@@ -65,8 +65,8 @@ protected:
     /// Parses defaultJson into combinedDocument. Returns whether that succeeded.
     bool InitializeCombinedDocument();
 
-    /// Whether the document that is merged now follows another one within CombineJson. Then nobody else has
-    /// changed combinedDocument in between, and what the last merge learnt about it still holds.
+    /// Returns whether CombineJson has merged another document before the one that it merges now. Nothing has
+    /// changed combinedDocument since, so look-up tables of the last merge are still right.
     [[nodiscard]] bool ContinuesMerging() const { return m_continuesMerging; }
 
     std::map<int, std::string> modulePathTable;

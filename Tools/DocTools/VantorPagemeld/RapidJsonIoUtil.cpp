@@ -9,7 +9,7 @@ namespace
 
 constexpr Diagnostics kDiagnostics("./Tools/DocTools/VantorPagemeld/RapidJsonIoUtil");
 
-/// Returns the text of the file at path, or null after a warning when it can't be had.
+/// Returns the text of the file at path, or null after a warning when it can't be read.
 std::unique_ptr<char[]> ReadOrWarn(const char* path)
 {
     InputText text = ReadInputFile(path);

@@ -62,5 +62,5 @@ private:
     void AppendNode(SiblingIndexes& indexes, rapidjson::Value& destination, rapidjson::Value& source);
 
     TocScriptLayout m_layout;
-    SiblingIndexes m_siblings; ///< what one merge leaves to the next
+    SiblingIndexes m_siblings; ///< what one merge keeps for the next
 };

@@ -2,8 +2,8 @@
 
 #include <string>
 
-/// Checks that those of the four input files of a documentation root that exist, in its directory en,
-/// can be read and are JSON. Their structure is not checked, and a missing file is no error.
+/// Checks the four input files in the directory en of a documentation root: each that exists must be readable
+/// and JSON. Their structure is not checked, and a missing file is no error.
 ///
 /// Names on standard error each file that it skips or verifies. Returns false at the first file that fails.
 bool VerifyTocAndIndex(const std::string& rootDocPath);

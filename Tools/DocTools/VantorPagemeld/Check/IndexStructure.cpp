@@ -25,7 +25,7 @@ constexpr StructureFault kInfoNotPair = {340, "Content in info is not an array o
 constexpr StructureFault kInfoTextNotString = {345, "1st item in info sub-element is not a string"};
 constexpr StructureFault kInfoPageNotInt = {350, "2nd item in info sub-element is not an int"};
 constexpr StructureFault kInfoPageOutOfBounds = {356, "2nd item in info sub-element is out of bounds"};
-// Keys of parsed text are strings: 366 and 382 take a document that was made by hand.
+// Keys of parsed text are strings: 366 and 382 can only occur in a document that was made by hand.
 constexpr StructureFault kCommonKeyNotString = {366, "Key in common is not a string"};
 constexpr StructureFault kCommonValueNotOne = {371, "Value in common is not an int(1)"};
 constexpr StructureFault kTermNotString = {382, "Key in searchIndex is not string"};
@@ -33,7 +33,7 @@ constexpr StructureFault kTermNotArray = {387, "Value in searchIndex is not arra
 constexpr StructureFault kPostingNotInt = {396, "Value in index is not int"};
 constexpr StructureFault kPostingOutOfBounds = {401, "Value in index is out of bounds"};
 
-/// What a missing array counts as: no number is out of its bounds, since the array itself is the fault.
+/// The size that a missing array is given, so that numbers that refer to it are no further faults.
 constexpr std::int64_t kUnbounded = INT64_MAX;
 
 bool IsPair(const Value& entry)

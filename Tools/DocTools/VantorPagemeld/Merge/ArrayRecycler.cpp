@@ -7,7 +7,7 @@
 // are as many such lists as there are terms.
 //
 // So an array that is outgrown or emptied is kept, by the power of two that its capacity reaches, and the
-// next list that needs so much room takes it over. No memory is needed to keep it: its first element is the
+// next list that needs that much room takes it over. No memory is needed to keep it: its first element is the
 // array that was kept before it.
 
 namespace
@@ -80,7 +80,7 @@ void ArrayRecycler::Keep(Value& list, Allocator& allocator)
         list.SetNull();
         return;
     }
-    // A capacity of 2^n up to 2^(n+1) - 1 is enough for whoever needs 2^n.
+    // A capacity of 2^n up to 2^(n+1) - 1 is enough for a list that needs 2^n.
     Value& first = m_spares[BitLength(list.Capacity()) - 1];
     list.Clear();
     list.PushBack(first, allocator);

@@ -5,7 +5,7 @@
 #include <array>
 #include <cstddef>
 
-/// Joins JSON arrays, and reuses the storage of those that were outgrown or emptied for the next that grow.
+/// Joins JSON arrays, and reuses the storage of outgrown and emptied arrays for arrays that grow later.
 ///
 /// Storage from different documents is mixed: all documents must live as long as this object and any array
 /// that it joined.
@@ -23,7 +23,7 @@ private:
     [[nodiscard]] Value Take(std::size_t capacity, Allocator& allocator);
     void Keep(Value& list, Allocator& allocator);
 
-    /// By the power of two that their capacity reaches: null, or an array whose only element is the next
-    /// array of that kind, or null.
+    /// At n, the list of spare arrays with a capacity from 2^n to 2^(n+1) - 1: null, or an array whose only
+    /// element is the rest of that list.
     std::array<Value, 33> m_spares;
 };

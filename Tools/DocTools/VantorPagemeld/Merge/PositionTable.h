@@ -7,8 +7,8 @@
 /// Finds the position of a key in a list that is kept elsewhere, in expected constant time.
 ///
 /// An open-addressing table with linear probing that holds 32 bits of each hash and the position: eight bytes
-/// a slot, half of them free. What a key is and how it is compared stays with the owner of the list, who
-/// tells by `isEqual(position)` whether the key looked for is there.
+/// a slot, at least half of the slots free. Only the owner of the list knows the keys: its
+/// `isEqual(position)` returns whether the key looked for is the one at that position.
 class PositionTable
 {
 public:

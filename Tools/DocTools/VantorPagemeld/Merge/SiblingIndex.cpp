@@ -35,7 +35,7 @@ SiblingIndex::Sibling SiblingIndex::Describe(rapidjson::Value& entry)
     {
         return {};
     }
-    // Without the factor, a pair would share its hash with the pair of the same texts in the other order.
+    // Without the factor, an entry would share its hash with one whose link and title are swapped.
     const std::uint64_t hash = 31 * KeyedHash(CStringOf(*link)) + KeyedHash(CStringOf(*title));
     return {CStringOf(*link), CStringOf(*title), children, hash};
 }

@@ -7,8 +7,8 @@
 #include <cstdint>
 #include <vector>
 
-/// Finds the entries of one growing table-of-contents list by link and title in expected constant time: what
-/// a linear search over the list finds, the first entry with the same link and title as NUL-terminated text.
+/// Finds the entries of one growing table-of-contents list by link and title in expected constant time. Like
+/// a linear search, it finds the first entry with the same link and title as NUL-terminated text.
 ///
 /// Entries without a link or a title are never found. The list must live as long as the index, nobody else
 /// may change it meanwhile, and no entry may be given a further member.

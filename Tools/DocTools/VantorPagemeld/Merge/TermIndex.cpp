@@ -4,7 +4,8 @@
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 
 // The JSON library finds a member by a linear search, which makes the merge of n terms take n * n steps. The
-// index beside the object costs 16 bytes a term and one hash of each name; the names stay in the object.
+// index beside the object costs 16 to 32 bytes a term and one hash of each name; the names stay in the
+// object.
 
 LargeObjectPool::Allocator& LargeObjectPool::AllocatorFor(rapidjson::SizeType memberCount,
                                                           Allocator& allocator)

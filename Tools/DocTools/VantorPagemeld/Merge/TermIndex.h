@@ -8,8 +8,8 @@
 
 /// Memory for the member lists of large objects. It must outlive every use of such an object.
 ///
-/// A pool grows in place what it gave out last. A list that has a pool to itself therefore leaves no outgrown
-/// copies, of which a large one would fill as much memory as it needs in the end.
+/// A pool can grow only its newest block in place. A list that has a pool to itself therefore leaves no
+/// outgrown copies, which for a large list would take as much memory as the list itself.
 class LargeObjectPool
 {
 public:
@@ -24,8 +24,8 @@ private:
     Allocator m_allocator{std::size_t{1} << 26};
 };
 
-/// Finds the members of one growing JSON object by name in expected constant time: what a linear search over
-/// the object finds, the first member whose name has the same bytes.
+/// Finds the members of one growing JSON object by name in expected constant time. Like a linear search, it
+/// finds the first member whose name has the same bytes.
 ///
 /// The object must live as long as the index, and nobody else may change it meanwhile.
 class TermIndex

@@ -21,7 +21,7 @@ int OpenDescriptor(const char* path)
     const int descriptor = ::open(path, O_RDONLY | O_CLOEXEC | O_NONBLOCK);
     if (descriptor < 0 && errno == EWOULDBLOCK)
     {
-        // Somebody holds a lease on a regular file, and gives it back when asked.
+        // Another process holds a lease on this regular file: an open that waits asks for it back.
         return ::open(path, O_RDONLY | O_CLOEXEC);
     }
     return descriptor;

@@ -3,14 +3,14 @@
 #include <cstddef>
 #include <memory>
 
-/// What reading an input file came to.
+/// The result of reading an input file.
 struct InputText
 {
     enum class Outcome
     {
         Read,
-        NotOpened, ///< missing, or not to be read by this user
-        NotWhole,  ///< no regular file, above 4 GiB, no memory for it, or it gave fewer bytes than it has
+        NotOpened, ///< missing, or not readable by this user
+        NotWhole,  ///< not a regular file, above 4 GiB, out of memory, or fewer bytes came than its size
     };
 
     Outcome outcome = Outcome::NotOpened;
@@ -21,6 +21,6 @@ struct InputText
 
 /// Reads the whole file at path. Reports nothing.
 ///
-/// Doesn't wait for a writer of a named pipe, which would hold up the build for ever. Waits for the end of a
-/// lease that somebody holds on the file, which the system enforces.
+/// Doesn't wait for the writer of a named pipe, which could block the build for ever. If another process
+/// holds a lease on the file, waits until it gives the lease back or the system ends the lease.
 [[nodiscard]] InputText ReadInputFile(const char* path);

@@ -6,16 +6,16 @@
 #include <cstddef>
 #include <string_view>
 
-// The memory of a JSON document, and access to its values that reaches no assertion of the JSON library,
-// whatever the value is.
+// The memory of a JSON document, and access to its values that never triggers an assertion of the JSON
+// library, whatever the value is.
 //
-// References into an array or object die when that array or object grows. The text of a string lives as long
-// as the value that holds it, since short texts lie inside the value itself.
+// References into an array or object become invalid when that array or object grows. The text of a string
+// lives as long as the value that holds it, since short texts lie inside the value itself.
 
-/// The memory of a document: first a small block, and after it the large ones that the library takes.
+/// The memory of a document: first a small block, then the large blocks that the library takes.
 ///
-/// The library would begin with a large one, which is more than all that a small module holds, and there may
-/// be hundreds of them.
+/// A small module fits into the small block. Without it, each of perhaps hundreds of modules would begin with
+/// a large one.
 struct DocumentPool
 {
     alignas(std::max_align_t) std::array<char, std::size_t{8} << 10> start;

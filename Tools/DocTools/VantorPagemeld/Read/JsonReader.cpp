@@ -9,8 +9,8 @@
 // The library parses into a document without any limit on nesting: a recursion over what it accepted, its own
 // included, could overflow the stack. So its reader hands the events to a builder that counts levels and
 // refuses what no writer could write, before the document sees them. That costs two comparisons for an array
-// or object and one for a string or double. A text that is refused is parsed twice, since a document takes an
-// error from nothing but a parse of its own.
+// or object and one for a string or double. A text that is refused is parsed twice, since only a parse of
+// its own sets the error of a document.
 
 namespace
 {
@@ -28,7 +28,7 @@ public:
     bool Int64(std::int64_t value) { return m_document.Int64(value); }
     bool Uint64(std::uint64_t value) { return m_document.Uint64(value); }
 
-    /// Some numbers above the largest double reach here as an infinity, which no writer could write.
+    /// Some numbers above the largest double arrive as an infinity, which no writer could write.
     bool Double(double value) { return std::isfinite(value) && m_document.Double(value); }
 
     bool RawNumber(const char* text, rapidjson::SizeType length, bool copy)
@@ -64,8 +64,8 @@ private:
     std::uint32_t m_depth = 0;
 };
 
-/// A stream that holds nothing and is at a given offset: parsing it fails there. It is the one way to have a
-/// document report an error that our own limits found.
+/// A stream that holds nothing and is at a given offset: parsing it fails there. This is the
+/// only way to give a document an error that one of our own limits found.
 struct FailedStream
 {
     using Ch = char;

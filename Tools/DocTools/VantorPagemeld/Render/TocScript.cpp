@@ -28,7 +28,7 @@ void AppendLineBreak(TextBuffer& script, const TocScriptLayout& layout)
 }
 
 /// Returns the node's module: its first "module" member that is a 32-bit integer. A member of another type
-/// can come from an input file and is passed over.
+/// can come from an input file and is skipped.
 std::optional<int> FindModule(const rapidjson::Value& node)
 {
     for (const auto& member : node.GetObject())

@@ -22,6 +22,6 @@ private:
     int m_count;
 };
 
-/// Whether the entry at path is a directory itself, and not a link to one. Asks the file system only where
-/// the listing does not tell.
+/// Whether the entry at path is a directory itself, and not a link to one. Asks the file system only if
+/// the listing does not say.
 bool IsDirectory(const dirent& entry, const std::string& path);

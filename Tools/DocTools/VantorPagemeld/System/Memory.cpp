@@ -24,7 +24,7 @@ bool IsAddressSpaceLimited()
     return ::getrlimit(RLIMIT_AS, &limit) != 0 || limit.rlim_cur != RLIM_INFINITY;
 }
 
-/// The advice takes whole pages.
+/// The advice applies to whole pages.
 void AdviseHugePages(void* memory, std::size_t size)
 {
     const auto pageSize = static_cast<std::size_t>(::sysconf(_SC_PAGESIZE));

@@ -30,7 +30,7 @@ void ReportProgress(const char* format, ...) __attribute__((format(printf, 1, 2)
 
 /// Makes it safe to write messages, however the process was started. To be called before any file is opened.
 ///
-/// Opens a placeholder on every closed standard descriptor: otherwise an output file would get that number,
-/// and the messages in it. Ignores SIGPIPE: a standard error that nobody reads any more costs the messages,
-/// not the outputs.
+/// Opens a placeholder on every closed standard descriptor: otherwise an output file would get that number
+/// and receive the messages. Ignores SIGPIPE: when nobody reads standard error any more, messages are lost
+/// but outputs are not.
 void SecureStandardStreams();

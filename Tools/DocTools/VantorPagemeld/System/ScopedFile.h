@@ -7,7 +7,7 @@ struct FileCloser
 {
     void operator()(std::FILE* file) const
     {
-        // Where it matters, a flush has reported before what a close could still report.
+        // Writers whose result matters flush first, so that no error is left for the close to report.
         (void)std::fclose(file);
     }
 };

@@ -17,11 +17,11 @@ bool IsPipe(std::FILE* file)
     return ::fstat(::fileno(file), &status) == 0 && S_ISFIFO(status.st_mode);
 }
 
-/// Returns nothing when the open fails, or when a named pipe is at path: it would keep nothing, and its
-/// reader decides how long a write takes.
+/// Returns null when the open fails or a named pipe is at path. A pipe would store nothing, and its reader
+/// could block the run.
 ScopedFile OpenForWriting(const char* path)
 {
-    ScopedFile file(std::fopen(path, "w+b")); // does not wait, as it asks for both ends of a pipe
+    ScopedFile file(std::fopen(path, "w+b")); // does not wait: it opens both ends of a pipe
     return file != nullptr && IsPipe(file.get()) ? nullptr : std::move(file);
 }
 

@@ -17,7 +17,7 @@ bool SharedText::WriteTo(ScopedFile file, std::string_view head)
     {
         return true;
     }
-    // A flush, since the buffer holds write errors back until then.
+    // Flushes, so that errors of buffered writes are seen.
     const bool isComplete =
         WriteText(file.get(), head) && WriteText(file.get(), TextOf(m_text)) && std::fflush(file.get()) == 0;
     if (isComplete && head.empty() && m_original == nullptr)
@@ -34,7 +34,8 @@ bool SharedText::CloneTo(std::FILE* file) const
     {
         return false;
     }
-    // Opening the file may have emptied the original: under a name that leads to it, after a failed rename.
+    // The file can be the original itself, under its temporary name after a failed rename: opening it has
+    // then emptied the original.
     struct stat status = {};
     return ::fstat(::fileno(file), &status) == 0 &&
            static_cast<std::size_t>(status.st_size) == m_text.GetSize();

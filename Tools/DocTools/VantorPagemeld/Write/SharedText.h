@@ -17,7 +17,7 @@ public:
     explicit SharedText(TextBuffer text);
 
     /// Writes head and then the text to a file that was opened empty for reading and writing. Closes it, or
-    /// keeps it open as the original of later clones; either way every byte was handed to the system.
+    /// keeps it open, flushed, as the original of later clones.
     ///
     /// Returns whether every byte reached the file. The result of the close itself is not examined.
     bool WriteTo(ScopedFile file, std::string_view head);
