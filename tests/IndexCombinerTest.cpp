@@ -130,12 +130,17 @@ TEST(IndexCombiner, MergesIntoWhatItsCallerChanged)
 {
     const char* const module = R"({"pages":[],"info":[],"common":{},"searchIndex":{"a":[],"b":[1]}})";
     rapidjson::Document first = ParsedJson(module);
-    rapidjson::Document second =
-        ParsedJson(R"({"pages":[],"info":[],"common":{},"searchIndex":{"c":[2],"b":[1]}})");
-    IndexCombiner combiner;
-    combiner.AppendJsonDocument(first);
-    combiner.combinedDocument["searchIndex"].MemberBegin()->name.SetString("c");
-    combiner.AppendJsonDocument(second);
-    EXPECT_EQ(R"({"pages":[],"info":[],"common":{},"searchIndex":{"c":[2],"b":[1,1]}})",
-              RapidJsonIoUtil::OutputJsonValueToString(combiner.combinedDocument));
+    std::list<rapidjson::Document> later; // hold values of what they are merged into
+    IndexCombiner byHand;
+    byHand.AppendJsonDocument(first);
+    MergedModules<IndexCombiner> combined({module, module});
+    for (IndexCombiner* combiner : {&byHand, &combined.Get()})
+    {
+        rapidjson::Value& searchIndex = combiner->combinedDocument["searchIndex"];
+        searchIndex.MemberBegin()->name.SetString("c");
+        later.push_back(ParsedJson(R"({"pages":[],"info":[],"common":{},"searchIndex":{"c":[2],"a":[1]}})"));
+        combiner->AppendJsonDocument(later.back());
+        EXPECT_EQ("[2]", RapidJsonIoUtil::OutputJsonValueToString(searchIndex["c"]));
+        EXPECT_EQ("[1]", RapidJsonIoUtil::OutputJsonValueToString(searchIndex["a"]));
+    }
 }

@@ -8,7 +8,7 @@ JsonCombiner::JsonCombiner() : defaultJson("{}") {}
 
 JsonCombiner::~JsonCombiner()
 {
-    moduleDocuments.clear();
+    moduleDocuments.clear(); // before their pools and before combinedDocument, which is declared after them
 }
 
 bool JsonCombiner::InitializeCombinedDocument()

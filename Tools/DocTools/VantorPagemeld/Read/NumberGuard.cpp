@@ -112,5 +112,5 @@ std::optional<std::string> GuardNumbers(const char* text, std::size_t maxDigits)
     }
     std::string guarded(whole.substr(0, end));
     CutExponents(guarded);
-    return guarded;
+    return end == whole.size() ? guarded : guarded + '!';
 }
