@@ -1,132 +1,137 @@
-"""A corpus made ready to be combined by one program after another."""
+"""Corpora on which programs run in turn, and what the runs cost."""
 
 import hashlib
 import os
-import shlex
+import random
 import shutil
+import statistics
+import subprocess
 import sys
 from pathlib import Path
+from typing import NamedTuple
 
 import corpus
-import measurement
 
-BLOCK = 1 << 20
+LAUNCHER = Path(__file__).parent / "launch.py"
 ALTERNATIVES = Path(__file__).parent / "alternatives"
-INPUTS = ("index.json", "toc.json")
+BLOCK = 1 << 20
 INDEX_OUTPUT = "global_index.json"
 OUTPUTS = (INDEX_OUTPUT, "global_index.js", "global_toc.json", "global_toc.js")
 
 
-def blocks_of(path):
-    with open(path, "rb") as file:
-        yield from iter(lambda: file.read(BLOCK), b"")
+class Cost(NamedTuple):
+    wall: float  # seconds, as the three below
+    user: float
+    system: float
+    cpu: float
+    peak: float  # bytes of resident memory
+
+
+def run(command):
+    """Runs a command that must succeed, its output thrown away."""
+    launch = [sys.executable, "-S", str(LAUNCHER), *command]
+    status, wall, user, system, peak = map(float, subprocess.check_output(launch).split())
+    if status != 0:
+        raise SystemExit(f"{' '.join(command[:3])} ... ended with {status:.0f}")
+    return Cost(wall, user, system, user + system, peak)
+
+
+def outputs_of(program):
+    """jq makes only the search index, and of that only the JSON file."""
+    return [INDEX_OUTPUT] if program == "jq" else OUTPUTS
+
+
+def blocks_of(files):
+    for path in files:
+        with open(path, "rb") as file:
+            yield from iter(lambda: file.read(BLOCK), b"")
 
 
 class Arena:
+    """A corpus, made below folder, with finished outputs to be copied and to be compared with."""
+
     def __init__(self, name, folder, tool):
-        self.folder = corpus.make(name, folder)
-        self.roots = sorted(self.folder.glob("m*"))
-        self._tool = str(tool)
-        self._ready = self.folder / "ready"
-        self._make_ready_outputs()
+        self._corpus = Path(folder) / name
+        corpus.make(name, self._corpus)
+        roots = sorted(map(str, self._corpus.glob("m*")))
+        self._commands = {
+            "limit": ["sh", str(ALTERNATIVES / "limit.sh"), str(self._corpus)],
+            "pagemeld": [str(tool), *roots],
+            "node": ["node", str(ALTERNATIVES / "combine.mjs"), *roots],
+            "python": [sys.executable, str(ALTERNATIVES / "combine.py"), *roots],
+            "jq": ["sh", str(ALTERNATIVES / "combine_index.sh"), *roots],
+        }
+        self.run("pagemeld")
+        self.set_sizes = [self._make_ready(set_name) for set_name in corpus.SETS]
+
+    def _make_ready(self, set_name):
+        """Keeps the outputs of one documentation set; returns the bytes of all its inputs and of the outputs."""
+        ready = self._corpus / "ready" / set_name
+        ready.mkdir(parents=True)
+        for output in OUTPUTS:
+            shutil.copy(self._corpus / "m000" / set_name / "docdata" / output, ready)
+        files = [*self._corpus.glob(f"m*/{set_name}/docdata/[it]*.json")], [*ready.iterdir()]
+        return [sum(file.stat().st_size for file in group) for group in files]
+
+    def run(self, program):
+        """Returns what the run cost; the outputs stay."""
+        return run(self._commands[program])
 
     def prepare(self):
         """Removes all outputs, waits for the disk, and brings what is read into the page cache."""
-        self.remove_outputs()
-        os.sync()
-        for file in [*self._inputs(self.roots), *self._ready.glob("*/*")]:
-            for _ in blocks_of(file):
-                pass
-
-    def require_outputs(self, roots=None, outputs=OUTPUTS):
-        """Ends the program if an output is missing or too short, as on a full disk: the run was no run then."""
-        for root in roots or self.roots:
-            for set_name in corpus.SETS:
-                for output in outputs:
-                    written = root / set_name / "docdata" / output
-                    ready = self._ready / set_name / output
-                    if not written.exists() or written.stat().st_size < ready.stat().st_size:
-                        raise SystemExit(f"{written} was not written whole")
-
-    def remove_outputs(self):
-        for output in self.folder.glob("*/*/docdata/global_*"):
+        for output in self._corpus.glob("m*/*/docdata/global_*"):
             output.unlink()
+        os.sync()
+        for _ in blocks_of([*self._corpus.glob("m*/*/docdata/*"), *self._corpus.glob("ready/*/*")]):
+            pass
 
-    # The contenders, as commands.
+    def require_outputs(self, program):
+        """Ends the benchmark if an output is missing or too short, as on a full disk: the run was no run then."""
+        for output in self._outputs(program):
+            ready = self._corpus / "ready" / output.parts[-3] / output.name
+            if not output.exists() or output.stat().st_size < ready.stat().st_size:
+                raise SystemExit(f"{output} was not written whole")
 
-    def pagemeld(self, roots=None):
-        return [self._tool, *map(str, roots or self.roots)]
+    def require_same_outputs(self, program):
+        """Ends the benchmark unless the program makes, to the byte, the outputs that pagemeld makes."""
+        digests = []
+        for each in ("pagemeld", program):
+            self.prepare()
+            self.run(each)
+            digests.append(hashlib.sha256())
+            for block in blocks_of(self._outputs(program)):
+                digests[-1].update(block)
+        if digests[0].digest() != digests[1].digest():
+            raise SystemExit(f"{self._corpus.name}: the outputs of {program} differ from those of pagemeld")
+        print(f"{self._corpus.name}: {program} makes the same outputs as pagemeld", file=sys.stderr)
 
-    def node(self):
-        return ["node", str(ALTERNATIVES / "combine.mjs"), *map(str, self.roots)]
+    def _outputs(self, program):
+        directories = sorted(self._corpus.glob("m*/*/docdata"))
+        return [directory / output for directory in directories for output in outputs_of(program)]
 
-    def python(self):
-        return [sys.executable, str(ALTERNATIVES / "combine.py"), *map(str, self.roots)]
 
-    def jq(self):
-        """Only the search index, and of that only the JSON file."""
-        return ["sh", str(ALTERNATIVES / "combine_index.sh"), *map(str, self.roots)]
+class Rounds:
+    """The costs of several contenders, measured in turn, round by round, so that a slow moment hits all alike."""
 
-    def limit(self, roots=None):
-        """Reads all inputs and copies finished outputs into all modules: one cat, and one cp a docdata folder."""
-        roots = roots or self.roots
-        lines = [f"cat {self._quoted(self._inputs(roots))} > /dev/null"]
-        for set_name in corpus.SETS:
-            ready = self._quoted(self._ready / set_name / output for output in OUTPUTS)
-            lines += [f"cp {ready} {shlex.quote(str(root / set_name / 'docdata'))}" for root in roots]
-        script = self.folder / f"limit-{len(roots)}.sh"
-        script.write_text("set -e\n" + "\n".join(lines) + "\n")
-        return ["sh", str(script)]
+    def __init__(self, contenders, count):
+        """Contenders are pairs of arena and program, by name."""
+        self.contenders = contenders
+        self._costs = {name: [] for name in contenders}
+        for _ in range(count):
+            for name in random.sample(list(contenders), len(contenders)):
+                self._measure(name)
 
-    # What there is to be known about the corpus.
+    def _measure(self, name):
+        for each, _ in self.contenders.values():
+            each.prepare()
+        arena, program = self.contenders[name]
+        self._costs[name].append(arena.run(program))
+        arena.require_outputs(program)
 
-    def receivers(self, count):
-        """Returns the roots of further modules that have no files of their own and receive all outputs."""
-        roots = [self.folder / f"receiver{i:03}" for i in range(count)]
-        for root in roots:
-            for set_name in corpus.SETS:
-                (root / set_name / "docdata").mkdir(parents=True, exist_ok=True)
-        return roots
+    def median(self, name, measure):
+        return statistics.median(getattr(cost, measure) for cost in self._costs[name])
 
-    def digest_after(self, command, outputs=OUTPUTS):
-        """Runs the command and returns one digest of the outputs of those names in all modules."""
-        self.remove_outputs()
-        measurement.run(command)
-        digest = hashlib.sha256()
-        for root in self.roots:
-            for set_name in corpus.SETS:
-                for output in outputs:
-                    for block in blocks_of(root / set_name / "docdata" / output):
-                        digest.update(block)
-        return digest.hexdigest()
-
-    def memory_goal(self):
-        """Returns 3.5 times the input, and the rendered texts that are in memory at once: those of one set."""
-        texts = max(self._ready_size(set_name) for set_name in corpus.SETS)
-        return 3.5 * sum(self._input_size(set_name) for set_name in corpus.SETS) + texts
-
-    def memory_goal_of_set(self):
-        """Returns the same with only the input that is in memory at once: that of the larger set."""
-        return max(3.5 * self._input_size(set_name) + self._ready_size(set_name) for set_name in corpus.SETS)
-
-    def _make_ready_outputs(self):
-        measurement.run(self.pagemeld())
-        for set_name in corpus.SETS:
-            ready = self._ready / set_name
-            ready.mkdir(parents=True, exist_ok=True)
-            for output in OUTPUTS:
-                shutil.copy(self.roots[0] / set_name / "docdata" / output, ready)
-
-    def _inputs(self, roots, sets=corpus.SETS):
-        files = (root / set_name / "docdata" / name for root in roots for set_name in sets for name in INPUTS)
-        return [file for file in files if file.exists()]
-
-    def _input_size(self, set_name):
-        return sum(file.stat().st_size for file in self._inputs(self.roots, [set_name]))
-
-    def _ready_size(self, set_name):
-        return sum(file.stat().st_size for file in (self._ready / set_name).iterdir())
-
-    @staticmethod
-    def _quoted(paths):
-        return " ".join(shlex.quote(str(path)) for path in paths)
+    def ratio(self, name, base, measure):
+        """Returns the median, over the rounds, of one contender's cost divided by another's."""
+        pairs = zip(self._costs[name], self._costs[base])
+        return statistics.median(getattr(cost, measure) / getattr(other, measure) for cost, other in pairs)

@@ -1,117 +1,91 @@
 """Makes documentation modules to measure with: the same bytes on every machine and in every run.
 
-A corpus is a folder of module roots m000, m001, ... Words follow Zipf's law, so that a few terms are found on
-many pages and most on a few. The modules share part of their vocabulary, the groups of their tables of contents
-and some of the entries; the rest is each module's own. All randomness comes from random.Random(seed).random(),
+A corpus is a directory of module roots m000, m001, ... All randomness comes from random.Random(seed).random(),
 whose sequence the language guarantees.
 
-No term is a number: an object of JavaScript would put it in front of the others, and the Node alternative could
-not keep the order of terms.
+No term is a number: an object of JavaScript would put it before the others, and the Node alternative could not
+keep the order of terms.
 """
 
-import hashlib
 import json
 import random
-import shutil
-import subprocess
-import sys
-from dataclasses import dataclass
-from pathlib import Path
 
 SETS = ("Manual", "ScriptReference")
+TERMS = (50_000, 100_000, 200_000, 400_000, 800_000)
+SIBLINGS = (5_000, 10_000, 20_000, 40_000, 80_000, 160_000)
 
 COMMON_WORDS = 40  # the first words of the vocabulary: too common to be searched for
 SHARED_WORDS = 20_000
 OWN_WORDS = 6_000  # of each module
+OWN_WORD_SHARE = 0.15
 INFOS_PER_PAGE = 2
 WORDS_PER_INFO = 16
 GROUPS = 12  # on the first level, each with as many on the second
-OWN_WORD_SHARE = 0.15
 FLAT_SHARE = 0.5  # of the pages stand in the flat group
 SHARED_PAGE_SHARE = 0.1  # of the pages there stand in every module's
 
 
-@dataclass(frozen=True)
-class Shape:
-    """Modules of realistic content: how many, and how many pages each has in each set."""
-
-    modules: int
-    manual_pages: int
-    reference_pages: int
-    has_contents: bool = True  # otherwise the tables of contents are empty
-
-    def write(self, folder):
-        for module in range(self.modules):
-            for set_name, pages in zip(SETS, (self.manual_pages, self.reference_pages)):
-                index, toc = module_documents(module, set_name, pages)
-                write_documents(folder, module, index, toc if self.has_contents else EMPTY_TOC, [set_name])
+# The kinds of corpora: they yield module, documentation sets, search index and table of contents.
 
 
-@dataclass(frozen=True)
-class TermSeries:
-    """Two modules that share all their terms, with a small table of contents."""
-
-    terms: int
-
-    def write(self, folder):
-        infos = 1_000
-        for module in range(2):
-            rng = random.Random(f"terms {module}")
-            index = {
-                "pages": [[f"page{i}.html", f"Page {i}"] for i in range(infos)],
-                "info": [[f"Text of page {i}", i] for i in range(infos)],
-                "common": {},
-                "searchIndex": {
-                    word(i): [int(rng.random() * infos) for _ in range(1 + i % 3)] for i in range(self.terms)
-                },
-            }
-            write_documents(folder, module, index, EMPTY_TOC)
+def realistic(modules, manual_pages, reference_pages, has_contents=True):
+    for module in range(modules):
+        for set_name, page_count in zip(SETS, (manual_pages, reference_pages)):
+            index, toc = realistic_documents(module, set_name, page_count)
+            yield module, [set_name], index, toc if has_contents else root(None)
 
 
-@dataclass(frozen=True)
-class SiblingSeries:
+def many_terms(count):
+    """Two modules that share all their terms."""
+    for module in range(2):
+        rng = random.Random(f"terms {module}")
+        terms = {word(i): [int(rng.random() * 1_000) for _ in range(1 + i % 3)] for i in range(count)}
+        yield module, SETS, search_index(1_000, terms), root(None)
+
+
+def many_siblings(count):
     """Two modules with one flat group: half of the second's entries are the first's too."""
-
-    siblings: int
-
-    def write(self, folder):
-        index = {"pages": [["p.html", "P"]], "info": [["Text", 0]], "common": {}, "searchIndex": {"term": [0]}}
-        for module in range(2):
-            first = module * self.siblings // 2
-            entries = [node(f"{word(i)}.html", word(i), None) for i in range(first, first + self.siblings)]
-            write_documents(folder, module, index, node("toc", "toc", [node("null", "All", entries)]))
+    for module in range(2):
+        first = module * count // 2
+        entries = [leaf(word(i)) for i in range(first, first + count)]
+        yield module, SETS, search_index(1, {"term": [0]}), root([node("null", "All", entries)])
 
 
-EMPTY_TOC = {"link": "toc", "title": "toc", "children": None}
+def deep_contents(depth):
+    """Two modules that share all groups, each within the one before, and differ at the bottom."""
+    for module in range(2):
+        entry = leaf(f"bottom{module}")
+        for level in range(depth):
+            entry = node("null", f"Level {level}", [entry])
+        yield module, SETS, search_index(1, {"term": [0]}), root([entry])
 
-SHAPES = {
-    "small": Shape(3, 200, 400),
-    "medium": Shape(10, 2_000, 4_000),
-    "large": Shape(30, 3_300, 6_600),
-    "medium-index": Shape(10, 2_000, 4_000, has_contents=False),
-    **{f"terms-{n}": TermSeries(n) for n in (50_000, 100_000, 200_000, 400_000, 800_000)},
-    **{f"siblings-{n}": SiblingSeries(n) for n in (5_000, 10_000, 20_000, 40_000, 80_000, 160_000)},
+
+CORPORA = {
+    "small": lambda: realistic(3, 200, 400),
+    "medium": lambda: realistic(10, 2_000, 4_000),
+    "large": lambda: realistic(30, 3_300, 6_600),
+    "medium-index": lambda: realistic(10, 2_000, 4_000, has_contents=False),
+    "many-modules": lambda: realistic(300, 3, 3),
+    "one-module": lambda: realistic(1, 200_000, 200_000),
+    "deep": lambda: deep_contents(2_000),
+    **{f"terms-{count}": lambda count=count: many_terms(count) for count in (*TERMS, 1_000_000)},
+    **{f"siblings-{count}": lambda count=count: many_siblings(count) for count in (*SIBLINGS, 200_000)},
 }
 
 
-def make(name, folder):
-    """Returns the folder of the corpus of that name below folder; makes it unless it is there already."""
-    corpus = Path(folder) / name
-    complete = corpus / "complete"  # empty, or the digest of the generator that made all of it
-    generator = hashlib.sha256(Path(__file__).read_bytes()).hexdigest()
-    if corpus.exists() and not complete.exists():
-        raise SystemExit(f"{corpus} was not made here, or is incomplete: remove it")
-    if not corpus.exists() or complete.read_text(encoding="utf-8") != generator:
-        shutil.rmtree(corpus, ignore_errors=True)
-        corpus.mkdir(parents=True)
-        complete.touch()
-        # In a process of its own: a child that is measured begins with the peak memory of its parent.
-        subprocess.run([sys.executable, __file__, name, str(corpus)], check=True)
-        complete.write_text(generator, encoding="utf-8")
-    return corpus
+def make(name, directory):
+    """Writes the corpus of that name into a directory that has no modules yet."""
+    for module, set_names, index, toc in CORPORA[name]():
+        # A line for each member, as documentation builds write it.
+        members = ",\n".join(f'"{member}": {json.dumps(value, ensure_ascii=False)}' for member, value in index.items())
+        for set_name in set_names:
+            docdata = directory / f"m{module:03}" / set_name / "docdata"
+            docdata.mkdir(parents=True)
+            (docdata / "index.json").write_text("{" + members + "}\n", encoding="utf-8")
+            (docdata / "toc.json").write_text(json.dumps(toc, ensure_ascii=False), encoding="utf-8")
 
 
-SYLLABLES = [c + v for c in ("b", "c", "d", "f", "g", "l", "m", "n", "p", "r", "s", "t", "v") for v in "aeiou"]
+SYLLABLES = [c + v for c in "bcdfglmnprstv" for v in "aeiou"]
 
 
 def word(number):
@@ -124,90 +98,71 @@ def word(number):
     return "".join(reversed(syllables))
 
 
-class Vocabulary:
-    """The words of one module: shared ones and its own, both drawn by Zipf's law."""
-
-    def __init__(self, module):
-        self._shared = [word(i) for i in range(SHARED_WORDS)]
-        first_own = SHARED_WORDS + module * OWN_WORDS
-        self._own = [word(i) for i in range(first_own, first_own + OWN_WORDS)]
-
-    @property
-    def common(self):
-        return self._shared[:COMMON_WORDS]
-
-    def draw(self, rng):
-        words = self._own if rng.random() < OWN_WORD_SHARE else self._shared
-        # The logarithm of a Zipf-distributed rank is evenly distributed.
-        return words[int(len(words) ** rng.random()) - 1]
-
-
-def module_documents(module, set_name, page_count):
+def realistic_documents(module, set_name, page_count):
     """Returns the search index and the table of contents of one module in one set."""
     rng = random.Random(f"{set_name} {module}")
-    vocabulary = Vocabulary(module)
-    titles = [page_title(vocabulary, rng, i) for i in range(page_count)]
+    shared = [word(i) for i in range(SHARED_WORDS)]
+    own = [word(SHARED_WORDS + module * OWN_WORDS + i) for i in range(OWN_WORDS)]
+
+    def draw():
+        """Returns a word by Zipf's law: the logarithm of its rank is evenly distributed."""
+        words = own if rng.random() < OWN_WORD_SHARE else shared
+        return words[int(len(words) ** rng.random()) - 1]
+
+    titles = [page_title(draw, i) for i in range(page_count)]
     links = [f"{title.split()[0]}-{module}-{i}.html" for i, title in enumerate(titles)]
-    return search_index(vocabulary, rng, titles, links), table_of_contents(rng, titles, links)
+    common = dict.fromkeys(shared[:COMMON_WORDS], 1)
+    return realistic_index(draw, common, titles, links), realistic_toc(rng, titles, links)
 
 
-def page_title(vocabulary, rng, number):
-    title = " ".join(vocabulary.draw(rng).capitalize() for _ in range(2))
-    if number % 50 == 0:
-        return title + ' ("r\u00e9sum\u00e9")'
-    return title
+def page_title(draw, number):
+    title = f"{draw().capitalize()} {draw().capitalize()}"
+    return title + ' ("r\u00e9sum\u00e9")' if number % 50 == 0 else title
 
 
-def search_index(vocabulary, rng, titles, links):
+def realistic_index(draw, common, titles, links):
     info = []
     terms = {}
-    common = set(vocabulary.common)
     for page in range(len(titles)):
         for _ in range(INFOS_PER_PAGE):
-            words = [vocabulary.draw(rng) for _ in range(WORDS_PER_INFO)]
+            words = [draw() for _ in range(WORDS_PER_INFO)]
             for term in dict.fromkeys(words):
                 if term not in common:
                     terms.setdefault(term, []).append(len(info))
             info.append([" ".join(words).capitalize() + ".", page])
-    return {
-        "pages": [list(page) for page in zip(links, titles)],
-        "info": info,
-        "common": dict.fromkeys(vocabulary.common, 1),
-        "searchIndex": terms,
-    }
+    return {"pages": [*zip(links, titles)], "info": info, "common": common, "searchIndex": terms}
 
 
-def table_of_contents(rng, titles, links):
+def realistic_toc(rng, titles, links):
     """A tree of groups that all modules share, two deep, and one flat group of thousands of entries."""
     groups = [[[] for _ in range(GROUPS)] for _ in range(GROUPS)]
     flat = []
     for number, (title, link) in enumerate(zip(titles, links)):
         if rng.random() < FLAT_SHARE:
-            is_shared = rng.random() < SHARED_PAGE_SHARE
-            name = word(number) if is_shared else title
-            flat.append(node(f"{name}.html" if is_shared else link, name, None))
+            flat.append(leaf(word(number)) if rng.random() < SHARED_PAGE_SHARE else node(link, title, None))
         else:
             groups[int(GROUPS * rng.random())][int(GROUPS * rng.random())].append(node(link, title, None))
     children = [
         node("null", f"Group {i}", [node("null", f"Topic {i}.{j}", pages) for j, pages in enumerate(topics) if pages])
         for i, topics in enumerate(groups)
     ]
-    return node("toc", "toc", children + [node("null", "All classes", flat)])
+    return root(children + [node("null", "All classes", flat)])
+
+
+def search_index(page_count, terms):
+    """Returns an index of plain pages with one text each."""
+    pages = [[f"page{i}.html", f"Page {i}"] for i in range(page_count)]
+    info = [[f"Text of page {i}", i] for i in range(page_count)]
+    return {"pages": pages, "info": info, "common": {}, "searchIndex": terms}
 
 
 def node(link, title, children):
     return {"link": link, "title": title, "children": children}
 
 
-def write_documents(folder, module, index, toc, sets=SETS):
-    """Writes both documents of one module, a line for each member of the index, as documentation builds do."""
-    lines = ",\n".join(f'"{name}": {json.dumps(value, ensure_ascii=False)}' for name, value in index.items())
-    for set_name in sets:
-        docdata = Path(folder) / f"m{module:03}" / set_name / "docdata"
-        docdata.mkdir(parents=True, exist_ok=True)
-        (docdata / "index.json").write_text("{" + lines + "}\n", encoding="utf-8")
-        (docdata / "toc.json").write_text(json.dumps(toc, ensure_ascii=False), encoding="utf-8")
+def leaf(name):
+    return node(f"{name}.html", name, None)
 
 
-if __name__ == "__main__":
-    SHAPES[sys.argv[1]].write(sys.argv[2])
+def root(children):
+    return node("toc", "toc", children)

@@ -1,95 +1,95 @@
-"""Turns studies into Markdown."""
+"""Turns what was measured into Markdown: for each file system, by its name, the rounds of each study."""
 
-from arena import Arena
-
-MEMORY_GOALS = {
-    "(3.5 x input + texts)": Arena.memory_goal,
-    "the same of the larger set alone": Arena.memory_goal_of_set,
-}
-SERIES = {"terms": "doubling terms", "siblings": "doubling siblings"}
+from itertools import chain, pairwise, zip_longest
 
 
-def goal_table(studies):
+def ratio(study, name, base, measure):
+    return lambda rounds_of: rounds_of[study].ratio(name, base, measure)
+
+
+def largest_step(study):
+    return lambda rounds_of: max(rounds_of[study].ratio(b, a, "cpu") for a, b in pairwise(rounds_of[study].contenders))
+
+
+def peak_share(study):
+    def share(rounds_of):
+        arena, _ = rounds_of[study].contenders["pagemeld"]
+        inputs, texts = zip(*arena.set_sizes)
+        # The sets are combined one after the other: the texts of one are in memory at once.
+        return rounds_of[study].median("pagemeld", "peak") / (3.5 * sum(inputs) + max(texts))
+
+    return share
+
+
+GOALS = [
+    ("medium, wall / limit", "at most 1.2", ratio("medium", "pagemeld", "limit", "wall")),
+    ("large, wall / limit", "at most 1.2", ratio("large", "pagemeld", "limit", "wall")),
+    ("small, wall / limit", "at most 2", ratio("small", "pagemeld", "limit", "wall")),
+    ("medium, wall of Node / wall", "at least 5", ratio("medium", "node", "pagemeld", "wall")),
+    ("medium, wall of Python / wall", "at least 8", ratio("medium", "python", "pagemeld", "wall")),
+    ("medium, user CPU of Node / user CPU", "at least 7", ratio("medium", "node", "pagemeld", "user")),
+    ("index part, wall of jq / wall", "at least 50", ratio("index part", "jq", "pagemeld", "wall")),
+    ("index part, user CPU of jq / user CPU", "at least 50", ratio("index part", "jq", "pagemeld", "user")),
+    ("doubling terms, CPU, largest step", "at most 2.1", largest_step("terms")),
+    ("doubling siblings, CPU, largest step", "at most 2.1", largest_step("siblings")),
+    ("medium, peak memory / (3.5 x input + texts)", "at most 1", peak_share("medium")),
+    ("large, peak memory / (3.5 x input + texts)", "at most 1", peak_share("large")),
+]
+
+
+def goal_table(results):
     """Returns the goals with what was measured; what misses its goal stands in bold."""
-    rows = [row for row in goal_rows(studies) if any(value is not None for value in row[3])]
-    lines = table_head(["measure", "goal", *(study.file_system for study in studies)])
-    for measure, goal, is_met, values in rows:
-        cells = ["-" if v is None else f"{v:.2f}" if is_met(v) else f"**{v:.2f}**" for v in values]
-        lines.append(table_row([measure, goal, *cells]))
-    return "\n".join(lines) + "\n"
+    rows = [("measure", "goal", *results), ("---",) * (2 + len(results))]
+    for text, goal, measured in GOALS:
+        rows.append((text, goal, *(goal_cell(goal, measured, rounds_of) for rounds_of in results.values())))
+    return table(rows)
 
 
-def goal_rows(studies):
-    def at_most(limit):
-        return f"at most {limit}", lambda value: value <= limit
-
-    def at_least(limit):
-        return f"at least {limit}", lambda value: value >= limit
-
-    def size_ratio(size, contender, other, measure="wall"):
-        return [
-            study.sizes[size].ratio(contender, other, measure) if size in study.sizes else None for study in studies
-        ]
-
-    def index_ratio(measure):
-        return [study.index_part and study.index_part.ratio("jq", "pagemeld", measure) for study in studies]
-
-    yield "medium, wall / limit", *at_most(1.2), size_ratio("medium", "pagemeld", "limit")
-    yield "large, wall / limit", *at_most(1.2), size_ratio("large", "pagemeld", "limit")
-    yield "small, wall / limit", *at_most(2), size_ratio("small", "pagemeld", "limit")
-    yield "medium, wall of Node / wall", *at_least(5), size_ratio("medium", "node", "pagemeld")
-    yield "medium, wall of Python / wall", *at_least(8), size_ratio("medium", "python", "pagemeld")
-    yield "medium, user CPU of Node / user CPU", *at_least(7), size_ratio("medium", "node", "pagemeld", "user")
-    yield "index part, wall of jq / wall", *at_least(50), index_ratio("wall")
-    yield "index part, user CPU of jq / user CPU", *at_least(50), index_ratio("user")
-    for series, text in SERIES.items():
-        yield f"{text}, CPU, largest step", *at_most(2.1), [largest_step(study.series.get(series)) for study in studies]
-    for size in ("medium", "large"):
-        for text, goal in MEMORY_GOALS.items():
-            yield f"{size}, peak memory / {text}", *at_most(1), [peak_share(study, size, goal) for study in studies]
-    yield "one more module / copying its outputs", *at_most(1.1), [study.one_more for study in studies]
+def goal_cell(goal, measured, rounds_of):
+    try:
+        value = measured(rounds_of)
+    except KeyError:
+        return "-"  # this study was left out
+    bound = float(goal.split()[-1])
+    is_met = value <= bound if goal.startswith("at most") else value >= bound
+    return f"{value:.2f}" if is_met else f"**{value:.2f}**"
 
 
-def largest_step(series):
-    return max(ratio for _, _, ratio in series if ratio) if series else None
+def run_table(results):
+    """Returns the medians of every program, by corpus."""
+    head = [f"{system}: wall, s | user, s | system, s | peak, MB" for system in results]
+    rows = [("corpus", "program", *head), ("---",) * (2 + 4 * len(results))]
+    for study in ("small", "medium", "large", "index part"):
+        measured = [rounds_of[study] for rounds_of in results.values() if study in rounds_of]
+        for program in measured[0].contenders if measured else ():
+            rows.append((study, program, *(run_cells(rounds, program) for rounds in measured)))
+    return table(rows)
 
 
-def peak_share(study, size, goal):
-    if size not in study.sizes:
-        return None
-    return study.sizes[size].median("pagemeld", "peak") / goal(study.arenas[size])
+def run_cells(rounds, program):
+    times = [f"{rounds.median(program, measure):.3f}" for measure in ("wall", "user", "system")]
+    return " | ".join([*times, "-" if program == "limit" else f"{rounds.median(program, 'peak') / 1e6:.0f}"])
 
 
-def run_table(study):
-    """Returns all sizes with every contender's medians."""
-    head = ["corpus", "program", "wall, s", "user, s", "system, s", "peak, MB", "wall / limit", "wall / pagemeld"]
-    lines = table_head(head)
-    for size, rounds in study.sizes.items():
-        for name in rounds.names():
-            times = [f"{rounds.median(name, measure):.3f}" for measure in ("wall", "user", "system")]
-            peak = "-" if name == "limit" else f"{rounds.median(name, 'peak') / 1e6:.0f}"
-            ratios = [f"{rounds.ratio(name, other, 'wall'):.2f}" for other in ("limit", "pagemeld")]
-            lines.append(table_row([size, name, *times, peak, *ratios]))
-    if study.index_part:
-        for name in study.index_part.names():
-            times = [f"{study.index_part.median(name, measure):.3f}" for measure in ("wall", "user", "system")]
-            peak = f"{study.index_part.median(name, 'peak') / 1e6:.0f}"
-            ratio = f"{study.index_part.ratio(name, 'pagemeld', 'wall'):.2f}"
-            lines.append(table_row(["medium, index only", name, *times, peak, "-", ratio]))
-    return "\n".join(lines) + "\n"
+def series_table(results):
+    """Returns CPU seconds by count, and in parentheses the ratio to the step before; the series side by side."""
+    series = [series_rows(study, results) for study in ("terms", "siblings")]
+    return table(chain(*row) for row in zip_longest(*series, fillvalue=("-",) * (1 + len(results))))
 
 
-def series_table(study):
-    lines = table_head(["series", "count", "CPU, s", "ratio to the step before"])
-    for series, steps in study.series.items():
-        for count, cpu, ratio in steps:
-            lines.append(table_row([series, f"{count:,}", f"{cpu:.3f}", f"{ratio:.2f}" if ratio else "-"]))
-    return "\n".join(lines) + "\n"
+def series_rows(study, results):
+    yield study, *(f"CPU, s, {system}" for system in results)
+    yield ("---",) * (1 + len(results))
+    measured = [rounds_of[study] for rounds_of in results.values() if study in rounds_of]
+    counts = list(measured[0].contenders) if measured else []
+    for before, count in zip([None, *counts], counts):
+        yield f"{count:,}", *(series_cell(rounds, count, before) for rounds in measured)
 
 
-def table_head(cells):
-    return [table_row(cells), table_row(["---"] * len(cells))]
+def series_cell(rounds, count, before):
+    step = f" ({rounds.ratio(count, before, 'cpu'):.2f})" if before else ""
+    return f"{rounds.median(count, 'cpu'):.3f}{step}"
 
 
-def table_row(cells):
-    return f"| {' | '.join(cells)} |"
+def table(rows):
+    return "\n".join(f"| {' | '.join(row)} |" for row in rows)

@@ -8,11 +8,7 @@ const readJson = (file) => JSON.parse(fs.readFileSync(file, "utf8"));
 
 function writeOutput(file, ...buffers) {
     const descriptor = fs.openSync(`${file}.tmp`, "w");
-    for (const buffer of buffers) {
-        for (let written = 0; written < buffer.length; ) {
-            written += fs.writeSync(descriptor, buffer, written);
-        }
-    }
+    for (const buffer of buffers) fs.writeFileSync(descriptor, buffer);
     fs.closeSync(descriptor);
     fs.renameSync(`${file}.tmp`, file);
 }
@@ -46,31 +42,27 @@ function tag(node, module) {
 
 const keyOf = (node) => `${node.link}\0${node.title}`;
 
-class TocMerger {
-    #siblings = new Map(); // from a list of the combined tree to its nodes by their keys
+const siblings = new WeakMap(); // from a list of the combined tree to its nodes by their keys
 
-    mergeNode(target, source) {
-        if (source.children === null) return;
-        if (target.children === null) target.children = source.children;
-        else this.#mergeList(target.children, source.children);
+function siblingsIn(list) {
+    if (!siblings.has(list)) siblings.set(list, new Map([...list].reverse().map((node) => [keyOf(node), node])));
+    return siblings.get(list);
+}
+
+function mergeNode(target, source) {
+    if (source.children === null || target.children === null) {
+        target.children ??= source.children;
+        return;
     }
-
-    #mergeList(target, source) {
-        let known = this.#siblings.get(target);
-        if (known === undefined) {
-            known = new Map();
-            for (const node of target) if (!known.has(keyOf(node))) known.set(keyOf(node), node);
-            this.#siblings.set(target, known);
-        }
-        for (const node of source) {
-            const key = keyOf(node);
-            const same = known.get(key);
-            if (same === undefined) {
-                target.push(node);
-                known.set(key, node);
-            } else {
-                this.mergeNode(same, node);
-            }
+    const known = siblingsIn(target.children);
+    for (const node of source.children) {
+        const key = keyOf(node);
+        const same = known.get(key);
+        if (same !== undefined) {
+            mergeNode(same, node);
+        } else {
+            known.set(key, node);
+            target.children.push(node);
         }
     }
 }
@@ -78,8 +70,7 @@ class TocMerger {
 function combineTocs(documents) {
     documents.forEach(tag);
     const [toc, ...others] = documents;
-    const merger = new TocMerger();
-    for (const other of others) if (keyOf(other) === keyOf(toc)) merger.mergeNode(toc, other);
+    for (const other of others) if (keyOf(other) === keyOf(toc)) mergeNode(toc, other);
     return toc;
 }
 

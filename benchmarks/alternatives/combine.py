@@ -42,38 +42,33 @@ def key_of(node):
     return node["link"], node["title"]
 
 
-class TocMerger:
-    def __init__(self):
-        self._siblings = {}  # from a list of the combined tree, by its identity, to its nodes by their keys
-
-    def merge_node(self, target, source):
-        if source["children"] is None:
-            return
-        if target["children"] is None:
-            target["children"] = source["children"]
+def merge_node(target, source, siblings):
+    """Siblings leads from a list of the combined tree, by its identity, to its nodes by their keys."""
+    if source["children"] is None:
+        return
+    if target["children"] is None:
+        target["children"] = source["children"]
+        return
+    nodes = target["children"]
+    if id(nodes) not in siblings:
+        siblings[id(nodes)] = {key_of(node): node for node in reversed(nodes)}
+    known = siblings[id(nodes)]
+    for node in source["children"]:
+        same = known.setdefault(key_of(node), node)
+        if same is node:
+            nodes.append(node)
         else:
-            self._merge_list(target["children"], source["children"])
-
-    def _merge_list(self, target, source):
-        known = self._siblings.get(id(target))
-        if known is None:
-            known = self._siblings[id(target)] = {key_of(node): node for node in reversed(target)}
-        for node in source:
-            same = known.setdefault(key_of(node), node)
-            if same is node:
-                target.append(node)
-            else:
-                self.merge_node(same, node)
+            merge_node(same, node, siblings)
 
 
 def combine_tocs(documents):
     for module, document in enumerate(documents):
         tag(document, module)
     toc, *others = documents
-    merger = TocMerger()
+    siblings = {}
     for other in others:
         if key_of(other) == key_of(toc):
-            merger.merge_node(toc, other)
+            merge_node(toc, other, siblings)
     return toc
 
 
@@ -133,5 +128,6 @@ def combine_set(module_roots, set_name):
 
 if __name__ == "__main__":
     gc.disable()  # a quarter faster: the run makes no cycles, and few objects die
+    sys.setrecursionlimit(20_000)  # for a deep table of contents
     for name in ("Manual", "ScriptReference"):
         combine_set(sys.argv[1:], name)
