@@ -31,8 +31,8 @@
     const finder = create("div", {}, form, status, results, more);
     const contents = create("div", { class: "pagemeld-contents" });
     const contentsButton = createButton("Contents", contents);
-    const nav = create("nav", { "aria-label": "Contents" }, contentsButton, contents);
-    const view = create("div", { class: "pagemeld-view", hidden: "" }, finder, nav);
+    const view = create("div", { class: "pagemeld-view", hidden: "" },
+        finder, create("nav", { "aria-label": "Contents" }, contentsButton, contents));
 
     let index = null; // until it is loaded
     let found = { pages: [] };
@@ -97,24 +97,18 @@
     const moduleName = (prefix) => decode(new URL(addressOf(prefix, [prefix])).pathname.split("/").at(-3) ?? "");
     const moduleOf = (page) => index.modules.get(prefixOf(index.pages[page][0], index.prefixes));
 
-    // What a search needs beside the lists themselves. Of pages with the same path the first stands for all.
+    // What a search needs beside the lists themselves.
     function orderIndex(lists) {
-        const { pages, info, searchIndex, prefixes } = lists;
-        const firstPages = new Map();
         const titles = new Map();
-        pages.forEach(([path, title], page) => {
-            firstPages.has(path) || firstPages.set(path, page);
-            for (const word of wordsOf(title)) {
-                titles.has(word) || titles.set(word, []);
-                titles.get(word).push(firstPages.get(path));
-            }
-        });
+        lists.pages.forEach(([, title], page) => wordsOf(title).forEach((word) => {
+            titles.has(word) ? titles.get(word).push(page) : titles.set(word, [page]);
+        }));
         return {
             ...lists,
             titles,
-            words: [...new Set(Object.keys(searchIndex).concat([...titles.keys()]))],
-            pageOfText: info.map(([, page]) => firstPages.get(pages[page][0])),
-            modules: new Map(["", ...prefixes].map((prefix) => [prefix, moduleName(prefix)])),
+            words: [...new Set(Object.keys(lists.searchIndex).concat([...titles.keys()]))],
+            pageOfText: lists.info.map(([, page]) => page),
+            modules: new Map(["", ...lists.prefixes].map((prefix) => [prefix, moduleName(prefix)])),
         };
     }
 
@@ -272,8 +266,8 @@
                 return create("li", {}, name);
             }
             const list = create("ul", {});
-            const fill = () => list.append(...createEntries(children, way, prefixes));
-            const button = createButton(isLink ? "" : name, list, fill);
+            const button = createButton(isLink ? "" : name, list,
+                () => list.append(...createEntries(children, way, prefixes)));
             isLink && button.setAttribute("aria-label", `Below ${title}`);
             way.slice(0, -1).includes(node) && button.click();
             return create("li", {}, button, isLink ? name : "", list);
@@ -328,23 +322,27 @@
         addEventListener("keydown", onPageKey);
         finder.addEventListener("keydown", onFinderKey);
         box.addEventListener("focus", loadIndex, { once: true });
-        box.addEventListener("input", update);
-        box.addEventListener("blur", keepQuery);
-        filter.addEventListener("change", update);
-        more.addEventListener("click", () => showMore().querySelector("a").focus());
-        results.addEventListener("click", keepQuery);
-        form.addEventListener("submit", (event) => {
-            event.preventDefault();
-            results.querySelector("a")?.click();
-        });
+        box.oninput = filter.onchange = update;
+        box.onblur = results.onclick = keepQuery;
+        more.onclick = () => showMore().querySelector("a").focus();
+        // False: nothing is sent.
+        form.onsubmit = () => results.querySelector("a")?.click() ?? false;
+    }
+
+    // The first thing in the body, or in what fills the window by itself, as javadoc's pages do.
+    function createPlace() {
+        const place = create("div", { id: "pagemeld", class: "pagemeld-top" });
+        const filler = [...document.body.children].find((part) => getComputedStyle(part).position === "fixed" &&
+            part.clientWidth >= innerWidth && part.clientHeight >= innerHeight);
+        (filler ?? document.body).prepend(place);
+        return place;
     }
 
     async function start() {
         if (document.body?.localName !== "body") {
             return; // a frame set
         }
-        const place = document.getElementById("pagemeld") ?? create("div", { id: "pagemeld", class: "pagemeld-top" });
-        place.isConnected || document.body.prepend(place);
+        const place = document.getElementById("pagemeld") ?? createPlace();
         place.append(view);
         listen();
         matchMedia("(min-width: 48em)").matches && contentsButton.click();

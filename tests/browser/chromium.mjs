@@ -5,12 +5,10 @@ import { tmpdir } from "node:os";
 import path from "node:path";
 
 export const program = ["/usr/bin/chromium", "/usr/bin/chromium-browser"].find(existsSync);
-
 const flags = ["--headless", "--remote-debugging-pipe", "--disable-gpu", "--disable-quic", "--no-first-run",
     "--disable-background-networking", "--disable-component-update", "--disable-sync",
     ...(process.getuid() === 0 ? ["--no-sandbox"] : [])];
-const keyCodes = { Tab: 9, Enter: 13, Escape: 27, ArrowUp: 38, ArrowDown: 40, "/": 191 };
-const keyTexts = { Enter: "\r", "/": "/" };
+const keys = { Tab: [9], Enter: [13, "\r"], Escape: [27], ArrowUp: [38], ArrowDown: [40], "/": [191, "/"] };
 
 // One page, in a browser with a profile of its own. Collects the errors and the requests since it went somewhere.
 export class Page {
@@ -26,16 +24,13 @@ export class Page {
         page.#read(page.#browser.stdio[4].setEncoding("utf8"));
         const { targetId } = await page.ask("Target.createTarget", { url: "about:blank" });
         page.#session = (await page.ask("Target.attachToTarget", { targetId, flatten: true })).sessionId;
-        for (const domain of ["Page", "Runtime", "Network", "Log"]) {
-            await page.ask(`${domain}.enable`);
-        }
+        await Promise.all(["Page", "Runtime", "Network", "Log"].map((domain) => page.ask(`${domain}.enable`)));
         return page;
     }
 
     async close() {
-        const ended = new Promise((resolve) => this.#browser.once("close", resolve));
         this.#browser.stdio[3].end();
-        await ended;
+        await new Promise((resolve) => this.#browser.once("close", resolve));
         rmSync(this.#profile, { recursive: true, force: true, maxRetries: 5 });
     }
 
@@ -61,14 +56,12 @@ export class Page {
         error ? reject(new Error(error.message)) : resolve?.(result ?? params);
     }
 
-    #next(key) {
-        return new Promise((resolve, reject) => this.#waiting.set(key, { resolve, reject }));
-    }
+    #next = (key) => new Promise((resolve, reject) => this.#waiting.set(key, { resolve, reject }));
 
     ask(method, params = {}) {
-        const id = ++this.#lastId;
-        this.#browser.stdio[3].write(JSON.stringify({ id, method, params, sessionId: this.#session }) + "\0");
-        return this.#next(id);
+        const message = { id: ++this.#lastId, method, params, sessionId: this.#session };
+        this.#browser.stdio[3].write(JSON.stringify(message) + "\0");
+        return this.#next(message.id);
     }
 
     async goto(url) {
@@ -78,9 +71,8 @@ export class Page {
         await loaded;
     }
 
-    // The value of an expression, or of a function with arguments, in the page.
-    async evaluate(code, ...args) {
-        const expression = typeof code === "string" ? code : `(${code})(...${JSON.stringify(args)})`;
+    // The value of an expression in the page.
+    async evaluate(expression) {
         const { result, exceptionDetails: fault } = await this.ask("Runtime.evaluate",
             { expression, awaitPromise: true, returnByValue: true, userGesture: true });
         if (fault) {
@@ -89,30 +81,19 @@ export class Page {
         return result.value;
     }
 
-    // Waits for something true, also across pages.
-    async until(code, ...args) {
-        for (const end = Date.now() + 10000; Date.now() < end;) {
-            if (await this.evaluate(code, ...args).catch(() => false)) {
-                return;
+    // Waits until an expression is true, also across pages.
+    async until(expression) {
+        for (const end = Date.now() + 10000; !(await this.evaluate(expression).catch(() => false));) {
+            if (Date.now() > end) {
+                throw new Error(`never true: ${expression}`);
             }
-            await new Promise((resolve) => setTimeout(resolve, 10));
         }
-        throw new Error(`never true: ${code} ${JSON.stringify(args)}`);
     }
 
     async press(key, modifiers = 0) {
-        const params = { key, code: key, windowsVirtualKeyCode: keyCodes[key], modifiers, text: keyTexts[key] };
-        await this.ask("Input.dispatchKeyEvent", { type: "keyDown", ...params });
-        await this.ask("Input.dispatchKeyEvent", { ...params, type: "keyUp" });
-    }
-
-    async picture() {
-        return Buffer.from((await this.ask("Page.captureScreenshot")).data, "base64");
-    }
-
-    // Gives the window a size in CSS pixels, and the reader a liking for light or dark.
-    async setWindow(width, height, scheme = "light", deviceScaleFactor = 1) {
-        await this.ask("Emulation.setDeviceMetricsOverride", { width, height, deviceScaleFactor, mobile: false });
-        await this.ask("Emulation.setEmulatedMedia", { features: [{ name: "prefers-color-scheme", value: scheme }] });
+        const [windowsVirtualKeyCode, text] = keys[key];
+        for (const type of ["keyDown", "keyUp"]) {
+            await this.ask("Input.dispatchKeyEvent", { type, key, code: key, windowsVirtualKeyCode, modifiers, text });
+        }
     }
 }
