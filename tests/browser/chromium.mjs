@@ -1,4 +1,5 @@
 // Drives a headless Chromium over a pipe: no port is opened, and the browser ends with this program.
+import assert from "node:assert/strict";
 import { spawn } from "node:child_process";
 import { existsSync, mkdtempSync, rmSync } from "node:fs";
 import { tmpdir } from "node:os";
@@ -21,7 +22,7 @@ export class Page {
 
     static async open() {
         const page = new Page();
-        page.#read(page.#browser.stdio[4].setEncoding("utf8"));
+        page.#read();
         const { targetId } = await page.ask("Target.createTarget", { url: "about:blank" });
         page.#session = (await page.ask("Target.attachToTarget", { targetId, flatten: true })).sessionId;
         await Promise.all(["Page", "Runtime", "Network", "Log"].map((domain) => page.ask(`${domain}.enable`)));
@@ -34,9 +35,9 @@ export class Page {
         rmSync(this.#profile, { recursive: true, force: true, maxRetries: 5 });
     }
 
-    async #read(stream) {
+    async #read() {
         let rest = "";
-        for await (const text of stream) {
+        for await (const text of this.#browser.stdio[4].setEncoding("utf8")) {
             const messages = (rest + text).split("\0");
             rest = messages.pop();
             messages.forEach((message) => this.#take(JSON.parse(message)));
@@ -44,13 +45,10 @@ export class Page {
     }
 
     #take({ id, method, params, result, error }) {
-        if (method === "Runtime.exceptionThrown") {
-            this.errors.push(params.exceptionDetails.exception?.description ?? params.exceptionDetails.text);
-        } else if (method === "Log.entryAdded" && params.entry.level === "error") {
-            this.errors.push(`${params.entry.text} ${params.entry.url ?? ""}`);
-        } else if (method === "Network.requestWillBeSent") {
-            this.requests.push(params.request.url);
-        }
+        const { exceptionDetails, entry, request } = params ?? {};
+        exceptionDetails && this.errors.push(exceptionDetails.exception?.description ?? exceptionDetails.text);
+        entry?.level === "error" && this.errors.push(`${entry.text} ${entry.url}`);
+        method === "Network.requestWillBeSent" && this.requests.push(request.url);
         const { resolve, reject } = this.#waiting.get(id ?? method) ?? {};
         this.#waiting.delete(id ?? method);
         error ? reject(new Error(error.message)) : resolve?.(result ?? params);
@@ -66,27 +64,21 @@ export class Page {
 
     async goto(url) {
         [this.errors, this.requests] = [[], []];
-        const loaded = this.#next("Page.loadEventFired");
-        await this.ask("Page.navigate", { url });
-        await loaded;
+        await Promise.all([this.#next("Page.loadEventFired"), this.ask("Page.navigate", { url })]);
     }
 
     // The value of an expression in the page.
     async evaluate(expression) {
         const { result, exceptionDetails: fault } = await this.ask("Runtime.evaluate",
             { expression, awaitPromise: true, returnByValue: true, userGesture: true });
-        if (fault) {
-            throw new Error(`${expression}: ${fault.exception?.description ?? fault.text}`);
-        }
+        assert(!fault, `${expression}: ${fault?.exception?.description}`);
         return result.value;
     }
 
     // Waits until an expression is true, also across pages.
     async until(expression) {
         for (const end = Date.now() + 10000; !(await this.evaluate(expression).catch(() => false));) {
-            if (Date.now() > end) {
-                throw new Error(`never true: ${expression}`);
-            }
+            assert(Date.now() < end, `never true: ${expression}`);
         }
     }
 
