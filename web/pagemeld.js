@@ -9,8 +9,7 @@
     "use strict";
 
     const RESULTS_AT_ONCE = 30;
-    const EXCERPT_LENGTH = 300;
-    const LEAD_LENGTH = 80; // of an excerpt, before the first word found
+    const [EXCERPT_LENGTH, LEAD_LENGTH] = [300, 80]; // the lead comes before the first word found
     const LETTER = "[\\p{L}\\p{M}\\p{N}_]";
     const WORDS = new RegExp(`${LETTER}+`, "gu");
 
