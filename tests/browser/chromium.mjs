@@ -1,11 +1,9 @@
 // Drives a headless Chromium over a pipe: no port is opened, and the browser ends with this program.
 import assert from "node:assert/strict";
 import { spawn } from "node:child_process";
-import { existsSync, mkdtempSync, rmSync } from "node:fs";
+import { mkdtempSync, rmSync } from "node:fs";
 import { tmpdir } from "node:os";
-import path from "node:path";
 
-export const program = ["/usr/bin/chromium", "/usr/bin/chromium-browser"].find(existsSync);
 const flags = ["--headless", "--remote-debugging-pipe", "--disable-gpu", "--disable-quic", "--no-first-run",
     "--disable-background-networking", "--disable-component-update", "--disable-sync",
     ...(process.getuid() === 0 ? ["--no-sandbox"] : [])];
@@ -13,8 +11,8 @@ const keys = { Tab: [9], Enter: [13, "\r"], Escape: [27], ArrowUp: [38], ArrowDo
 
 // One page, in a browser with a profile of its own. Collects the errors and the requests since it went somewhere.
 export class Page {
-    #profile = mkdtempSync(path.join(tmpdir(), "pagemeld-chromium-"));
-    #browser = spawn(program, [...flags, `--user-data-dir=${this.#profile}`],
+    #profile = mkdtempSync(`${tmpdir()}/pagemeld-chromium-`);
+    #browser = spawn("chromium", [...flags, `--user-data-dir=${this.#profile}`],
         { stdio: ["ignore", "ignore", "ignore", "pipe", "pipe"] });
     #waiting = new Map(); // who waits for the answer with a number, or for an event
     #lastId = 0;
@@ -83,9 +81,8 @@ export class Page {
     }
 
     async press(key, modifiers = 0) {
-        const [windowsVirtualKeyCode, text] = keys[key];
-        for (const type of ["keyDown", "keyUp"]) {
-            await this.ask("Input.dispatchKeyEvent", { type, key, code: key, windowsVirtualKeyCode, modifiers, text });
-        }
+        const params = { key, code: key, windowsVirtualKeyCode: keys[key][0], text: keys[key][1], modifiers };
+        await this.ask("Input.dispatchKeyEvent", { type: "keyDown", ...params });
+        await this.ask("Input.dispatchKeyEvent", { type: "keyUp", ...params });
     }
 }
