@@ -65,7 +65,6 @@ export class Page {
         await Promise.all([this.#next("Page.loadEventFired"), this.ask("Page.navigate", { url })]);
     }
 
-    // The value of an expression in the page.
     async evaluate(expression) {
         const { result, exceptionDetails: fault } = await this.ask("Runtime.evaluate",
             { expression, awaitPromise: true, returnByValue: true, userGesture: true });

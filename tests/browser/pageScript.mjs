@@ -1,17 +1,14 @@
-// Tests the page script in a real browser, as files and over HTTP: node pageScript.mjs PAGEMELD
+// Tests the page script in a real browser, as files and over HTTP: node tests/browser/pageScript.mjs PAGEMELD
 //
 // On the example modules and one more, whose names and pages are awkward. Ends with status 1 at the first fault.
 import assert from "node:assert/strict";
 import { execFileSync, spawn } from "node:child_process";
-import { once } from "node:events";
 import fs from "node:fs";
 import { tmpdir } from "node:os";
 import path from "node:path";
-import { fileURLToPath, pathToFileURL } from "node:url";
 import { Page } from "./chromium.mjs";
 
 const root = fs.mkdtempSync(path.join(tmpdir(), "pagemeld-site-"));
-const [examples, web] = ["examples", "web"].map((name) => fileURLToPath(new URL(`../../${name}`, import.meta.url)));
 const sea = "Größe der See/Manual";
 const tag = '<script src="../../docdata/pagemeld.js" defer="defer"></script>';
 const image = "<img src=x onerror=alert(1)> \"pitch\"";
@@ -42,18 +39,16 @@ const pages = {
     ...Object.fromEntries(waves.map((wave) => [wave, ""])),
 };
 
-function makeSite() {
-    fs.cpSync(examples, root, { recursive: true });
-    for (const [name, text] of Object.entries(pages)) {
-        fs.mkdirSync(path.dirname(path.join(root, sea, name)), { recursive: true });
-        fs.writeFileSync(path.join(root, sea, name), text);
-    }
-    [`${sea}/shared`, `${sea}/docdata`, "charts/Manual/docdata", "telemetry/Manual/docdata"].forEach((folder) =>
-        fs.cpSync(web, path.join(root, folder), { recursive: true }));
-    execFileSync(process.argv[2], ["-autopaths", root], { stdio: "ignore" });
-    fs.writeFileSync(path.join(root, "telemetry/Manual/docdata/global_index.js"), "pages = [");
-    fs.rmSync(path.join(root, "telemetry/Manual/docdata/global_toc.js"));
+fs.cpSync("examples", root, { recursive: true });
+for (const [name, text] of Object.entries(pages)) {
+    fs.mkdirSync(path.dirname(path.join(root, sea, name)), { recursive: true });
+    fs.writeFileSync(path.join(root, sea, name), text);
 }
+[`${sea}/shared`, `${sea}/docdata`, "charts/Manual/docdata", "telemetry/Manual/docdata"].forEach((folder) =>
+    fs.cpSync("web", path.join(root, folder), { recursive: true }));
+execFileSync(process.argv[2], ["-autopaths", root], { stdio: "ignore" });
+fs.writeFileSync(path.join(root, "telemetry/Manual/docdata/global_index.js"), "pages = [");
+fs.rmSync(path.join(root, "telemetry/Manual/docdata/global_toc.js"));
 
 const page = await Page.open();
 const $ = (selector) => `document.querySelector("#pagemeld ${selector}")`;
@@ -89,15 +84,14 @@ const queries = [ // what is searched for, what is said, the titles of the first
     ["PITCH", "2 pages found", [image, "Rolling"]], // in the title, then elsewhere
     ["roll", "3 pages found", ["Roll", "Rolling", image]], // whole in the title, as a prefix there, elsewhere
     ["pitching thes", "1 page found", ["Rolling"]], // in two texts, the last a prefix
-    ["pit roll", "Nothing found", []], // only the last is a prefix
+    ["__proto__ hasOwnProperty", "Nothing found", []], ["pit roll", "Nothing found", []], // only the last is a prefix
     ["rolling the", "1 page found", ["Rolling"]], // a common word that may become "thesis"
     ["wave the", "40 pages found", ["Wave 1", "Wave 2", "Wave 3", "Wave 4"]], // and one that is left out
-    ["the a ", "Only common words, which are not searched for", []],
     ["r", "3 pages found", ["The \"tide rose\"", "Charts", "Your first chart"], "charts"], // of one module
-    ["__proto__ hasOwnProperty", "Nothing found", []], ["roll constructor", "1 page found", [image]],
+    ["the a ", "Only common words, which are not searched for", []], ["roll constructor", "1 page found", [image]],
 ];
 const keys = [ // what is done first, the key and its modifiers, where the focus is then
-    ["document.title = 'taken'", ["/"], "body"], ["document.title = ''", ["/", 2], "body"],
+    ["document.activeElement.blur(); document.title = 'taken'", ["/"], "body"], ["document.title = ''", ["/", 2], "body"],
     ["document.querySelector('textarea').focus()", ["/"], "textarea"],
     ["document.activeElement.blur()", ["/", 8], "input"],
     ["document.execCommand('insertText', 0, 'wave')", ["ArrowDown"], "Wave 1"], ["", ["ArrowDown"], "Wave 2"],
@@ -128,12 +122,10 @@ const rows = { // by the page, and what else tells them apart
     },
     [`${sea}/far/off/hostile.html?keys`]: async () => {
         await search("");
-        await page.evaluate("document.activeElement.blur()");
         for (const [before, key, focus] of keys) {
             await page.evaluate(before);
             await page.press(...key);
-            const focused = "document.activeElement.text || document.activeElement.localName";
-            await expect(`["${before}", ${focused}]`, [before, focus]);
+            await expect(`["${before}", document.activeElement.text || document.activeElement.localName]`, [before, focus]);
         }
         await expect(`${$("input")}.value + document.querySelector("textarea").value + ${found}`, "/");
     },
@@ -141,8 +133,7 @@ const rows = { // by the page, and what else tells them apart
         const lines = `${$("nav")}.innerText.split(/\\s*\\n\\s*/).slice(0, 5)`;
         await expect(lines, ["Contents", "Brackwater Manual", "Getting started", "Roll", "Pitch"]);
         await expect(`[${$("[aria-current=page]")}.text, ${all("nav li", "text")}.length]`, ["Pitch", 12]);
-        await page.evaluate(`${$("nav button")}.click()`);
-        await expect(lines, ["Contents"]);
+        await expect(`${$("nav button")}.click() ?? ${lines}`, ["Contents"]);
     },
     "telemetry/Manual/index.html": async () => {
         await page.until(`${$("input")}.focus() ?? ${status} === "Search is not available: global_index.js did not run"`);
@@ -152,11 +143,10 @@ const rows = { // by the page, and what else tells them apart
     [`${sea}/far/off/frames.html`]: () => expect("document.querySelector('#pagemeld, iframe, link')", null),
 };
 
-makeSite();
 const server = spawn("python3", ["-um", "http.server", "--bind", "127.0.0.1", "--directory", root, "0"]);
 try {
-    const [line] = await once(server.stdout, "data");
-    for (const base of [`${pathToFileURL(root)}/`, /http:[^)]+/.exec(line)[0]]) {
+    const line = await new Promise((resolve) => server.stdout.once("data", resolve));
+    for (const base of [`file://${root}/`, /http:[^)]+/.exec(line)[0]]) {
         for (const [name, check] of Object.entries(rows)) {
             console.log(base + name);
             await page.goto(base + encodeURI(name));
