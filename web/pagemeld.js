@@ -1,21 +1,20 @@
 // Search and contents of all combined modules, in a documentation page.
 //
-// A page may be opened from a folder on disk, where nothing can be fetched, so the outputs run as classic scripts.
-// They assign globals, which a page's own "const p0" would make a syntax error. So each runs in a hidden frame,
-// which is removed once its values are taken. The contents wait until the page is idle, the search index until the
-// reader turns to the box: a script of 35 MB takes half a second. Titles and texts enter the page as text only.
+// Nothing can be fetched in a page opened from a folder on disk, so the outputs run as classic scripts. A page's own
+// "const p0" would make their globals a syntax error, so each runs in a hidden frame, removed once its values are
+// taken. The contents wait until the page is idle, the search index, half a second of work for 35 MB, until the
+// reader turns to the box. Titles and texts enter the page as text only.
 
 (function () {
     "use strict";
 
     const RESULTS_AT_ONCE = 30;
-    const EXCERPT_LENGTH = 300;
-    const LEAD_LENGTH = 80; // of an excerpt, before the first word found
+    const [EXCERPT_LENGTH, LEAD_LENGTH] = [300, 80]; // the lead comes before the first word found
     const LETTER = "[\\p{L}\\p{M}\\p{N}_]";
+    const WORDS = new RegExp(`${LETTER}+`, "gu");
 
-    const { document, history, Event, Map, Set, URL } = window; // whatever the page's scripts call so
-    const tag = document.currentScript;
-    // A <base> after the tag had no part in finding this script.
+    const { document, history, Map, Set, URL } = window; // whatever the page's scripts call so
+    const tag = document.currentScript; // a <base> after it had no part in finding it
     const isBeforeBase = document.querySelector("base[href]")?.compareDocumentPosition(tag) & 2;
     const ownAddress = isBeforeBase ? new URL(tag.getAttribute("src"), document.URL) : tag.src;
     const shared = tag.dataset.docdata?.replace(/\/?$/, "/");
@@ -31,8 +30,8 @@
     const finder = create("div", {}, form, status, results, more);
     const contents = create("div", { class: "pagemeld-contents" });
     const contentsButton = createButton("Contents", contents);
-    const nav = create("nav", { "aria-label": "Contents" }, contentsButton, contents);
-    const view = create("div", { class: "pagemeld-view", hidden: "" }, finder, nav);
+    const view = create("div", { class: "pagemeld-view", hidden: "" },
+        finder, create("nav", { "aria-label": "Contents" }, contentsButton, contents));
 
     let index = null; // until it is loaded
     let found = { pages: [] };
@@ -70,13 +69,12 @@
         return values;
     }
 
-    // Names on disk need not be UTF-8.
-    const decode = (text) => { try { return decodeURIComponent(text); } catch { return text; } };
+    const decode = (text) => { try { return decodeURIComponent(text); } catch { return text; } }; // not UTF-8
     const encode = (path, special) => path.replace(special, encodeURIComponent);
     const prefixOf = (link, prefixes) => prefixes.find((prefix) => link.startsWith(prefix)) || "";
 
-    // A link is a path on disk, in which only "#" has its meaning of an address. The outputs put the prefix
-    // before whole addresses too; "std::list.html" is none, and a script is none for readers to follow.
+    // A link is a path on disk, in which only "#" has a meaning. The outputs put the prefix before whole addresses
+    // too; "std::list.html" is none, and a script is none for readers to follow.
     function addressOf(link, prefixes) {
         const prefix = prefixOf(link, prefixes);
         const rest = link.slice(prefix.length);
@@ -91,30 +89,24 @@
     const createLink = (link, title, prefixes) =>
         create("a", { href: addressOf(link, prefixes), target: "_self" }, title.trim() || link);
 
-    const wordsOf = (text) => text.toLowerCase().match(new RegExp(`${LETTER}+`, "gu")) || [];
+    const wordsOf = (text) => text.toLowerCase().match(WORDS) || [];
 
     // The name of the module folder: ".../charts/Manual/" is of "charts".
     const moduleName = (prefix) => decode(new URL(addressOf(prefix, [prefix])).pathname.split("/").at(-3) ?? "");
     const moduleOf = (page) => index.modules.get(prefixOf(index.pages[page][0], index.prefixes));
 
-    // What a search needs beside the lists themselves. Of pages with the same path the first stands for all.
+    // What a search needs beside the lists themselves.
     function orderIndex(lists) {
-        const { pages, info, searchIndex, prefixes } = lists;
-        const firstPages = new Map();
         const titles = new Map();
-        pages.forEach(([path, title], page) => {
-            firstPages.has(path) || firstPages.set(path, page);
-            for (const word of wordsOf(title)) {
-                titles.has(word) || titles.set(word, []);
-                titles.get(word).push(firstPages.get(path));
-            }
-        });
+        lists.pages.forEach(([, title], page) => wordsOf(title).forEach((word) => {
+            titles.has(word) ? titles.get(word).push(page) : titles.set(word, [page]);
+        }));
         return {
             ...lists,
             titles,
-            words: [...new Set(Object.keys(searchIndex).concat([...titles.keys()]))],
-            pageOfText: info.map(([, page]) => firstPages.get(pages[page][0])),
-            modules: new Map(["", ...prefixes].map((prefix) => [prefix, moduleName(prefix)])),
+            words: [...Object.keys(lists.searchIndex), ...titles.keys()],
+            pageOfText: new Int32Array(lists.info.map(([, page]) => page)),
+            modules: new Map(["", ...lists.prefixes].map((prefix) => [prefix, moduleName(prefix)])),
         };
     }
 
@@ -135,20 +127,25 @@
     }
 
     // The pages that hold every word, those with the larger sum of marks first, then in their own order; and of
-    // each page the text that holds most of the words.
+    // each page the text that holds most words. There are many texts, hence the plain loops.
     function search(words) {
-        const scores = new Float64Array(index.pages.length);
-        const counts = new Uint16Array(index.info.length);
+        const { pages: { length }, pageOfText } = index;
+        const scores = new Float64Array(length);
+        const bestTexts = new Int32Array(length).fill(-1);
+        const counts = new Uint16Array(pageOfText.length);
         words.forEach((word, i) => {
             const { texts, pages } = lookUp(word, i === words.length - 1);
-            texts.forEach((mark, text) => { counts[text] += mark; });
+            for (let text = 0; text < texts.length; text++) {
+                counts[text] += texts[text];
+            }
             pages.forEach((mark, page) => { scores[page] += mark || -Infinity; });
         });
-        const [ranks, bestTexts] = [[], []];
+        for (let text = 0; text < counts.length; text++) {
+            const page = pageOfText[text];
+            bestTexts[page] = counts[text] <= counts[bestTexts[page]] ? bestTexts[page] : text;
+        }
+        const ranks = [];
         scores.forEach((score, page) => score > 0 && (ranks[score] ??= []).push(page));
-        index.pageOfText.forEach((page, text) => {
-            bestTexts[page] = counts[text] > (counts[bestTexts[page]] ?? -1) ? text : bestTexts[page];
-        });
         return { words, pages: ranks.reverse().flat(), bestTexts };
     }
 
@@ -187,8 +184,8 @@
     }
 
     function describeFound({ isCommonOnly, words, pages: { length: count } }) {
-        return isCommonOnly ? "Only common words, which are not searched for"
-            : !words ? "" : count === 0 ? "Nothing found" : count === 1 ? "1 page found" : `${count} pages found`;
+        return isCommonOnly ? "Only common words, which are not searched for" : !words ? ""
+            : count === 0 ? "Nothing found" : count === 1 ? "1 page found" : `${count} pages found`;
     }
 
     function update() {
@@ -202,9 +199,9 @@
     }
 
     async function loadIndex() {
+        box.onfocus = null;
         status.textContent = "Loading the search index";
-        const globals = ["pages", "info", "common", "searchIndex"];
-        const lists = await runOutput("global_index.js", globals, "Search is", status);
+        const lists = await runOutput("global_index.js", ["pages", "info", "common", "searchIndex"], "Search is", status);
         if (lists) {
             index = orderIndex(lists);
             const names = [...new Set(index.prefixes.map((prefix) => index.modules.get(prefix)))].sort();
@@ -248,7 +245,7 @@
         };
     }
 
-    // The nodes from a list down to the first whose link passes the test, or null.
+    // The nodes down to the first whose link passes the test, or null.
     function findWay(nodes, test) {
         for (const node of nodes || []) {
             const below = test(node.link) ? [] : findWay(node.children, test);
@@ -259,7 +256,7 @@
         return null;
     }
 
-    // The entries of a list. Of the nodes on the way to the page all are opened but the last, which is the page.
+    // The entries of a list. Those on the way to the page are opened, but for the last, which is the page.
     function createEntries(nodes, way, prefixes) {
         return nodes.map((node) => {
             const { link, title, children } = node;
@@ -272,8 +269,8 @@
                 return create("li", {}, name);
             }
             const list = create("ul", {});
-            const fill = () => list.append(...createEntries(children, way, prefixes));
-            const button = createButton(isLink ? "" : name, list, fill);
+            const button = createButton(isLink ? "" : name, list,
+                () => list.append(...createEntries(children, way, prefixes)));
             isLink && button.setAttribute("aria-label", `Below ${title}`);
             way.slice(0, -1).includes(node) && button.click();
             return create("li", {}, button, isLink ? name : "", list);
@@ -287,9 +284,9 @@
             const isPage = createPageTest(prefixes);
             const way = findWay(toc.children, (link) => !link.includes("#") && isPage(link)) ??
                 findWay(toc.children, isPage) ?? [];
-            const list = create("ul", {}, ...createEntries(toc.children, way, prefixes));
-            contents.append(create("p", {}, toc.title), list);
-            const current = list.querySelector("[aria-current]");
+            const entries = createEntries(toc.children, way, prefixes);
+            contents.append(create("p", {}, toc.title), create("ul", {}, ...entries));
+            const current = contents.querySelector("[aria-current]");
             contents.scrollTop = current ? current.offsetTop - contents.clientHeight / 2 : 0;
         }
     }
@@ -327,29 +324,32 @@
     function listen() {
         addEventListener("keydown", onPageKey);
         finder.addEventListener("keydown", onFinderKey);
-        box.addEventListener("focus", loadIndex, { once: true });
-        box.addEventListener("input", update);
-        box.addEventListener("blur", keepQuery);
-        filter.addEventListener("change", update);
-        more.addEventListener("click", () => showMore().querySelector("a").focus());
-        results.addEventListener("click", keepQuery);
-        form.addEventListener("submit", (event) => {
-            event.preventDefault();
-            results.querySelector("a")?.click();
-        });
+        box.onfocus = loadIndex;
+        box.oninput = filter.onchange = update;
+        box.onblur = results.onclick = keepQuery;
+        more.onclick = () => showMore().querySelector("a").focus();
+        form.onsubmit = () => { results.querySelector("a")?.click(); return false; };
+    }
+
+    // The first thing in the body, or in what fills the window by itself, as javadoc's pages do.
+    function createPlace() {
+        const place = create("div", { id: "pagemeld", class: "pagemeld-top" });
+        const filler = [...document.body.children].find((part) => getComputedStyle(part).position === "fixed" &&
+            part.clientWidth >= innerWidth && part.clientHeight >= innerHeight);
+        (filler ?? document.body).prepend(place);
+        return place;
     }
 
     async function start() {
         if (document.body?.localName !== "body") {
             return; // a frame set
         }
-        const place = document.getElementById("pagemeld") ?? create("div", { id: "pagemeld", class: "pagemeld-top" });
-        place.isConnected || document.body.prepend(place);
+        const place = document.getElementById("pagemeld") ?? createPlace();
         place.append(view);
         listen();
         matchMedia("(min-width: 48em)").matches && contentsButton.click();
         box.value = new URLSearchParams(document.location.search).get("pagemeld") ?? "";
-        box.value && box.dispatchEvent(new Event("focus"));
+        box.value && loadIndex();
         await loaded(create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress) }), place);
         view.hidden = false;
         (window.requestIdleCallback ?? setTimeout)(loadContents);
