@@ -33,8 +33,8 @@ const pages = {
     "far/off/shared.html": '<script src="../../shared/pagemeld.js" defer data-docdata="../../docdata"></script><p>x',
     "far/off/policy.html": `<meta http-equiv="Content-Security-Policy" content="script-src 'self'">${tag}<p>x`,
     "far/off/frames.html": `${tag}<frameset><frame src="about:blank"></frameset>`,
-    "docdata/index.json": JSON.stringify(index), "docdata/toc.json": JSON.stringify(toc),
-    "../ScriptReference/docdata/index.json": "", "../../favicon.ico": "", "50% of? all.html": "", ...Object.fromEntries(waves.map((wave) => [wave, ""])),
+    "docdata/index.json": JSON.stringify(index), "docdata/toc.json": JSON.stringify(toc), "../../favicon.ico": "",
+    "../ScriptReference/docdata/index.json": "", "50% of? all.html": "", ...Object.fromEntries(waves.map((wave) => [wave, ""])),
 };
 
 fs.cpSync("examples", root, { recursive: true });
