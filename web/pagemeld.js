@@ -54,13 +54,12 @@
     const loaded = (element, parent) =>
         new Promise((done) => { element.onload = element.onerror = done; parent.append(element); });
 
-    // A script that throws has a load event too: what it assigned tells whether it ran.
+    // A script that throws has a load event too: what it assigned tells whether it ran. The frame is UTF-8.
     async function runOutput(name, globals, subject, complaint) {
         const frame = create("iframe", {});
         frame.style.display = "none";
         await loaded(frame, view);
         const script = frame.contentDocument.createElement("script");
-        script.charset = "utf-8";
         script.src = new URL(name, docdata);
         await loaded(script, frame.contentDocument.head);
         const values = takeGlobals(frame.contentWindow, globals);
