@@ -1,0 +1,21 @@
+# A Debian package of what is installed: cpack -G DEB. script/package makes and tries the one that is released.
+
+set(CPACK_GENERATOR DEB)
+set(CPACK_PACKAGE_NAME pagemeld)
+set(CPACK_PACKAGE_DESCRIPTION_SUMMARY "combines the search and contents of documentation modules")
+set(CPACK_PACKAGE_DESCRIPTION
+    "Pagemeld joins documentation modules that are built separately. It reads the
+search index and the table of contents of each, merges them, and writes the
+result into every module as JSON and as scripts, so that each page can search
+and browse all modules, from a web server or from a directory on disk.
+
+A checker tells beforehand what would go wrong and where. A CMake function runs
+both in a build.")
+set(CPACK_STRIP_FILES ON)
+set(CPACK_PRE_BUILD_SCRIPTS ${PROJECT_SOURCE_DIR}/packaging/prepare.cmake)
+set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)
+set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
+set(CPACK_DEBIAN_PACKAGE_RECOMMENDS python3) # examples/make-docdata.py
+set(CPACK_DEBIAN_PACKAGE_SECTION devel)
+set(CPACK_DEBIAN_PACKAGE_MAINTAINER "Seed b8a2a2a6 maintainers <maintainers@users.noreply.c-seed-b8a2a2a6.example>")
+include(CPack)
