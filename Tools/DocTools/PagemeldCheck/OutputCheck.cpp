@@ -217,7 +217,10 @@ void CheckOutputs(std::size_t set, const std::vector<SetModule>& modules, Report
         FirstCopy first;
         for (std::size_t i = 0; i < modules.size(); ++i)
         {
-            CheckCopy(output, i, set, modules[i], newestInput, first, report);
+            if (modules[i].hasDocdata) // otherwise output-blocked tells
+            {
+                CheckCopy(output, i, set, modules[i], newestInput, first, report);
+            }
         }
     }
 }
