@@ -121,8 +121,8 @@ private:
             m_findings.AddAtValue("merged-input", page, pointer,
                                   [&]
                                   {
-                                      return "this is an output: page entries name their module, as " +
-                                             DescribeValue(page[2], QuoteSize()) + " does here" +
+                                      return "this is an output: the page entry names its module, " +
+                                             DescribeValue(page[2], QuoteSize()) +
                                              Consequence(InputKind::Index);
                                   });
         }
