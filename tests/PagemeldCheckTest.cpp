@@ -1,14 +1,21 @@
+#include "Tools/DocTools/PagemeldCheck/Rules.h"
+#include "tests/support/NeutralText.h"
 #include "tests/support/RunProgram.h"
 #include "tests/support/WholeFile.h"
 
 #include <gtest/gtest.h>
 
+#include <atomic>
+#include <cctype>
 #include <chrono>
 #include <filesystem>
 #include <string>
+#include <thread>
+#include <utility>
 #include <vector>
 
 #include <sys/stat.h>
+#include <unistd.h>
 
 // What the checker prints, whole. Each row of the table has, for some rules, what breaks them, mostly in
 // module b, and what comes close and is not told, mostly in module a.
@@ -56,10 +63,11 @@ void Apply(const TemporaryFolder& folder, const Change& change)
         fs::last_write_time(path, fs::file_time_type::clock::now() - std::chrono::hours(1));
         return;
     }
+    fs::create_directories(fs::path(path).parent_path());
     fs::remove(path);
     if (change.content == kDirectory)
     {
-        fs::create_directories(path);
+        fs::create_directory(path);
     }
     else if (change.content == kPipe)
     {
@@ -442,4 +450,168 @@ status 1
         }
         EXPECT_EQ(c.output, ReportOfCheck(folder, c.arguments)) << c.arguments.back();
     }
+}
+
+TEST(PagemeldCheck, ShowsHostileNamesEscapedAndSurvivesHostileTrees)
+{
+    const std::string name = "c\n\x1B[1m\xE9\xC2\x9B";
+    const struct
+    {
+        std::vector<std::string> arguments;
+        std::vector<Change> changes;
+        const char* output;
+    } cases[] = {
+        {{"@/" + name},
+         {{name + "/Manual/docdata/toc.json", "7"}},
+         R"(@/c\n\x1B[1m\xE9\u009B/Manual/docdata/index.json: error: is missing beside toc.json; "c\n\x1B[1m\xE9\u009B" will be missing from the search of Manual [unreadable]
+@/c\n\x1B[1m\xE9\u009B/Manual/docdata/toc.json:1:1: error: node is 7, not an object; "c\n\x1B[1m\xE9\u009B" will be missing from the contents of Manual [structure]
+Manual: error: no module has a sound index.json: nothing will be written, and earlier outputs stay [nothing-to-combine]
+1 module, 3 errors, 0 warnings; missing from the search of Manual: c\n\x1B[1m\xE9\u009B; from its contents: c\n\x1B[1m\xE9\u009B
+status 1
+)"},
+        {{"-f", "json", "@/" + name},
+         {{name + "/Manual/docdata/toc.json", "7"}},
+         R"({"level":"error","rule":"unreadable","file":"@/c\n\u001B[1m\\xE9\u009B/Manual/docdata/index.json","module":"@/c\n\u001B[1m\\xE9\u009B","set":"Manual","message":"is missing beside toc.json; \"c\\n\\x1B[1m\\xE9\\u009B\" will be missing from the search of Manual"}
+{"level":"error","rule":"structure","file":"@/c\n\u001B[1m\\xE9\u009B/Manual/docdata/toc.json","line":1,"column":1,"offset":0,"pointer":"","module":"@/c\n\u001B[1m\\xE9\u009B","set":"Manual","message":"node is 7, not an object; \"c\\n\\x1B[1m\\xE9\\u009B\" will be missing from the contents of Manual"}
+{"level":"error","rule":"nothing-to-combine","set":"Manual","message":"no module has a sound index.json: nothing will be written, and earlier outputs stay"}
+{"summary":{"modules":1,"errors":3,"warnings":0,"notes":0,"missing":{"Manual":{"search":["@/c\n\u001B[1m\\xE9\u009B"],"contents":["@/c\n\u001B[1m\\xE9\u009B"]},"ScriptReference":{"search":[],"contents":[]}}}}
+status 1
+)"},
+        {{"@/a/Manual/docdata/toc.json", "@/nowhere", ""}, {}, R"(3 modules, 0 errors, 0 warnings
+status 0
+)"},
+        {{"-d", "@/c"},
+         {{"c/d/Manual", kLink + "c"}, {"c/d/e", kLink + "c/d"}, {"c/f", kLink + "c/f"}},
+         R"(@/c: error: no directory below it has Manual/docdata: nothing will be combined [no-modules]
+0 modules, 1 error, 0 warnings
+status 1
+)"},
+        {{"-ot", "@/a", "@/b"},
+         {{"a/Manual/docdata/index.json", kLink + "a/Manual/docdata/index.json"},
+          {"b/Manual/docdata/toc.json", kPipe},
+          {"b/Manual/docdata/global_toc.js", kDirectory}},
+         R"(@/a/Manual/docdata/global_index.js: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/a/Manual/docdata/global_index.json: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/a/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/a/Manual/docdata/global_toc.json: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/a/Manual/docdata/index.json: error: can't be read; "a" will be missing from the search of Manual [unreadable]
+@/a/Manual/docdata/toc.json:1:9: warning: link "toc" leads to no file [missing-target] /link
+@/b/Manual/docdata/global_index.js: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/b/Manual/docdata/global_index.json: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/b/Manual/docdata/global_toc.js: error: a directory is in the place of the output: the new one stays as .tmp [output-blocked]
+@/b/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/b/Manual/docdata/global_toc.json: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/b/Manual/docdata/toc.json: error: can't be read; "b" will be missing from the contents of Manual [unreadable]
+2 modules, 11 errors, 1 warning; missing from the search of Manual: a; from its contents: b
+status 1
+)"},
+    };
+    for (const auto& c : cases)
+    {
+        const TemporaryFolder folder;
+        WriteSoundModules(folder);
+        for (const Change& change : c.changes)
+        {
+            Apply(folder, change);
+        }
+        EXPECT_EQ(c.output, ReportOfCheck(folder, c.arguments)) << c.arguments.back();
+    }
+}
+
+TEST(PagemeldCheck, TellsWhatAUserMayNotReadOrWrite)
+{
+    const TemporaryFolder folder;
+    WriteSoundModules(folder);
+    fs::permissions(folder / "a/Manual/docdata/index.json", fs::perms::none);
+    fs::permissions(folder / "a/Manual/docdata", fs::perms::owner_read | fs::perms::owner_exec);
+    fs::create_directories(folder / "c/Manual/docdata");
+    fs::permissions(folder / "c/Manual/docdata", fs::perms::none);
+    std::vector<std::string> command = {PAGEMELD_CHECK_PROGRAM, folder / "a", folder / "b", folder / "c"};
+    if (::geteuid() == 0)
+    {
+        command.insert(command.begin(), {"setpriv", "--bounding-set=-dac_override,-dac_read_search"});
+    }
+    const ProgramResult result = RunProgram(command.front(), {command.begin() + 1, command.end()});
+    fs::permissions(folder / "c/Manual/docdata", fs::perms::owner_all);
+    EXPECT_EQ(1, result.status);
+    EXPECT_EQ(
+        R"(@/a/Manual/docdata: error: can't be written to: the run ends here with status 255, and leaves 2 later modules and ScriptReference unwritten [output-blocked]
+@/a/Manual/docdata/index.json: error: can't be read; "a" will be missing from the search of Manual [unreadable]
+@/c/Manual/docdata: error: can't be written to: the run ends here with status 255, and leaves ScriptReference unwritten [output-blocked]
+@/c/Manual/docdata/index.json: error: can't be read; "c" will be missing from the search of Manual [unreadable]
+@/c/Manual/docdata/toc.json: error: can't be read; "c" will be missing from the contents of Manual [unreadable]
+3 modules, 5 errors, 0 warnings; missing from the search of Manual: a, c; from its contents: c
+)",
+        Neutral(result.standardOutput, folder));
+}
+
+TEST(PagemeldCheck, FilesMayVanishWhileItRuns)
+{
+    const TemporaryFolder folder;
+    WriteSoundModules(folder);
+    std::atomic<bool> ends = false;
+    std::thread builder(
+        [&]
+        {
+            while (!ends)
+            {
+                fs::rename(folder / "b/Manual", folder / "b/other");
+                fs::rename(folder / "b/other", folder / "b/Manual");
+            }
+        });
+    for (int run = 0; run < 50; ++run)
+    {
+        const std::string report = ReportOfCheck(folder, {"-t", "-o", "@/a", "@/b"});
+        EXPECT_NE(std::string::npos, report.find("\n2 modules, ")) << report;
+        EXPECT_NE(std::string::npos, report.find("\nstatus 1\n")) << report;
+    }
+    ends = true;
+    builder.join();
+}
+
+TEST(PagemeldCheck, RefusesUnusableCommandLines)
+{
+    const std::string usage = "Usage: pagemeld-check [OPTION]... ROOT...\n"
+                              "       pagemeld-check [OPTION]... --discover=DIR\n"
+                              "Try 'pagemeld-check --help' for more.\nstatus 2\n";
+    const std::pair<std::vector<std::string>, std::string> cases[] = {
+        {{}, "no ROOT is given"},
+        {{"-d", "a", "b"}, "give roots or --discover, not both"},
+        {{"-f", "xml", "a"}, "the format is \"text\" or \"json\""},
+        {{"-n", "", "a"}, "the limit is a number"},
+        {{"-n", "-1", "a"}, "the limit is a number"},
+        {{"-n", "9999999999999999999", "a"}, "the limit is a number"},
+    };
+    const TemporaryFolder folder;
+    for (const auto& [arguments, problem] : cases)
+    {
+        EXPECT_EQ("pagemeld-check: " + problem + "\n" + usage, ReportOfCheck(folder, arguments));
+    }
+    EXPECT_EQ(2, RunProgram(PAGEMELD_CHECK_PROGRAM, {"--colour", "a"}).status);
+    const ProgramResult unknown = RunProgram(PAGEMELD_CHECK_PROGRAM, {"--explain=no-such"});
+    EXPECT_EQ(2, unknown.status);
+    EXPECT_EQ("", unknown.standardOutput);
+    EXPECT_NE(std::string::npos, unknown.standardError.find("\n  no-modules"));
+    EXPECT_EQ(2, RunProgram("sh", {"-c", std::string(PAGEMELD_CHECK_PROGRAM) + " a >/dev/full"}).status);
+}
+
+TEST(PagemeldCheck, ExplainsEveryRuleInHelpAndOnItsPage)
+{
+    const std::string help = RunProgram(PAGEMELD_CHECK_PROGRAM, {"--help"}).standardOutput;
+    const std::string page = ReadWholeFile(RULES_PAGE);
+    std::string expected = page.substr(0, page.find("\n## ") + 1);
+    for (const Rule& rule : AllRules())
+    {
+        const std::string level = NameOf(rule.level);
+        EXPECT_NE(std::string::npos, help.find(level + ": " + rule.meaning + "\n")) << rule.id;
+        const std::string text =
+            level + ": " + rule.meaning + ".\n\n" + rule.consequence + "\n\n" + rule.remedy + "\n";
+        expected += "## `" + std::string(rule.id) + "`\n\n" + static_cast<char>(std::toupper(level[0])) +
+                    text.substr(1) + "\n";
+        EXPECT_EQ(std::string(rule.id) + " (" + level + "): " + rule.meaning + "\n\n" + rule.consequence +
+                      "\n\n" + rule.remedy + "\n",
+                  RunProgram(PAGEMELD_CHECK_PROGRAM, {"-e", rule.id}).standardOutput);
+    }
+    expected.pop_back();
+    EXPECT_EQ(ReplaceAll(expected, "\n", " "), ReplaceAll(page, "\n", " "));
 }

@@ -12,7 +12,8 @@
 namespace
 {
 
-using JsonWriter = rapidjson::Writer<rapidjson::StringBuffer>;
+// In ASCII, so that no control character above it reaches a terminal.
+using JsonWriter = rapidjson::Writer<rapidjson::StringBuffer, rapidjson::UTF8<>, rapidjson::ASCII<>>;
 
 /// Findings without a module come last, those without a set before the sets, a count after what it counts.
 auto OrderOf(const Finding& finding)
