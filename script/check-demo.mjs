@@ -1,8 +1,9 @@
 // Checks the combined example modules as a browser would meet them.
 //
-//     node check-demo.mjs FOLDER MESSAGES
+//     node check-demo.mjs FOLDER MESSAGES FINDINGS
 //
-// FOLDER holds the modules, MESSAGES is the file with what pagemeld said. Both scripts of every module and
+// FOLDER holds the modules, MESSAGES is the file with what pagemeld said, and FINDINGS the one with what
+// pagemeld-check said before. Both scripts of every module and
 // set are evaluated as classic scripts; every link must lead from that module's folder to a page with the
 // title that it promises. Ends with status 1 at the first fault.
 
@@ -15,7 +16,7 @@ const combined = ["acquire", "charts", "logbook"];
 const broken = "telemetry";
 const sharedGroups = { Manual: "Getting started", ScriptReference: "Classes" };
 
-const [folder, messagesFile] = process.argv.slice(2);
+const [folder, messagesFile, findingsFile] = process.argv.slice(2);
 
 function loadScripts(setFolder) {
     const globals = vm.createContext({});
@@ -69,6 +70,19 @@ function checkSet(module, set) {
     return pages.length;
 }
 
+// The checker must find the broken module's two faults in each set, and nothing else.
+function checkFindings(lines) {
+    const faults = Object.keys(sharedGroups).flatMap((set) => [
+        `${folder}/${broken}/${set}/docdata/index.json:6:43: error: [not-json]`,
+        `${folder}/${broken}/${set}/docdata/toc.json: error: [unreadable]`,
+    ]);
+    const missing = Object.keys(sharedGroups).map((set) =>
+        `from the search of ${set}: ${broken}; from its contents: ${broken}`);
+    assert.deepEqual(lines.map((line) => line.replace(/error: .* \[/, "error: [")), [
+        ...faults, `4 modules, ${faults.length} errors, 0 warnings; missing ${missing.join("; ")}`, ""]);
+}
+
+checkFindings(readFileSync(findingsFile, "utf8").split("\n"));
 const messages = readFileSync(messagesFile, "utf8");
 for (const set of Object.keys(sharedGroups)) {
     const index = path.join(folder, broken, set, "docdata/index.json");

@@ -10,6 +10,26 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
+namespace
+{
+
+std::string ReportOf(const char* program, const TemporaryFolder& folder,
+                     const std::vector<std::string>& arguments)
+{
+    std::vector<std::string> fullArguments;
+    fullArguments.reserve(arguments.size());
+    for (const std::string& argument : arguments)
+    {
+        fullArguments.push_back(ReplaceAll(argument, "@", folder.Path()));
+    }
+    const ProgramResult result = RunProgram(program, fullArguments);
+    const std::string report =
+        result.standardOutput + result.standardError + "status " + std::to_string(result.status) + "\n";
+    return Neutral(report, folder);
+}
+
+} // namespace
+
 ProgramResult RunProgram(const std::string& program, const std::vector<std::string>& arguments)
 {
     const TemporaryFolder folder;
@@ -42,14 +62,10 @@ ProgramResult RunProgram(const std::string& program, const std::vector<std::stri
 
 std::string ReportOfRun(const TemporaryFolder& folder, const std::vector<std::string>& arguments)
 {
-    std::vector<std::string> fullArguments;
-    fullArguments.reserve(arguments.size());
-    for (const std::string& argument : arguments)
-    {
-        fullArguments.push_back(ReplaceAll(argument, "@", folder.Path()));
-    }
-    const ProgramResult result = RunProgram(PAGEMELD_PROGRAM, fullArguments);
-    const std::string report =
-        result.standardOutput + result.standardError + "status " + std::to_string(result.status) + "\n";
-    return ReplaceAll(Neutral(report, folder), PAGEMELD_PROGRAM, "PROGRAM");
+    return ReplaceAll(ReportOf(PAGEMELD_PROGRAM, folder, arguments), PAGEMELD_PROGRAM, "PROGRAM");
+}
+
+std::string ReportOfCheck(const TemporaryFolder& folder, const std::vector<std::string>& arguments)
+{
+    return ReportOf(PAGEMELD_CHECK_PROGRAM, folder, arguments);
 }

@@ -1,30 +1,11 @@
 #include "Tools/DocTools/PagemeldCheck/FileFindings.h"
 
-void FileFindings::AddAtValue(const char* rule, const rapidjson::Value& value, const JsonPointer& pointer,
-                              const Wording& wording)
+void FileFindings::AddAtOffset(const char* rule, std::size_t offset, std::string message)
 {
     if (Item* item = AddItem(rule))
     {
-        item->finding.message = wording();
-        item->finding.pointer = pointer.Text();
-        item->value = &value;
-    }
-}
-
-void FileFindings::AddAtOffset(const char* rule, std::size_t offset, const Wording& wording)
-{
-    if (Item* item = AddItem(rule))
-    {
-        item->finding.message = wording();
+        item->finding.message = std::move(message);
         item->offset = offset;
-    }
-}
-
-void FileFindings::Add(const char* rule, const Wording& wording)
-{
-    if (Item* item = AddItem(rule))
-    {
-        item->finding.message = wording();
     }
 }
 

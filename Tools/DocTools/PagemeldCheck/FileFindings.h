@@ -3,9 +3,9 @@
 #include "Tools/DocTools/PagemeldCheck/Report.h"
 #include "Tools/DocTools/VantorPagemeld/Check/StructureFault.h"
 
-#include <functional>
 #include <map>
 #include <string>
+#include <string_view>
 #include <vector>
 
 /// Where a file belongs, and how much of its findings is shown.
@@ -23,21 +23,26 @@ struct FileScope
 class FileFindings
 {
 public:
-    using Wording = std::function<std::string()>;
-
     explicit FileFindings(FileScope scope) : m_scope(std::move(scope)) {}
 
     [[nodiscard]] const FileScope& Scope() const { return m_scope; }
 
-    /// Adds what is wrong with a value. It must live, and stay in place, until HandTo.
+    /// Adds what is wrong with a value, in the words that wording() returns. The value must live, and stay in
+    /// place, until HandTo.
+    template <typename Wording>
     void AddAtValue(const char* rule, const rapidjson::Value& value, const JsonPointer& pointer,
-                    const Wording& wording);
+                    const Wording& wording)
+    {
+        if (Item* item = AddItem(rule))
+        {
+            item->finding.message = wording();
+            item->finding.pointer = pointer.Text();
+            item->value = &value;
+        }
+    }
 
     /// Adds what is wrong at a byte of the text.
-    void AddAtOffset(const char* rule, std::size_t offset, const Wording& wording);
-
-    /// Adds what is wrong with the file as a whole.
-    void Add(const char* rule, const Wording& wording);
+    void AddAtOffset(const char* rule, std::size_t offset, std::string message);
 
     /// Hands all findings to the report, after looking up the lines of those that have a place. document is
     /// what text holds; null where no finding has a value.
@@ -57,5 +62,5 @@ private:
 
     FileScope m_scope;
     std::vector<Item> m_items;
-    std::map<std::string, std::size_t> m_counts; // by rule
+    std::map<std::string_view, std::size_t> m_counts; // by rule
 };

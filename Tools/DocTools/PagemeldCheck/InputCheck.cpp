@@ -40,18 +40,14 @@ public:
         if (invalid != std::string_view::npos)
         {
             m_findings.AddAtOffset("invalid-utf8", invalid,
-                                   [&] {
-                                       return "byte " + Visible(seen.substr(invalid, 1)) +
-                                              " is no UTF-8: readers see a replacement character";
-                                   });
+                                   "byte " + Visible(seen.substr(invalid, 1)) +
+                                       " is no UTF-8: readers see a replacement character");
         }
-        if (seen.size() < size)
+        if (seen.size() + 1 < size)
         {
             m_findings.AddAtOffset("text-after-nul", seen.size(),
-                                   [&] {
-                                       return "a NUL byte: the " + std::to_string(size - seen.size() - 1) +
-                                              " bytes after it are not seen";
-                                   });
+                                   "a NUL byte ends the text; bytes after it that are not seen: " +
+                                       std::to_string(size - seen.size() - 1));
         }
     }
 
@@ -59,7 +55,7 @@ public:
                        const rapidjson::ParseResult& failure)
     {
         m_findings.AddAtOffset("not-json", failure.Offset(),
-                               [&] { return DescribeParseFailure(seen, size, failure) + Consequence(kind); });
+                               DescribeParseFailure(seen, size, failure) + Consequence(kind));
     }
 
     /// Returns whether the tool takes the document.
@@ -125,8 +121,8 @@ private:
             m_findings.AddAtValue("merged-input", page, pointer,
                                   [&]
                                   {
-                                      return "this is an output: page entries name their module, as " +
-                                             DescribeValue(page[2], QuoteSize()) + " does here" +
+                                      return "this is an output: the page entry names its module, " +
+                                             DescribeValue(page[2], QuoteSize()) +
                                              Consequence(InputKind::Index);
                                   });
         }

@@ -54,9 +54,15 @@ mode_t ModeOf(const std::string& path)
 
 std::string EndOfRun(std::size_t laterModules, std::size_t set)
 {
-    std::string text = "the run ends here with status 255, and leaves " + std::to_string(laterModules) +
-                       " later module" + (laterModules == 1 ? "" : "s");
-    return text + (set == 0 ? " and ScriptReference unwritten" : " unwritten");
+    std::string unwritten = laterModules == 0   ? ""
+                            : laterModules == 1 ? "1 later module"
+                                                : std::to_string(laterModules) + " later modules";
+    if (set == 0)
+    {
+        unwritten += (unwritten.empty() ? "" : " and ") + std::string(kSetNames[1]);
+    }
+    return "the run ends here with status 255" +
+           (unwritten.empty() ? "" : ", and leaves " + unwritten + " unwritten");
 }
 
 /// Returns why nothing can be written into the directory, or an empty text.
@@ -217,7 +223,10 @@ void CheckOutputs(std::size_t set, const std::vector<SetModule>& modules, Report
         FirstCopy first;
         for (std::size_t i = 0; i < modules.size(); ++i)
         {
-            CheckCopy(output, i, set, modules[i], newestInput, first, report);
+            if (modules[i].hasDocdata) // otherwise output-blocked tells
+            {
+                CheckCopy(output, i, set, modules[i], newestInput, first, report);
+            }
         }
     }
 }

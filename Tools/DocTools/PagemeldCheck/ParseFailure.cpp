@@ -6,6 +6,7 @@
 
 #include <rapidjson/error/en.h>
 
+#include <cctype>
 #include <cstring>
 
 namespace
@@ -114,8 +115,9 @@ std::string DescribeParseFailure(std::string_view text, std::size_t size,
     {
         cause = rapidjson::GetParseError_En(failure.Code());
         cause.erase(cause.find_last_not_of('.') + 1);
+        cause[0] = static_cast<char>(std::tolower(cause[0]));
     }
-    const std::string found = failure.Offset() < text.size() ? Quoted(text.substr(failure.Offset(), 12), 12)
-                                                             : "the end of the text";
+    const std::string found =
+        failure.Offset() < text.size() ? Quoted(text.substr(failure.Offset()), 12) : "the end of the text";
     return "no JSON: " + cause + "; refused at byte " + std::to_string(failure.Offset()) + ", at " + found;
 }

@@ -12,13 +12,14 @@
 namespace
 {
 
-using JsonWriter = rapidjson::Writer<rapidjson::StringBuffer>;
+// In ASCII, so that no control character above it reaches a terminal.
+using JsonWriter = rapidjson::Writer<rapidjson::StringBuffer, rapidjson::UTF8<>, rapidjson::ASCII<>>;
 
 /// Findings without a module come last, those without a set before the sets, a count after what it counts.
-auto OrderOf(const Finding& finding, const std::map<std::string, std::size_t>& fileOrder)
+auto OrderOf(const Finding& finding)
 {
     return std::make_tuple(finding.module.value_or(SIZE_MAX), finding.set ? *finding.set + 1 : 0,
-                           fileOrder.at(finding.file), finding.place ? finding.place->offset : SIZE_MAX);
+                           std::string_view(finding.file), finding.place ? finding.place->offset : SIZE_MAX);
 }
 
 const char* ColorOf(Level level)
@@ -188,14 +189,8 @@ std::size_t Report::CountOf(Level level) const
 
 void Report::Sort()
 {
-    std::map<std::string, std::size_t> fileOrder;
-    for (const Finding& finding : m_findings)
-    {
-        fileOrder.try_emplace(finding.file, fileOrder.size());
-    }
     std::stable_sort(m_findings.begin(), m_findings.end(),
-                     [&](const Finding& a, const Finding& b)
-                     { return OrderOf(a, fileOrder) < OrderOf(b, fileOrder); });
+                     [](const Finding& a, const Finding& b) { return OrderOf(a) < OrderOf(b); });
 }
 
 std::string Report::TextSummary(std::size_t moduleCount) const

@@ -15,20 +15,16 @@ const std::vector<Rule>& AllRules()
         {"passed-over", Level::Warning, "a directory looks like a module, but --discover does not take it",
          "The module is missing from search and contents, and receives no outputs.",
          "Move it out of a hidden directory, replace a link by the directory, add Manual/docdata, or give "
-         "the "
-         "roots by name."},
+         "the roots by name."},
         {"output-blocked", Level::Error, "an output can't be written",
          "For global_index.js the run ends there with status 255, and later modules stay unwritten; any "
-         "other "
-         "output stays as it was.",
+         "other output stays as it was.",
          "Create the docdata directory, make it writable, and remove what is in the way of the output or of "
-         "its "
-         "temporary file."},
+         "its temporary file."},
         {"wrong-link-path", Level::Error, "links from a module to another one lead astray",
          "The links are dead, or lead to another module. Prefixes are computed on the paths as typed.",
          "Rename a module whose name begins with another's, give absolute roots, put no slash at their end, "
-         "and "
-         "keep quotes, backslashes and line breaks out of their names."},
+         "and keep quotes, backslashes and line breaks out of their names."},
         {"unreadable", Level::Error, "a file of the set is missing beside the other one, or can't be read",
          "The module is missing from the search (index.json) or from the contents (toc.json).",
          "Create the file or make it readable."},
@@ -43,13 +39,11 @@ const std::vector<Rule>& AllRules()
          "Mend the text at the place that is named; write the file by a JSON library."},
         {"structure", Level::Error, "a file breaks its format",
          "The module is missing from the search (index.json) or from the contents (toc.json); the run names "
-         "the "
-         "first such fault only.",
+         "the first such fault only.",
          "Mend every entry that is named; docs/FORMATS.md has the formats."},
         {"merged-input", Level::Error, "an input is an output of an earlier run",
          "An index.json is refused, and the module is missing from the search. A toc.json is taken, and its "
-         "links "
-         "lead to other modules than they should.",
+         "links lead to other modules than they should.",
          "Put the module's own file in its place."},
         {"root-differs", Level::Error, "the root of a toc.json differs from that of the first module",
          "The module is missing from the contents, without a message.",
@@ -60,7 +54,7 @@ const std::vector<Rule>& AllRules()
         {"script-altered", Level::Warning, "a title, page path or link has another value in the scripts",
          "Readers see another title, or the link is dead.",
          "Replace the backslash by another character, and remove NUL characters."},
-        {"prefixed-url", Level::Warning, "a page path or link is an address of its own, such as https://...",
+        {"prefixed-url", Level::Warning, "a page path or link is an address of its own (https://...)",
          "The module's prefix is put before it, so that it is dead unless the page script takes it off "
          "again.",
          "Link to a page of the module, or use the page script."},

@@ -47,14 +47,12 @@ std::string PercentDecoded(std::string_view path)
     return decoded;
 }
 
-/// Whether a link leads to a file below the directory: as it is, without what begins with "#" or "?", or
+/// Whether a link leads to a file below the directory, without what begins with "#" or "?": as it is, or
 /// percent-decoded.
 bool LeadsToFile(const std::string& directory, const std::string& link)
 {
-    const std::string path = link.substr(0, link.find('#'));
-    const std::string withoutQuery = path.substr(0, path.find('?'));
-    return IsFile(directory + "/" + link) || IsFile(directory + "/" + path) ||
-           IsFile(directory + "/" + withoutQuery) || IsFile(directory + "/" + PercentDecoded(withoutQuery));
+    const std::string path = link.substr(0, link.find_first_of("#?"));
+    return IsFile(directory + "/" + path) || IsFile(directory + "/" + PercentDecoded(path));
 }
 
 /// Whether the link is an address of its own. "std::list.html" is a file.

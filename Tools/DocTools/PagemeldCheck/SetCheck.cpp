@@ -5,6 +5,7 @@
 #include "Tools/DocTools/PagemeldCheck/ShownText.h"
 
 #include <algorithm>
+#include <cerrno>
 
 #include <sys/stat.h>
 
@@ -17,10 +18,17 @@ bool IsDirectory(const std::string& path)
     return ::stat(path.c_str(), &status) == 0 && S_ISDIR(status.st_mode);
 }
 
+/// Whether something is at path, or may be: a directory may hide what is in it.
 bool IsThere(const std::string& path)
 {
     struct stat status = {};
-    return ::lstat(path.c_str(), &status) == 0;
+    return ::lstat(path.c_str(), &status) == 0 || errno == EACCES;
+}
+
+bool IsRegularFile(const std::string& path)
+{
+    struct stat status = {};
+    return ::stat(path.c_str(), &status) == 0 && S_ISREG(status.st_mode);
 }
 
 /// Checks one set. Each step uses what the steps before it found out.
@@ -102,9 +110,11 @@ private:
     {
         const SetModule& module = m_modules[i];
         const std::string path = PathOf(module, kind);
-        if (!IsThere(path))
+        if (!IsRegularFile(path))
         {
-            return {};
+            InputFacts facts;
+            facts.state = IsThere(path) ? InputFacts::State::Unreadable : InputFacts::State::Missing;
+            return facts;
         }
         return CheckInput(kind, {i, m_set, path, m_checks.limit, m_checks.quoteSize}, NameOfRoot(module.root),
                           {m_checks.checksTargets, module.path.Text()}, m_report);

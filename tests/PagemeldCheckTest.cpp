@@ -1,0 +1,617 @@
+#include "Tools/DocTools/PagemeldCheck/Rules.h"
+#include "tests/support/NeutralText.h"
+#include "tests/support/RunProgram.h"
+#include "tests/support/WholeFile.h"
+
+#include <gtest/gtest.h>
+
+#include <atomic>
+#include <cctype>
+#include <chrono>
+#include <filesystem>
+#include <string>
+#include <thread>
+#include <utility>
+#include <vector>
+
+#include <sys/stat.h>
+#include <unistd.h>
+
+// What the checker prints, whole. Each row of the table has, for some rules, what breaks them, mostly in
+// module b, and what comes close and is not told, mostly in module a.
+
+namespace
+{
+
+namespace fs = std::filesystem;
+
+// What stands at a path instead of a file.
+const std::string kGone = "(gone)";
+const std::string kDirectory = "(directory)";
+const std::string kPipe = "(pipe)";
+const std::string kLink = "(link to) ";
+const std::string kOld = "(as it is, but old)";
+const std::string kCombined = "(outputs in both modules)";
+
+struct Change
+{
+    std::string path;
+    std::string content;
+};
+
+std::string Index(const std::string& pages,
+                  const std::string& rest = R"("info":[],"common":{},"searchIndex":{})")
+{
+    return R"({"pages":[)" + pages + "]," + rest + "}";
+}
+
+std::string Toc(const std::string& children, const std::string& root = R"("link":"toc","title":"toc")")
+{
+    return "{" + root + R"(,"children":[)" + children + "]}";
+}
+
+void Apply(const TemporaryFolder& folder, const Change& change)
+{
+    const std::string path = folder / change.path;
+    if (change.content == kCombined)
+    {
+        (void)ReportOfRun(folder, {"@/a", "@/b"});
+        return;
+    }
+    if (change.content == kOld)
+    {
+        fs::last_write_time(path, fs::file_time_type::clock::now() - std::chrono::hours(1));
+        return;
+    }
+    fs::create_directories(fs::path(path).parent_path());
+    fs::remove(path);
+    if (change.content == kDirectory)
+    {
+        fs::create_directory(path);
+    }
+    else if (change.content == kPipe)
+    {
+        EXPECT_EQ(0, ::mkfifo(path.c_str(), 0666));
+    }
+    else if (change.content.compare(0, kLink.size(), kLink) == 0)
+    {
+        fs::create_symlink(folder / change.content.substr(kLink.size()), path);
+    }
+    else if (change.content != kGone)
+    {
+        WriteWholeFile(path, change.content);
+    }
+}
+
+/// Two sound modules, a and b.
+void WriteSoundModules(const TemporaryFolder& folder)
+{
+    for (const char* docdata : {"a/Manual/docdata/", "b/Manual/docdata/"})
+    {
+        WriteWholeFile(folder / docdata + "index.json", Index(""));
+        WriteWholeFile(folder / docdata + "toc.json", Toc(""));
+    }
+}
+
+} // namespace
+
+TEST(PagemeldCheck, TellsWhatBreaksARuleAndNotWhatComesClose)
+{
+    const struct
+    {
+        std::vector<std::string> arguments;
+        std::vector<Change> changes;
+        const char* output;
+    } cases[] = {
+        {{"--discover=@"},
+         {},
+         R"(2 modules, 0 errors, 0 warnings
+status 0
+)"},
+        {{"--discover=@/a"},
+         {},
+         R"(@/a: error: no directory below it has Manual/docdata: nothing will be combined [no-modules]
+0 modules, 1 error, 0 warnings
+status 1
+)"},
+        {{"@/a", "@/b", "@/b"},
+         {},
+         R"(@/b: error: is the same directory as @/b: its pages will be in the search twice [duplicate-root]
+3 modules, 1 error, 0 warnings
+status 1
+)"},
+        {{"-d", "@"},
+         {{"c/.h/Manual/docdata", kDirectory},
+          {"c/.i/Manual", kDirectory},
+          {"c/l", kLink + "a"},
+          {"c/m", kLink + "a/Manual"},
+          {"c/r/ScriptReference/docdata", kDirectory},
+          {"c/s/ScriptReference", kDirectory}},
+         R"(@/c/.h: warning: a hidden module is not taken: its pages will be missing [passed-over]
+@/c/l: warning: a link to a module is not followed: its pages will be missing [passed-over]
+@/c/r: warning: has ScriptReference/docdata but no Manual/docdata, so it is not taken: its pages will be missing [passed-over]
+2 modules, 0 errors, 3 warnings
+status 0
+)"},
+        {{"@/a", "@/b", "@/c"},
+         {{"b/Manual/docdata/global_toc.js", kDirectory},
+          {"b/Manual/docdata/global_toc.json.tmp", kPipe},
+          {"b/Manual/docdata/global_index.js.tmp", kDirectory},
+          {"a/Manual/docdata/global_index.js.tmp", "x"},
+          {"a/ScriptReference/docdata/index.json", Index(R"(["p.html","P"])")},
+          {"a/ScriptReference/docdata/toc.json", Toc("")}},
+         R"(@/b/Manual/docdata/global_index.js.tmp: error: a directory is in the place of the temporary file: the run ends here with status 255, and leaves 1 later module and ScriptReference unwritten [output-blocked]
+@/b/Manual/docdata/global_toc.js: error: a directory is in the place of the output: the new one stays as .tmp [output-blocked]
+@/b/Manual/docdata/global_toc.json.tmp: error: a pipe is in the place of the temporary file: the run keeps the old output [output-blocked]
+@/b/ScriptReference/docdata: error: is missing: the run ends here with status 255, and leaves 1 later module unwritten [output-blocked]
+@/c/Manual/docdata: error: is missing: the run ends here with status 255, and leaves ScriptReference unwritten [output-blocked]
+@/c/ScriptReference/docdata: error: is missing: the run ends here with status 255 [output-blocked]
+3 modules, 6 errors, 0 warnings
+status 1
+)"},
+        {{"docs/m1", "docs/m12", "docs/m2/", R"(docs/a\b)"},
+         {},
+         R"(docs/m1: error: links to docs/a\b will lead to docs/a/b/Manual: give absolute paths [wrong-link-path]
+docs/m12: error: links to docs/m1 and 1 more will lead to docs/m12/Manual: one name begins with the other: rename one [wrong-link-path]
+docs/m2/: error: links to docs/m1 and 2 more will lead to m1/Manual: give the roots without a slash at the end [wrong-link-path]
+docs/a\b: error: a quote, backslash or line break in the path breaks both scripts of docs/m1: rename the directory [wrong-link-path]
+4 modules, 4 errors, 0 warnings
+status 1
+)"},
+        {{"/m1", "/m2"},
+         {},
+         R"(2 modules, 0 errors, 0 warnings
+status 0
+)"},
+        {{"@/a", "@/b", "@/c"},
+         {{"a/Manual/docdata/toc.json", kDirectory},
+          {"b/Manual/docdata/index.json", kGone},
+          {"c/Manual/docdata/index.json", Index(R"(["p.html","P"])")},
+          {"c/Manual/docdata/toc.json", kLink + "nowhere"}},
+         R"(@/a/Manual/docdata/toc.json: error: can't be read; "a" will be missing from the contents of Manual [unreadable]
+@/b/Manual/docdata/index.json: error: is missing beside toc.json; "b" will be missing from the search of Manual [unreadable]
+@/c/Manual/docdata/toc.json: error: can't be read; "c" will be missing from the contents of Manual [unreadable]
+3 modules, 3 errors, 0 warnings; missing from the search of Manual: b; from its contents: a, c
+status 1
+)"},
+        {{"@/a", "@/b"},
+         {{"b/Manual/docdata/index.json", kGone},
+          {"b/Manual/docdata/toc.json", kGone},
+          {"b/ScriptReference/docdata", kDirectory}},
+         R"(@/b/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+@/b/ScriptReference/docdata: note: has neither index.json nor toc.json: the module adds nothing to ScriptReference [set-empty]
+2 modules, 0 errors, 0 warnings
+status 0
+)"},
+        {{"@/a", "@/b"},
+         {{"a/Manual/docdata/toc.json", kGone}, {"b/Manual/docdata/toc.json", "[]"}},
+         R"(@/a/Manual/docdata/toc.json: error: is missing beside index.json; "a" will be missing from the contents of Manual [unreadable]
+@/b/Manual/docdata/toc.json:1:1: error: node is an array of 0, not an object; "b" will be missing from the contents of Manual [structure]
+Manual: error: no module has a sound toc.json: nothing will be written, and earlier outputs stay [nothing-to-combine]
+2 modules, 3 errors, 0 warnings; missing from the contents of Manual: a, b
+status 1
+)"},
+        {{"@/a", "@/b", "@/c"},
+         {{"a/Manual/docdata/index.json", "{\"pages\":[],\n\"info\":[1,]}"},
+          {"a/Manual/docdata/toc.json", "\357\273\277{}"},
+          {"b/Manual/docdata/index.json", "{'pages':[]}"},
+          {"b/Manual/docdata/toc.json", R"({"link":"a\q"})"},
+          {"c/Manual/docdata/index.json", Index(R"(["p.html","P"])")},
+          {"c/Manual/docdata/toc.json", ""}},
+         R"(@/a/Manual/docdata/index.json:2:11: error: no JSON: there is a comma before the closing bracket; refused at byte 23, at "]}"; "a" will be missing from the search of Manual [not-json]
+@/a/Manual/docdata/toc.json:1:1: error: no JSON: the file begins with a byte order mark: save it without; refused at byte 0, at "\uFEFF{}"; "a" will be missing from the contents of Manual [not-json]
+@/b/Manual/docdata/index.json:1:2: error: no JSON: strings need double quotes; refused at byte 1, at "'pages':[]}"; "b" will be missing from the search of Manual [not-json]
+@/b/Manual/docdata/toc.json:1:11: error: no JSON: a backslash in a string must be doubled; refused at byte 10, at "\\q\"}"; "b" will be missing from the contents of Manual [not-json]
+@/c/Manual/docdata/toc.json:1:1: error: no JSON: the file is empty; refused at byte 0, at the end of the text; "c" will be missing from the contents of Manual [not-json]
+Manual: error: no module has a sound toc.json: nothing will be written, and earlier outputs stay [nothing-to-combine]
+3 modules, 6 errors, 0 warnings; missing from the search of Manual: a, b; from its contents: a, b, c
+status 1
+)"},
+        {{"@/a", "@/b", "@/c"},
+         {{"a/Manual/docdata/index.json", "{} {}"},
+          {"a/Manual/docdata/toc.json", R"({"a":1e999})"},
+          {"b/Manual/docdata/index.json", "[ // none\n]"},
+          {"b/Manual/docdata/toc.json", "\"a\nb\""},
+          {"c/Manual/docdata/index.json", std::string("{\000\"\000", 4)},
+          {"c/Manual/docdata/toc.json", Toc("")}},
+         R"(@/a/Manual/docdata/index.json:1:4: error: no JSON: there is a second root after the first; refused at byte 3, at "{}"; "a" will be missing from the search of Manual [not-json]
+@/a/Manual/docdata/toc.json:1:6: error: no JSON: a number is too large; refused at byte 5, at "1e999}"; "a" will be missing from the contents of Manual [not-json]
+@/b/Manual/docdata/index.json:1:3: error: no JSON: JSON has no comments; refused at byte 2, at "// none\n]"; "b" will be missing from the search of Manual [not-json]
+@/b/Manual/docdata/toc.json:1:3: error: no JSON: a line break in a string must be written as \n; refused at byte 2, at "\nb\""; "b" will be missing from the contents of Manual [not-json]
+@/c/Manual/docdata/index.json:1:2: warning: a NUL byte ends the text; bytes after it that are not seen: 2 [text-after-nul]
+@/c/Manual/docdata/index.json:1:2: error: no JSON: the file is in UTF-16: save it as UTF-8; refused at byte 1, at the end of the text; "c" will be missing from the search of Manual [not-json]
+Manual: error: no module has a sound index.json: nothing will be written, and earlier outputs stay [nothing-to-combine]
+3 modules, 6 errors, 1 warning; missing from the search of Manual: a, b, c; from its contents: a, b
+status 1
+)"},
+        {{"@/a", "@/b"},
+         {{"b/Manual/docdata/index.json",
+           Index(
+               R"(["a","A"],[],["b",7],["c","C",1.0])",
+               R"("info":[["i",0],["i",4],["i",-1],["i","x"],[1,2]],"common":{"a":1,"b":2},"searchIndex":{"a/b":{},"t":[0,5,"1"]})")},
+          {"b/Manual/docdata/toc.json",
+           "{\"link\":7,\n\"children\":[{\"link\":\"l\",\"title\":\"t\",\"children\":{}},7]}"}},
+         R"(@/b/Manual/docdata/index.json:1:21: error: page entry is an array of 0, not [path, title]; "b" will be missing from the search of Manual [structure] /pages/1
+@/b/Manual/docdata/index.json:1:24: error: page path or title is 7, not a string; "b" will be missing from the search of Manual [structure] /pages/2
+@/b/Manual/docdata/index.json:1:32: error: page entry is an array of 3, not [path, title]; "b" will be missing from the search of Manual [structure] /pages/3
+@/b/Manual/docdata/index.json:1:63: error: page number 4, but there are 4 pages; "b" will be missing from the search of Manual [structure] /info/1
+@/b/Manual/docdata/index.json:1:71: error: page number -1, but there are 4 pages; "b" will be missing from the search of Manual [structure] /info/2
+@/b/Manual/docdata/index.json:1:80: error: page number is "x", not a 32-bit integer; "b" will be missing from the search of Manual [structure] /info/3
+@/b/Manual/docdata/index.json:1:90: error: text is 1, not a string; "b" will be missing from the search of Manual [structure] /info/4
+@/b/Manual/docdata/index.json:1:117: error: common word has the value 2, not 1; "b" will be missing from the search of Manual [structure] /common/b
+@/b/Manual/docdata/index.json:1:141: error: term has an object of 0, not an array of info numbers; "b" will be missing from the search of Manual [structure] /searchIndex/a~1b
+@/b/Manual/docdata/index.json:1:151: error: info number 5, but there are 5 infos; "b" will be missing from the search of Manual [structure] /searchIndex/t/1
+@/b/Manual/docdata/index.json: error: 1 more of this rule; --limit=0 shows all [structure]
+@/b/Manual/docdata/toc.json:1:1: error: "title" is missing; it must be a string; "b" will be missing from the contents of Manual [structure]
+@/b/Manual/docdata/toc.json:1:9: error: "link" is 7, not a string; "b" will be missing from the contents of Manual [structure] /link
+@/b/Manual/docdata/toc.json:2:48: error: "children" is an object of 0, not an array or null; "b" will be missing from the contents of Manual [structure] /children/0/children
+@/b/Manual/docdata/toc.json:2:52: error: node is 7, not an object; "b" will be missing from the contents of Manual [structure] /children/1
+2 modules, 15 errors, 0 warnings; missing from the search of Manual: b; from its contents: b
+status 1
+)"},
+        {{"@/a", "@/b"},
+         {{"b/Manual/docdata/index.json", R"({"pages":{},"info":[["i",9]],"common":{}})"},
+          {"b/Manual/docdata/toc.json", "7"}},
+         R"(@/b/Manual/docdata/index.json:1:1: error: "searchIndex" is missing; it must be an object; "b" will be missing from the search of Manual [structure]
+@/b/Manual/docdata/index.json:1:10: error: "pages" is an object of 0, not an array; "b" will be missing from the search of Manual [structure] /pages
+@/b/Manual/docdata/toc.json:1:1: error: node is 7, not an object; "b" will be missing from the contents of Manual [structure]
+2 modules, 3 errors, 0 warnings; missing from the search of Manual: b; from its contents: b
+status 1
+)"},
+        {{"@/a", "@/b"},
+         {{"a/Manual/docdata/index.json", Index(R"(["module","0"])")},
+          {"a/Manual/docdata/toc.json", Toc(R"({"link":"module","title":"A","modules":1,"children":null})")},
+          {"b/Manual/docdata/index.json", Index(R"(["p","P"],["p","P",0],["q","Q",1])")},
+          {"b/Manual/docdata/toc.json",
+           Toc(R"({"link":"b","title":"B","module":1,"children":null},{"link":"c","title":"C","module":2,"children":null})")}},
+         R"(@/b/Manual/docdata/index.json:1:21: error: this is an output: the page entry names its module, 0; "b" will be missing from the search of Manual [merged-input] /pages/1
+@/b/Manual/docdata/toc.json:1:41: error: this is an output: the node names its module, 1; its links will lead to that module [merged-input] /children/0
+2 modules, 2 errors, 0 warnings; missing from the search of Manual: b
+status 1
+)"},
+        {{"@/a", "@/b", "@/c"},
+         {{"b/Manual/docdata/toc.json", Toc("", R"("link":"toc","title":"x")")},
+          {"c/Manual/docdata/index.json", Index(R"(["p.html","P"])")},
+          {"c/Manual/docdata/toc.json", Toc("", R"("link":"toc","title":"toc\u0000x")")}},
+         R"(@/b/Manual/docdata/toc.json:1:23: error: root title "x" differs from "toc" of @/a; "b" will be missing from the contents of Manual [root-differs] /title
+@/c/Manual/docdata/toc.json:1:23: warning: title "toc\x00x" is "toc" in global_toc.js [script-altered] /title
+3 modules, 1 error, 1 warning; missing from the contents of Manual: b
+status 1
+)"},
+        {{"@/a", "@/b", "@/c"},
+         {{"a/Manual/docdata/toc.json", Toc("", R"("link":"x","title":"x")")},
+          {"c/Manual/docdata/index.json", Index(R"(["p.html","P"])")},
+          {"c/Manual/docdata/toc.json", Toc("")}},
+         R"(@/a/Manual/docdata/toc.json:1:9: error: root link "x" differs from "toc" of 2 other modules; it comes first, so they are dropped from the contents of Manual: "b", "c" [root-differs] /link
+3 modules, 1 error, 0 warnings; missing from the contents of Manual: b, c
+status 1
+)"},
+        {{"@/a", "@/b"},
+         {{"a/Manual/docdata/index.json", Index(R"(["a'b.html","\"Operator\""])")},
+          {"a/Manual/docdata/toc.json",
+           Toc(R"({"link":"a.html","title":"\u2028","children":null},{"link":"null","title":"\"","children":null})")},
+          {"b/Manual/docdata/index.json", Index(R"(["a\"b.html","\"\\\" Operator"])")},
+          {"b/Manual/docdata/toc.json",
+           Toc(R"({"link":"a.html","title":"at the end\\","children":null},{"link":"b\nc.html","title":"B","children":null})")}},
+         R"(@/b/Manual/docdata/index.json:1:12: error: page path "a\"b.html" breaks global_index.js in every module [script-broken] /pages/0/0
+@/b/Manual/docdata/index.json:1:24: error: title "\"\\\" Operator" of page "a\"b.html" breaks global_index.js in every module [script-broken] /pages/0/1
+@/b/Manual/docdata/toc.json:1:66: error: title "at the end\\" breaks global_toc.js in every module [script-broken] /children/0/title
+@/b/Manual/docdata/toc.json:1:106: error: link "b\nc.html" breaks global_toc.js in every module [script-broken] /children/1/link
+2 modules, 4 errors, 0 warnings
+status 1
+)"},
+        {{"@/a", "@/b"},
+         {{"a/Manual/docdata/index.json", Index(R"(["a.html","C:/new"])")},
+          {"b/Manual/docdata/index.json", Index(R"(["a.html","C:\\new"])")},
+          {"b/Manual/docdata/toc.json", Toc(R"({"link":"a\u0000.html","title":"A","children":null})")}},
+         R"(@/b/Manual/docdata/index.json:1:21: warning: title "C:\\new" of page "a.html" is "C:\new" in global_index.js [script-altered] /pages/0/1
+@/b/Manual/docdata/toc.json:1:49: warning: link "a\x00.html" is "a" in global_toc.js [script-altered] /children/0/link
+2 modules, 0 errors, 2 warnings
+status 0
+)"},
+        {{"@/a", "@/b"},
+         {{"a/Manual/docdata/index.json", Index(R"(["std::list.html","A"])")},
+          {"a/Manual/docdata/toc.json", Toc(R"({"link":"x/a:b.html","title":"A","children":null})")},
+          {"b/Manual/docdata/index.json", Index(R"(["https://h/a","A"])")},
+          {"b/Manual/docdata/toc.json", Toc(R"({"link":"mailto:a","title":"A","children":null})")}},
+         R"(@/b/Manual/docdata/index.json:1:12: warning: page path "https://h/a" gets the module's prefix, and is dead without the page script [prefixed-url] /pages/0/0
+@/b/Manual/docdata/toc.json:1:49: warning: link "mailto:a" gets the module's prefix, and is dead without the page script [prefixed-url] /children/0/link
+2 modules, 0 errors, 2 warnings
+status 0
+)"},
+        {{"@/a", "@/b"},
+         {{"a/Manual/docdata/index.json",
+           Index("", R"("info":[],"common":{"__proto":1},"searchIndex":{"prototype":[]})")},
+          {"b/Manual/docdata/index.json",
+           Index("", R"("info":[],"common":{"__proto__":1},"searchIndex":{"__proto__":[]})")}},
+         R"(@/b/Manual/docdata/index.json:1:45: warning: common word "__proto__" sets a prototype in the scripts: readers do not find it [special-term] /common/__proto__
+@/b/Manual/docdata/index.json:1:75: warning: term "__proto__" sets a prototype in the scripts: readers do not find it [special-term] /searchIndex/__proto__
+Manual: note: the common words of "a" count for all modules; those that differ are ignored, of "b" [common-ignored]
+2 modules, 0 errors, 2 warnings
+status 0
+)"},
+        {{"@/a", "@/b"},
+         {{"a/Manual/docdata/index.json", Index("[\"p.html\",\"\303\251\"]")},
+          {"a/Manual/docdata/toc.json",
+           std::string("{\"link\":\"toc\",\"title\":\"toc\",\"children\":[]}\000", 43)},
+          {"b/Manual/docdata/index.json", Index("[\"p.html\",\"\351\351\"]")},
+          {"b/Manual/docdata/toc.json",
+           std::string("{\"link\":\"toc\",\"title\":\"toc\",\"children\":[]}\000\351", 44)}},
+         R"(@/b/Manual/docdata/index.json:1:22: warning: byte \xE9 is no UTF-8: readers see a replacement character [invalid-utf8]
+@/b/Manual/docdata/toc.json:1:43: warning: a NUL byte ends the text; bytes after it that are not seen: 1 [text-after-nul]
+2 modules, 0 errors, 2 warnings
+status 0
+)"},
+        {{"@/a", "@/b", "@/c"},
+         {{"a/Manual/docdata/index.json", Index("", R"("info":[],"common":{"a":1,"b":1},"searchIndex":{})")},
+          {"b/Manual/docdata/index.json", Index("", R"("info":[],"common":{"b":1,"a":1},"searchIndex":{})")},
+          {"c/Manual/docdata/index.json", Index("", R"("info":[],"common":{"a":1},"searchIndex":{})")},
+          {"c/Manual/docdata/toc.json", Toc("")}},
+         R"(Manual: note: the common words of "a" count for all modules; those that differ are ignored, of "c" [common-ignored]
+3 modules, 0 errors, 0 warnings
+status 0
+)"},
+        {{"--targets", "@/a", "@/b"},
+         {{"a/Manual/docdata/index.json", Index(R"(["p%20q.html?x#p","P"])")},
+          {"a/Manual/docdata/toc.json",
+           Toc(R"({"link":"null","title":"N","children":null})", R"("link":"null","title":"")")},
+          {"a/Manual/p q.html", ""},
+          {"b/Manual/docdata/index.json", Index(R"(["docdata","D"])")},
+          {"b/Manual/docdata/toc.json",
+           Toc(R"({"link":"#x","title":"X","children":null},{"link":"q.html#p","title":"Q","children":null})",
+               R"("link":"null","title":"")")}},
+         R"(@/b/Manual/docdata/index.json:1:12: warning: page path "docdata" leads to no file [missing-target] /pages/0/0
+@/b/Manual/docdata/toc.json:1:47: warning: link "#x" leads to no file [missing-target] /children/0/link
+@/b/Manual/docdata/toc.json:1:89: warning: link "q.html#p" leads to no file [missing-target] /children/1/link
+2 modules, 0 errors, 3 warnings
+status 0
+)"},
+        {{"--outputs", "@/a", "@/b"},
+         {{"", kCombined}},
+         R"(2 modules, 0 errors, 0 warnings
+status 0
+)"},
+        {{"--outputs", "@/a", "@/b"},
+         {{"", kCombined},
+          {"a/Manual/docdata/global_index.js", kGone},
+          {"a/Manual/docdata/global_index.json", "{"},
+          {"b/Manual/docdata/global_toc.js", "toc = {\n\""},
+          {"b/Manual/docdata/global_toc.json", "{}"},
+          {"b/Manual/docdata/global_toc.js.tmp", ""},
+          {"b/Manual/docdata/global_index.js", kOld}},
+         R"(@/a/Manual/docdata/global_index.js: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/a/Manual/docdata/global_index.json: error: is cut short or broken: readers of the module go without [output-broken]
+@/b/Manual/docdata/global_index.js: error: is older than an input of the set: readers see an earlier build [output-stale]
+@/b/Manual/docdata/global_toc.js: error: is cut short or broken: readers of the module go without [output-broken]
+@/b/Manual/docdata/global_toc.js.tmp: error: a temporary file stayed: a run was ended, and the output beside it may be old [leftover]
+@/b/Manual/docdata/global_toc.json: error: has other content than in @/a: a run ended early, and readers find different things [output-differs]
+2 modules, 6 errors, 0 warnings
+status 1
+)"},
+        {{"-n", "1", "@/a", "@/b"},
+         {{"b/Manual/docdata/index.json", Index("1,2,3")}},
+         R"(@/b/Manual/docdata/index.json:1:11: error: page entry is 1, not [path, title]; "b" will be missing from the search of Manual [structure] /pages/0
+@/b/Manual/docdata/index.json: error: 2 more of this rule; --limit=0 shows all [structure]
+2 modules, 3 errors, 0 warnings; missing from the search of Manual: b
+status 1
+)"},
+        {{"--quiet", "@/a", "@/b"},
+         {{"b/Manual/docdata/index.json",
+           Index("", R"("info":[],"common":{},"searchIndex":{"__proto__":[]})")},
+          {"b/Manual/docdata/toc.json", kGone}},
+         R"(@/b/Manual/docdata/toc.json: error: is missing beside index.json; "b" will be missing from the contents of Manual [unreadable]
+status 1
+)"},
+        {{"-qW", "@/a", "@/b"},
+         {{"b/Manual/docdata/index.json",
+           Index("", R"("info":[],"common":{},"searchIndex":{"__proto__":[]})")}},
+         R"(@/b/Manual/docdata/index.json:1:62: warning: term "__proto__" sets a prototype in the scripts: readers do not find it [special-term] /searchIndex/__proto__
+status 1
+)"},
+        {{"-f", "json", "@/a", "@/b", "@/a"},
+         {{"a/Manual/docdata/index.json", Index("", R"("info":[],"common":{"a":1},"searchIndex":{})")},
+          {"b/Manual/docdata/index.json",
+           Index(R"(["p",7])", R"("info":[],"common":{"b":1},"searchIndex":{})")},
+          {"b/Manual/docdata/toc.json", "[]"},
+          {"b/ScriptReference/docdata", kDirectory}},
+         R"({"level":"error","rule":"structure","file":"@/b/Manual/docdata/index.json","line":1,"column":11,"offset":10,"pointer":"/pages/0","module":"@/b","set":"Manual","message":"page path or title is 7, not a string; \"b\" will be missing from the search of Manual"}
+{"level":"error","rule":"structure","file":"@/b/Manual/docdata/toc.json","line":1,"column":1,"offset":0,"pointer":"","module":"@/b","set":"Manual","message":"node is an array of 0, not an object; \"b\" will be missing from the contents of Manual"}
+{"level":"note","rule":"set-empty","file":"@/b/ScriptReference/docdata","module":"@/b","set":"ScriptReference","message":"has neither index.json nor toc.json: the module adds nothing to ScriptReference"}
+{"level":"error","rule":"duplicate-root","file":"@/a","module":"@/a","message":"is the same directory as @/a: its pages will be in the search twice"}
+{"summary":{"modules":3,"errors":3,"warnings":0,"notes":1,"missing":{"Manual":{"search":["@/b"],"contents":["@/b"]},"ScriptReference":{"search":[],"contents":[]}}}}
+status 1
+)"},
+        {{"-f", "json", "@/a", "@/b"},
+         {{"b/Manual/docdata/index.json", Index("[\"p.html\","
+                                                "\"\351\\n\\\"xxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxx"
+                                                "xxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxx\\\\\"]")}},
+         R"({"level":"error","rule":"script-broken","file":"@/b/Manual/docdata/index.json","line":1,"column":21,"offset":20,"pointer":"/pages/0/1","module":"@/b","set":"Manual","message":"title \"\\xE9\\n\\\"xxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxx\\\\\" of page \"p.html\" breaks global_index.js in every module"}
+{"level":"warning","rule":"invalid-utf8","file":"@/b/Manual/docdata/index.json","line":1,"column":22,"offset":21,"module":"@/b","set":"Manual","message":"byte \\xE9 is no UTF-8: readers see a replacement character"}
+{"summary":{"modules":2,"errors":1,"warnings":1,"notes":0,"missing":{"Manual":{"search":[],"contents":[]},"ScriptReference":{"search":[],"contents":[]}}}}
+status 1
+)"},
+        {{"@/a", "@/b"},
+         {{"b/Manual/docdata/index.json", Index("[\"p.html\","
+                                                "\"\351\\n\\\"xxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxx"
+                                                "xxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxx\\\\\"]")}},
+         R"(@/b/Manual/docdata/index.json:1:21: error: title "\xE9\n\"xxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxx"... of page "p.html" breaks global_index.js in every module [script-broken] /pages/0/1
+@/b/Manual/docdata/index.json:1:22: warning: byte \xE9 is no UTF-8: readers see a replacement character [invalid-utf8]
+2 modules, 1 error, 1 warning
+status 1
+)"},
+    };
+    for (const auto& c : cases)
+    {
+        const TemporaryFolder folder;
+        WriteSoundModules(folder);
+        for (const Change& change : c.changes)
+        {
+            Apply(folder, change);
+        }
+        EXPECT_EQ(c.output, ReportOfCheck(folder, c.arguments)) << c.arguments.back();
+    }
+}
+
+TEST(PagemeldCheck, ShowsHostileNamesEscapedAndSurvivesHostileTrees)
+{
+    const std::string name = "c\n\x1B[1m\xE9\xC2\x9B";
+    const struct
+    {
+        std::vector<std::string> arguments;
+        std::vector<Change> changes;
+        const char* output;
+    } cases[] = {
+        {{"@/" + name},
+         {{name + "/Manual/docdata/toc.json", "7"}},
+         R"(@/c\n\x1B[1m\xE9\u009B/Manual/docdata/index.json: error: is missing beside toc.json; "c\n\x1B[1m\xE9\u009B" will be missing from the search of Manual [unreadable]
+@/c\n\x1B[1m\xE9\u009B/Manual/docdata/toc.json:1:1: error: node is 7, not an object; "c\n\x1B[1m\xE9\u009B" will be missing from the contents of Manual [structure]
+Manual: error: no module has a sound index.json: nothing will be written, and earlier outputs stay [nothing-to-combine]
+1 module, 3 errors, 0 warnings; missing from the search of Manual: c\n\x1B[1m\xE9\u009B; from its contents: c\n\x1B[1m\xE9\u009B
+status 1
+)"},
+        {{"-f", "json", "@/" + name},
+         {{name + "/Manual/docdata/toc.json", "7"}},
+         R"({"level":"error","rule":"unreadable","file":"@/c\n\u001B[1m\\xE9\u009B/Manual/docdata/index.json","module":"@/c\n\u001B[1m\\xE9\u009B","set":"Manual","message":"is missing beside toc.json; \"c\\n\\x1B[1m\\xE9\\u009B\" will be missing from the search of Manual"}
+{"level":"error","rule":"structure","file":"@/c\n\u001B[1m\\xE9\u009B/Manual/docdata/toc.json","line":1,"column":1,"offset":0,"pointer":"","module":"@/c\n\u001B[1m\\xE9\u009B","set":"Manual","message":"node is 7, not an object; \"c\\n\\x1B[1m\\xE9\\u009B\" will be missing from the contents of Manual"}
+{"level":"error","rule":"nothing-to-combine","set":"Manual","message":"no module has a sound index.json: nothing will be written, and earlier outputs stay"}
+{"summary":{"modules":1,"errors":3,"warnings":0,"notes":0,"missing":{"Manual":{"search":["@/c\n\u001B[1m\\xE9\u009B"],"contents":["@/c\n\u001B[1m\\xE9\u009B"]},"ScriptReference":{"search":[],"contents":[]}}}}
+status 1
+)"},
+        {{"@/a/Manual/docdata/toc.json", "@/nowhere", ""}, {}, R"(3 modules, 0 errors, 0 warnings
+status 0
+)"},
+        {{"-d", "@/c"},
+         {{"c/d/Manual", kLink + "c"}, {"c/d/e", kLink + "c/d"}, {"c/f", kLink + "c/f"}},
+         R"(@/c: error: no directory below it has Manual/docdata: nothing will be combined [no-modules]
+0 modules, 1 error, 0 warnings
+status 1
+)"},
+        {{"-ot", "@/a", "@/b"},
+         {{"a/Manual/docdata/index.json", kLink + "a/Manual/docdata/index.json"},
+          {"b/Manual/docdata/toc.json", kPipe},
+          {"b/Manual/docdata/global_toc.js", kDirectory}},
+         R"(@/a/Manual/docdata/global_index.js: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/a/Manual/docdata/global_index.json: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/a/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/a/Manual/docdata/global_toc.json: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/a/Manual/docdata/index.json: error: can't be read; "a" will be missing from the search of Manual [unreadable]
+@/a/Manual/docdata/toc.json:1:9: warning: link "toc" leads to no file [missing-target] /link
+@/b/Manual/docdata/global_index.js: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/b/Manual/docdata/global_index.json: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/b/Manual/docdata/global_toc.js: error: a directory is in the place of the output: the new one stays as .tmp [output-blocked]
+@/b/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/b/Manual/docdata/global_toc.json: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/b/Manual/docdata/toc.json: error: can't be read; "b" will be missing from the contents of Manual [unreadable]
+2 modules, 11 errors, 1 warning; missing from the search of Manual: a; from its contents: b
+status 1
+)"},
+    };
+    for (const auto& c : cases)
+    {
+        const TemporaryFolder folder;
+        WriteSoundModules(folder);
+        for (const Change& change : c.changes)
+        {
+            Apply(folder, change);
+        }
+        EXPECT_EQ(c.output, ReportOfCheck(folder, c.arguments)) << c.arguments.back();
+    }
+}
+
+TEST(PagemeldCheck, TellsWhatAUserMayNotReadOrWrite)
+{
+    const TemporaryFolder folder;
+    WriteSoundModules(folder);
+    fs::permissions(folder / "a/Manual/docdata/index.json", fs::perms::none);
+    fs::permissions(folder / "a/Manual/docdata", fs::perms::owner_read | fs::perms::owner_exec);
+    fs::create_directories(folder / "c/Manual/docdata");
+    fs::permissions(folder / "c/Manual/docdata", fs::perms::none);
+    std::vector<std::string> command = {PAGEMELD_CHECK_PROGRAM, folder / "a", folder / "b", folder / "c"};
+    if (::geteuid() == 0)
+    {
+        command.insert(command.begin(), {"setpriv", "--bounding-set=-dac_override,-dac_read_search"});
+    }
+    const ProgramResult result = RunProgram(command.front(), {command.begin() + 1, command.end()});
+    fs::permissions(folder / "c/Manual/docdata", fs::perms::owner_all);
+    EXPECT_EQ(1, result.status);
+    EXPECT_EQ(
+        R"(@/a/Manual/docdata: error: can't be written to: the run ends here with status 255, and leaves 2 later modules and ScriptReference unwritten [output-blocked]
+@/a/Manual/docdata/index.json: error: can't be read; "a" will be missing from the search of Manual [unreadable]
+@/c/Manual/docdata: error: can't be written to: the run ends here with status 255, and leaves ScriptReference unwritten [output-blocked]
+@/c/Manual/docdata/index.json: error: can't be read; "c" will be missing from the search of Manual [unreadable]
+@/c/Manual/docdata/toc.json: error: can't be read; "c" will be missing from the contents of Manual [unreadable]
+3 modules, 5 errors, 0 warnings; missing from the search of Manual: a, c; from its contents: c
+)",
+        Neutral(result.standardOutput, folder));
+}
+
+TEST(PagemeldCheck, FilesMayVanishWhileItRuns)
+{
+    const TemporaryFolder folder;
+    WriteSoundModules(folder);
+    std::atomic<bool> ends = false;
+    std::thread builder(
+        [&]
+        {
+            while (!ends)
+            {
+                fs::rename(folder / "b/Manual", folder / "b/other");
+                fs::rename(folder / "b/other", folder / "b/Manual");
+            }
+        });
+    for (int run = 0; run < 50; ++run)
+    {
+        const std::string report = ReportOfCheck(folder, {"-t", "-o", "@/a", "@/b"});
+        EXPECT_NE(std::string::npos, report.find("\n2 modules, ")) << report;
+        EXPECT_NE(std::string::npos, report.find("\nstatus 1\n")) << report;
+    }
+    ends = true;
+    builder.join();
+}
+
+TEST(PagemeldCheck, RefusesUnusableCommandLines)
+{
+    const std::string usage = "Usage: pagemeld-check [OPTION]... ROOT...\n"
+                              "       pagemeld-check [OPTION]... --discover=DIR\n"
+                              "Try 'pagemeld-check --help' for more.\nstatus 2\n";
+    const std::pair<std::vector<std::string>, std::string> cases[] = {
+        {{}, "no ROOT is given"},
+        {{"-d", "a", "b"}, "give roots or --discover, not both"},
+        {{"-f", "xml", "a"}, "the format is \"text\" or \"json\""},
+        {{"-n", "", "a"}, "the limit is a number"},
+        {{"-n", "-1", "a"}, "the limit is a number"},
+        {{"-n", "9999999999999999999", "a"}, "the limit is a number"},
+    };
+    const TemporaryFolder folder;
+    for (const auto& [arguments, problem] : cases)
+    {
+        EXPECT_EQ("pagemeld-check: " + problem + "\n" + usage, ReportOfCheck(folder, arguments));
+    }
+    EXPECT_EQ(2, RunProgram(PAGEMELD_CHECK_PROGRAM, {"--colour", "a"}).status);
+    const ProgramResult unknown = RunProgram(PAGEMELD_CHECK_PROGRAM, {"--explain=no-such"});
+    EXPECT_EQ(2, unknown.status);
+    EXPECT_EQ("", unknown.standardOutput);
+    EXPECT_NE(std::string::npos, unknown.standardError.find("\n  no-modules"));
+    EXPECT_EQ(2, RunProgram("sh", {"-c", std::string(PAGEMELD_CHECK_PROGRAM) + " a >/dev/full"}).status);
+}
+
+TEST(PagemeldCheck, ExplainsEveryRuleInHelpAndOnItsPage)
+{
+    const std::string help = RunProgram(PAGEMELD_CHECK_PROGRAM, {"--help"}).standardOutput;
+    const std::string page = ReadWholeFile(RULES_PAGE);
+    std::string expected = page.substr(0, page.find("\n## ") + 1);
+    for (const Rule& rule : AllRules())
+    {
+        const std::string level = NameOf(rule.level);
+        EXPECT_NE(std::string::npos, help.find(level + ": " + rule.meaning + "\n")) << rule.id;
+        const std::string text =
+            level + ": " + rule.meaning + ".\n\n" + rule.consequence + "\n\n" + rule.remedy + "\n";
+        expected += "## `" + std::string(rule.id) + "`\n\n" + static_cast<char>(std::toupper(level[0])) +
+                    text.substr(1) + "\n";
+        EXPECT_EQ(std::string(rule.id) + " (" + level + "): " + rule.meaning + "\n\n" + rule.consequence +
+                      "\n\n" + rule.remedy + "\n",
+                  RunProgram(PAGEMELD_CHECK_PROGRAM, {"-e", rule.id}).standardOutput);
+    }
+    expected.pop_back();
+    EXPECT_EQ(ReplaceAll(expected, "\n", " "), ReplaceAll(page, "\n", " "));
+}
