@@ -10,6 +10,7 @@
 
     const RESULTS_AT_ONCE = 30;
     const [EXCERPT_LENGTH, LEAD_LENGTH] = [300, 80]; // the lead comes before the first word found
+    const HELD = 1 << 12; // more than all words of a query add otherwise
     const LETTER = "[\\p{L}\\p{M}\\p{N}_]";
     const WORDS = new RegExp(`${LETTER}+`, "gu");
 
@@ -109,24 +110,26 @@
         };
     }
 
-    // Marks the texts and pages that hold a word: a page 4, in its title 2 more, whole 1 more.
+    // Marks the texts and pages that hold a word: a page with HELD, in its title 2 more, whole 1 more.
     function lookUp(word, isPrefix) {
         const { searchIndex, titles, words, pageOfText } = index;
         const texts = new Uint8Array(pageOfText.length);
-        const pages = new Uint8Array(index.pages.length);
+        const pages = new Uint16Array(index.pages.length);
         for (const term of isPrefix ? words.filter((other) => other.startsWith(word)) : [word]) {
             const whole = term === word ? 1 : 0;
             for (const text of Object.hasOwn(searchIndex, term) ? searchIndex[term] : []) {
                 texts[text] = 1;
-                pages[pageOfText[text]] |= 4 | whole;
+                pages[pageOfText[text]] |= HELD | whole;
             }
-            titles.get(term)?.forEach((page) => { pages[page] |= 4 | 2 | whole; });
+            titles.get(term)?.forEach((page) => { pages[page] |= HELD | 2 | whole; });
         }
         return { texts, pages };
     }
 
+    const addTo = (sums, marks) => { for (let i = 0; i < marks.length; i++) { sums[i] += marks[i]; } };
+
     // The pages that hold every word, those with the larger sum of marks first, then in their own order; and of
-    // each page the text that holds most words. There are many texts, hence the plain loops.
+    // each page the text that holds most words.
     function search(words) {
         const { pages: { length }, pageOfText } = index;
         const scores = new Float64Array(length);
@@ -134,17 +137,15 @@
         const counts = new Uint16Array(pageOfText.length);
         words.forEach((word, i) => {
             const { texts, pages } = lookUp(word, i === words.length - 1);
-            for (let text = 0; text < texts.length; text++) {
-                counts[text] += texts[text];
-            }
-            pages.forEach((mark, page) => { scores[page] += mark || -Infinity; });
+            addTo(counts, texts);
+            addTo(scores, pages);
         });
         for (let text = 0; text < counts.length; text++) {
             const page = pageOfText[text];
             bestTexts[page] = counts[text] <= counts[bestTexts[page]] ? bestTexts[page] : text;
         }
-        const ranks = [];
-        scores.forEach((score, page) => score > 0 && (ranks[score] ??= []).push(page));
+        const [ranks, least] = [[], HELD * words.length];
+        scores.forEach((score, page) => score >= least && (ranks[score - least] ??= []).push(page));
         return { words, pages: ranks.reverse().flat(), bestTexts };
     }
 
@@ -210,7 +211,7 @@
         }
     }
 
-    // Writes the query into the address. Leaves all else there as it is: the page may read it.
+    // Writes the query into the address; all else there may be the page's.
     function keepQuery() {
         const address = new URL(document.URL);
         const others = address.search.slice(1).split("&").filter((part) => part && !part.startsWith("pagemeld="));
@@ -293,7 +294,7 @@
     const isPlain = (event) => !event.isComposing &&
         !["Control", "Alt", "Meta", "AltGraph"].some((key) => event.getModifierState(key));
 
-    // "/" leads to the box, unless it is typed somewhere or the page has taken it.
+    // "/" leads to the box, unless it is typed or the page has taken it.
     function onPageKey(event) {
         const [target] = event.composedPath();
         const isTyped = target.isContentEditable || /^(input|textarea|select)$/.test(target.localName);
