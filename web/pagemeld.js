@@ -1,8 +1,8 @@
 // Search and contents of all combined modules, in a documentation page.
 //
-// Nothing can be fetched in a page opened from a folder on disk, so the outputs run as classic scripts. A page's own
+// A page opened from a directory on disk can't fetch anything, so the outputs run as classic scripts. A page's own
 // "const p0" would make their globals a syntax error, so each runs in a hidden frame, removed once its values are
-// taken. The contents wait until the page is idle, the search index, half a second of work for 35 MB, until the
+// taken. The contents load when the page is idle. The search index takes half a second for 35 MB and loads when the
 // reader turns to the box. Titles and texts enter the page as text only.
 
 (function () {
@@ -13,12 +13,14 @@
     const LETTER = "[\\p{L}\\p{M}\\p{N}_]";
     const WORDS = new RegExp(`${LETTER}+`, "gu");
 
-    const { document, history, Map, Set, URL } = window; // whatever the page's scripts call so
-    const tag = document.currentScript; // a <base> after it had no part in finding it
+    const fresh = document.documentElement.appendChild(create("iframe", {}));
+    const { Map, Set, URL } = fresh.contentWindow; // a page may redefine these
+    fresh.remove();
+    const tag = document.currentScript; // a later <base> did not change where it led
     const isBeforeBase = document.querySelector("base[href]")?.compareDocumentPosition(tag) & 2;
     const ownAddress = isBeforeBase ? new URL(tag.getAttribute("src"), document.URL) : tag.src;
-    const shared = tag.dataset.docdata?.replace(/\/?$/, "/");
-    const docdata = shared === undefined ? new URL(".", ownAddress) : new URL(shared, document.URL);
+    const shared = tag.dataset.docdata;
+    const docdata = shared ? new URL(shared.replace(/\/?$/, "/"), document.URL) : new URL(".", ownAddress);
     const setFolder = new URL("..", docdata).href;
 
     const box = create("input", { type: "search", autocomplete: "off", spellcheck: "false" });
@@ -59,9 +61,7 @@
         const frame = create("iframe", {});
         frame.style.display = "none";
         await loaded(frame, view);
-        const script = frame.contentDocument.createElement("script");
-        script.src = new URL(name, docdata);
-        await loaded(script, frame.contentDocument.head);
+        await loaded(create("script", { src: new URL(name, docdata) }), frame.contentDocument.head);
         const values = takeGlobals(frame.contentWindow, globals);
         frame.remove();
         complaint.textContent = values ? "" : `${subject} not available: ${name} did not run`;
@@ -73,7 +73,7 @@
     const prefixOf = (link, prefixes) => prefixes.find((prefix) => link.startsWith(prefix)) || "";
 
     // A link is a path on disk, in which only "#" has a meaning. The outputs put the prefix before whole addresses
-    // too; "std::list.html" is none, and a script is none for readers to follow.
+    // too. "std::list.html" is not one, and "javascript:" must not run.
     function addressOf(link, prefixes) {
         const prefix = prefixOf(link, prefixes);
         const rest = link.slice(prefix.length);
@@ -125,8 +125,8 @@
         return { texts, pages };
     }
 
-    // The pages that hold every word, those with the larger sum of marks first, then in their own order; and of
-    // each page the text that holds most words. There are many texts, hence the plain loops.
+    // The pages that hold every word, those with the larger sum of marks first, then in their own order, and of
+    // each page the text that holds most words. Plain loops, as there are many texts.
     function search(words) {
         const { pages: { length }, pageOfText } = index;
         const scores = new Float64Array(length);
@@ -158,7 +158,7 @@
             : rare.length > 0 ? search(rare) : { pages: [], isCommonOnly: words.length > 0 };
     }
 
-    // Some lines of a text around the first of the words, the last of which is a prefix; all are marked.
+    // Some lines around the first of the words, all of which are marked. The last one is a prefix.
     function excerpt(text, words) {
         const word = new RegExp(`(?<!${LETTER})(${words.join("|")}${LETTER}*)(?!${LETTER})`, "giu");
         const first = text.search(word);
@@ -210,13 +210,13 @@
         }
     }
 
-    // Writes the query into the address. Leaves all else there as it is: the page may read it.
+    // Writes the query into the address and leaves the rest to the page.
     function keepQuery() {
         const address = new URL(document.URL);
         const others = address.search.slice(1).split("&").filter((part) => part && !part.startsWith("pagemeld="));
         const query = box.value.trim();
         address.search = others.concat(query ? "pagemeld=" + encodeURIComponent(query) : []).join("&");
-        history.replaceState(history.state, "", address);
+        window.history.replaceState(window.history.state, "", address);
     }
 
     // A button that shows and hides a list, and calls fill before it shows an empty one.
@@ -236,11 +236,10 @@
 
     // A test whether a link leads to the page being read; only few links are taken apart for it.
     function createPageTest(prefixes) {
-        const path = pathOf(document.location);
-        const name = path.slice(path.lastIndexOf("/") + 1);
+        const name = pathOf(location).split("/").at(-1);
         return (link) => {
-            const address = link.includes(name) && new URL(addressOf(link, prefixes));
-            return address && address.host === document.location.host && pathOf(address) === path;
+            const address = link.includes(name) && create("a", { href: addressOf(link, prefixes) });
+            return address && address.host === location.host && pathOf(address) === pathOf(location);
         };
     }
 
@@ -270,7 +269,7 @@
             const list = create("ul", {});
             const button = createButton(isLink ? "" : name, list,
                 () => list.append(...createEntries(children, way, prefixes)));
-            isLink && button.setAttribute("aria-label", `Below ${title}`);
+            isLink && button.setAttribute("aria-label", `Below ${name.text}`);
             way.slice(0, -1).includes(node) && button.click();
             return create("li", {}, button, isLink ? name : "", list);
         });
@@ -307,7 +306,7 @@
     // Down and Up lead through the box and the results, Escape to the box, and clears it there.
     function onFinderKey(event) {
         const { key, target } = event;
-        const stops = [box, ...results.querySelectorAll("a"), more];
+        const stops = [box, ...results.querySelectorAll("a"), ...(more.hidden ? [] : [more])];
         const step = stops.includes(target) ? { ArrowDown: 1, ArrowUp: -1 }[key] : 0;
         const next = key === "Escape" ? box : step && stops[stops.indexOf(target) + step];
         if (next && !event.shiftKey && isPlain(event)) {
@@ -343,13 +342,12 @@
         if (document.body?.localName !== "body") {
             return; // a frame set
         }
-        const place = document.getElementById("pagemeld") ?? createPlace();
-        place.append(view);
+        (document.getElementById("pagemeld") ?? createPlace()).append(view);
         listen();
         matchMedia("(min-width: 48em)").matches && contentsButton.click();
-        box.value = new URLSearchParams(document.location.search).get("pagemeld") ?? "";
+        box.value = new URLSearchParams(location.search).get("pagemeld") ?? "";
         box.value && loadIndex();
-        await loaded(create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress) }), place);
+        await loaded(create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress) }), view);
         view.hidden = false;
         (window.requestIdleCallback ?? setTimeout)(loadContents);
     }
