@@ -1,4 +1,4 @@
-// Search and contents of all combined modules, in a documentation page.
+// Search and contents of all modules, in a documentation page.
 //
 // A page opened from a directory on disk can't fetch anything, so the outputs run as classic scripts. A page's own
 // "const p0" would make their globals a syntax error, so each runs in a hidden frame, removed once its values are
@@ -90,7 +90,7 @@
 
     const wordsOf = (text) => text.toLowerCase().match(WORDS) || [];
 
-    // The name of the module folder: ".../charts/Manual/" is of "charts".
+    // The module directory: "charts" for ".../charts/Manual/".
     const moduleName = (prefix) => decode(new URL(addressOf(prefix, [prefix])).pathname.split("/").at(-3) ?? "");
     const moduleOf = (page) => index.modules.get(prefixOf(index.pages[page][0], index.prefixes));
 
@@ -126,7 +126,7 @@
     }
 
     // The pages that hold every word, those with the larger sum of marks first, then in their own order, and of
-    // each page the text that holds most words. Plain loops, as there are many texts.
+    // each page the text that holds most words. Plain loops: there are many texts.
     function search(words) {
         const { pages: { length }, pageOfText } = index;
         const scores = new Float64Array(length);
@@ -174,7 +174,7 @@
             create("span", {}, moduleOf(page)), create("p", {}, ...excerpt(text, found.words)));
     }
 
-    // Returns the first of the results that it adds.
+    // Returns the first result that it adds.
     function showMore() {
         const shown = results.childElementCount;
         results.append(...found.pages.slice(shown, shown + RESULTS_AT_ONCE).map(createResult));
@@ -234,7 +234,7 @@
 
     const pathOf = ({ pathname }) => decode(pathname.replace(/\/$/, "/index.html"));
 
-    // A test whether a link leads to the page being read; only few links are taken apart for it.
+    // Tests whether a link leads to this page. Takes few links apart.
     function createPageTest(prefixes) {
         const name = pathOf(location).split("/").at(-1);
         return (link) => {
@@ -254,7 +254,7 @@
         return null;
     }
 
-    // The entries of a list. Those on the way to the page are opened, but for the last, which is the page.
+    // The entries of a list. Those on the way to the page are opened.
     function createEntries(nodes, way, prefixes) {
         return nodes.map((node) => {
             const { link, title, children } = node;

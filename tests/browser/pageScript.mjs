@@ -25,8 +25,8 @@ const index = {
 };
 const pages = {
     "far/off/hostile.html": `<!DOCTYPE html><html dir="rtl"><style>div, input { display: none }</style>
-        <p id="toc">${tag}<textarea></textarea><script>const info = 1, p0 = 2, pages = 3, common = 4; class Set {} var URL = 5; function Map() {}
-        onkeydown = (event) => document.title !== "taken" || event.key !== "/";</script>`,
+        <p id="toc">${tag}<textarea></textarea><script>const info = 1, p0 = 2, pages = 3, common = 4; class Set {}
+        var URL, Map = "Map"; onkeydown = (event) => document.title !== "taken" || event.key !== "/";</script>`,
     "far/off/latin.html": Buffer.from(`<meta charset="iso-8859-1"><title>Gr\u00f6\u00dfe</title>${tag}`, "latin1"),
     "far/off/strict.xhtml": `<html xmlns="http://www.w3.org/1999/xhtml"><head>${tag}</head><body/></html>`,
     "far/off/based.html": `${tag}<base href="http://invalid.invalid/" target="_blank"><p>x`,
