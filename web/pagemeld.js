@@ -1,9 +1,8 @@
-// Search and contents of all combined modules, in a documentation page.
+// Search and contents of all modules, in a documentation page.
 //
-// Nothing can be fetched in a page opened from a folder on disk, so the outputs run as classic scripts. A page's own
-// "const p0" would make their globals a syntax error, so each runs in a hidden frame, removed once its values are
-// taken. The contents wait until the page is idle, the search index, half a second of work for 35 MB, until the
-// reader turns to the box. Titles and texts enter the page as text only.
+// A page on disk can't fetch anything, so the outputs run as classic scripts. A page's own "const p0" would make their
+// globals a syntax error, so each runs in a hidden frame, removed once its values are taken. The contents load when the
+// page is idle, the search index when the reader turns to the box. Titles and texts enter the page as text only.
 
 (function () {
     "use strict";
@@ -14,12 +13,14 @@
     const LETTER = "[\\p{L}\\p{M}\\p{N}_]";
     const WORDS = new RegExp(`${LETTER}+`, "gu");
 
-    const { document, history, Map, Set, URL } = window; // whatever the page's scripts call so
-    const tag = document.currentScript; // a <base> after it had no part in finding it
+    const fresh = document.documentElement.appendChild(create("iframe", {}));
+    const { Map, Set, URL } = fresh.contentWindow; // a page may redefine these
+    fresh.remove();
+    const tag = document.currentScript; // a later <base> did not change where it led
     const isBeforeBase = document.querySelector("base[href]")?.compareDocumentPosition(tag) & 2;
     const ownAddress = isBeforeBase ? new URL(tag.getAttribute("src"), document.URL) : tag.src;
-    const shared = tag.dataset.docdata?.replace(/\/?$/, "/");
-    const docdata = shared === undefined ? new URL(".", ownAddress) : new URL(shared, document.URL);
+    const shared = tag.dataset.docdata;
+    const docdata = shared ? new URL(shared.replace(/\/?$/, "/"), document.URL) : new URL(".", ownAddress);
     const setFolder = new URL("..", docdata).href;
 
     const box = create("input", { type: "search", autocomplete: "off", spellcheck: "false" });
@@ -60,9 +61,7 @@
         const frame = create("iframe", {});
         frame.style.display = "none";
         await loaded(frame, view);
-        const script = frame.contentDocument.createElement("script");
-        script.src = new URL(name, docdata);
-        await loaded(script, frame.contentDocument.head);
+        await loaded(create("script", { src: new URL(name, docdata) }), frame.contentDocument.head);
         const values = takeGlobals(frame.contentWindow, globals);
         frame.remove();
         complaint.textContent = values ? "" : `${subject} not available: ${name} did not run`;
@@ -74,7 +73,7 @@
     const prefixOf = (link, prefixes) => prefixes.find((prefix) => link.startsWith(prefix)) || "";
 
     // A link is a path on disk, in which only "#" has a meaning. The outputs put the prefix before whole addresses
-    // too; "std::list.html" is none, and a script is none for readers to follow.
+    // too. "std::list.html" is not one, and "javascript:" must not run.
     function addressOf(link, prefixes) {
         const prefix = prefixOf(link, prefixes);
         const rest = link.slice(prefix.length);
@@ -91,7 +90,7 @@
 
     const wordsOf = (text) => text.toLowerCase().match(WORDS) || [];
 
-    // The name of the module folder: ".../charts/Manual/" is of "charts".
+    // The module directory: "charts" for ".../charts/Manual/".
     const moduleName = (prefix) => decode(new URL(addressOf(prefix, [prefix])).pathname.split("/").at(-3) ?? "");
     const moduleOf = (page) => index.modules.get(prefixOf(index.pages[page][0], index.prefixes));
 
@@ -128,7 +127,7 @@
 
     const addTo = (sums, marks) => { for (let i = 0; i < marks.length; i++) { sums[i] += marks[i]; } };
 
-    // The pages that hold every word, those with the larger sum of marks first, then in their own order; and of
+    // The pages that hold every word, those with the larger sum of marks first, then in their own order, and of
     // each page the text that holds most words.
     function search(words) {
         const { pages: { length }, pageOfText } = index;
@@ -159,7 +158,7 @@
             : rare.length > 0 ? search(rare) : { pages: [], isCommonOnly: words.length > 0 };
     }
 
-    // Some lines of a text around the first of the words, the last of which is a prefix; all are marked.
+    // Some lines around the first of the words, all of which are marked. The last one is a prefix.
     function excerpt(text, words) {
         const word = new RegExp(`(?<!${LETTER})(${words.join("|")}${LETTER}*)(?!${LETTER})`, "giu");
         const first = text.search(word);
@@ -175,7 +174,7 @@
             create("span", {}, moduleOf(page)), create("p", {}, ...excerpt(text, found.words)));
     }
 
-    // Returns the first of the results that it adds.
+    // Returns the first result that it adds.
     function showMore() {
         const shown = results.childElementCount;
         results.append(...found.pages.slice(shown, shown + RESULTS_AT_ONCE).map(createResult));
@@ -211,13 +210,13 @@
         }
     }
 
-    // Writes the query into the address; all else there may be the page's.
+    // Writes the query into the address and leaves the rest to the page.
     function keepQuery() {
         const address = new URL(document.URL);
         const others = address.search.slice(1).split("&").filter((part) => part && !part.startsWith("pagemeld="));
         const query = box.value.trim();
         address.search = others.concat(query ? "pagemeld=" + encodeURIComponent(query) : []).join("&");
-        history.replaceState(history.state, "", address);
+        window.history.replaceState(window.history.state, "", address);
     }
 
     // A button that shows and hides a list, and calls fill before it shows an empty one.
@@ -235,13 +234,12 @@
 
     const pathOf = ({ pathname }) => decode(pathname.replace(/\/$/, "/index.html"));
 
-    // A test whether a link leads to the page being read; only few links are taken apart for it.
+    // Tests whether a link leads to this page. Takes few links apart.
     function createPageTest(prefixes) {
-        const path = pathOf(document.location);
-        const name = path.slice(path.lastIndexOf("/") + 1);
+        const name = pathOf(location).split("/").at(-1);
         return (link) => {
-            const address = link.includes(name) && new URL(addressOf(link, prefixes));
-            return address && address.host === document.location.host && pathOf(address) === path;
+            const address = link.includes(name) && create("a", { href: addressOf(link, prefixes) });
+            return address && address.host === location.host && pathOf(address) === pathOf(location);
         };
     }
 
@@ -256,7 +254,7 @@
         return null;
     }
 
-    // The entries of a list. Those on the way to the page are opened, but for the last, which is the page.
+    // The entries of a list. Those on the way to the page are opened.
     function createEntries(nodes, way, prefixes) {
         return nodes.map((node) => {
             const { link, title, children } = node;
@@ -271,7 +269,7 @@
             const list = create("ul", {});
             const button = createButton(isLink ? "" : name, list,
                 () => list.append(...createEntries(children, way, prefixes)));
-            isLink && button.setAttribute("aria-label", `Below ${title}`);
+            isLink && button.setAttribute("aria-label", `Below ${name.text}`);
             way.slice(0, -1).includes(node) && button.click();
             return create("li", {}, button, isLink ? name : "", list);
         });
@@ -308,7 +306,7 @@
     // Down and Up lead through the box and the results, Escape to the box, and clears it there.
     function onFinderKey(event) {
         const { key, target } = event;
-        const stops = [box, ...results.querySelectorAll("a"), more];
+        const stops = [box, ...results.querySelectorAll("a"), ...(more.hidden ? [] : [more])];
         const step = stops.includes(target) ? { ArrowDown: 1, ArrowUp: -1 }[key] : 0;
         const next = key === "Escape" ? box : step && stops[stops.indexOf(target) + step];
         if (next && !event.shiftKey && isPlain(event)) {
@@ -344,13 +342,12 @@
         if (document.body?.localName !== "body") {
             return; // a frame set
         }
-        const place = document.getElementById("pagemeld") ?? createPlace();
-        place.append(view);
+        (document.getElementById("pagemeld") ?? createPlace()).append(view);
         listen();
         matchMedia("(min-width: 48em)").matches && contentsButton.click();
-        box.value = new URLSearchParams(document.location.search).get("pagemeld") ?? "";
+        box.value = new URLSearchParams(location.search).get("pagemeld") ?? "";
         box.value && loadIndex();
-        await loaded(create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress) }), place);
+        await loaded(create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress) }), view);
         view.hidden = false;
         (window.requestIdleCallback ?? setTimeout)(loadContents);
     }
