@@ -1,89 +1,97 @@
 #include "Tools/DocTools/PagemeldCheck/Rules.h"
 
 #include <algorithm>
+#include <iterator>
+
+namespace
+{
+
+constexpr Rule kRules[] = {
+    {"no-modules", Level::Error, "--discover found no module",
+     "Nothing is combined; earlier outputs stay, and the run ends with status 0.",
+     "Give the directory above the modules: a module holds the directory Manual/docdata."},
+    {"duplicate-root", Level::Error, "two roots are the same directory",
+     "The module's pages are in the search twice, and its links in the contents may be those of either "
+     "name.",
+     "Give each module once."},
+    {"passed-over", Level::Warning, "a directory looks like a module, but --discover does not take it",
+     "The module is missing from search and contents, and receives no outputs.",
+     "Move it out of a hidden directory, replace a link by the directory, add Manual/docdata, or give "
+     "the roots by name."},
+    {"output-blocked", Level::Error, "an output can't be written",
+     "For global_index.js the run ends there with status 255, and later modules stay unwritten; any "
+     "other output stays as it was.",
+     "Create the docdata directory, make it writable, and remove what is in the way of the output or of "
+     "its temporary file."},
+    {"wrong-link-path", Level::Error, "links from a module to another one lead astray",
+     "The links are dead, or lead to another module. Prefixes are computed on the paths as typed.",
+     "Rename a module whose name begins with another's, give absolute roots, put no slash at their end, "
+     "and keep quotes, backslashes and line breaks out of their names."},
+    {"unreadable", Level::Error, "a file of the set is missing beside the other one, or can't be read",
+     "The module is missing from the search (index.json) or from the contents (toc.json).",
+     "Create the file or make it readable."},
+    {"set-empty", Level::Note, "a module has the docdata directory of a set, but neither file",
+     "The module adds nothing to the set; it receives the outputs.",
+     "None is needed if the module has no such documentation."},
+    {"nothing-to-combine", Level::Error, "no module of the set has a sound index, or none sound contents",
+     "Nothing is written for the set, and earlier outputs stay.",
+     "Mend at least one index.json and one toc.json of the set."},
+    {"not-json", Level::Error, "a file is no JSON, or exceeds a limit of the reader",
+     "The module is missing from the search (index.json) or from the contents (toc.json).",
+     "Mend the text at the place that is named; write the file by a JSON library."},
+    {"structure", Level::Error, "a file breaks its format",
+     "The module is missing from the search (index.json) or from the contents (toc.json); the run names "
+     "the first such fault only.",
+     "Mend every entry that is named; docs/FORMATS.md has the formats."},
+    {"merged-input", Level::Error, "an input is an output of an earlier run",
+     "An index.json is refused, and the module is missing from the search. A toc.json is taken, and its "
+     "links lead to other modules than they should.",
+     "Put the module's own file in its place."},
+    {"root-differs", Level::Error, "the root of a toc.json differs from that of the first module",
+     "The module is missing from the contents, without a message.",
+     "Give the roots of all modules the same link and title."},
+    {"script-broken", Level::Error, "a title, page path or link is no whole string in the scripts",
+     "The script is a syntax error in every module: nobody can search, or nobody sees the contents.",
+     "Replace the backslash, quote or line break by another character."},
+    {"script-altered", Level::Warning, "a title, page path or link has another value in the scripts",
+     "Readers see another title, or the link is dead.",
+     "Replace the backslash by another character, and remove NUL characters."},
+    {"prefixed-url", Level::Warning, "a page path or link is an address of its own (https://...)",
+     "The module's prefix is put before it, so that it is dead unless the page script takes it off "
+     "again.",
+     "Link to a page of the module, or use the page script."},
+    {"special-term", Level::Warning, "__proto__ is a term or common word",
+     "In the scripts it sets the prototype of the object instead of a member: it is not found.",
+     "Leave it out, or use global_index.json."},
+    {"invalid-utf8", Level::Warning, "a file is no UTF-8",
+     "Readers see replacement characters, and can't search for the words.", "Save the file as UTF-8."},
+    {"text-after-nul", Level::Warning, "bytes after a NUL byte are not seen",
+     "What follows is missing without a message.", "Remove the NUL byte; a file in UTF-16 has many."},
+    {"common-ignored", Level::Note, "modules of a set have different common words",
+     "Those of the first module that has any count for all; the others' are ignored.",
+     "Use one list for all modules."},
+    {"missing-target", Level::Warning, "--targets: a page path or link leads to no file", "The link is dead.",
+     "Mend the path; it is relative to the set's directory."},
+    {"output-missing", Level::Error, "--outputs: an output is not there",
+     "Readers of the module can't search, or see no contents.", "Run pagemeld, and read its messages."},
+    {"output-broken", Level::Error, "--outputs: an output is cut short or no JSON",
+     "Readers of the module can't search, or see no contents.",
+     "Free space on the disk and run pagemeld again."},
+    {"output-differs", Level::Error, "--outputs: an output has other content than in the first module",
+     "Readers of different modules find different things: a run ended early.",
+     "Run pagemeld again, and look at its exit status."},
+    {"output-stale", Level::Error, "--outputs: an output is older than an input of the set",
+     "Readers see what an earlier build said.", "Run pagemeld again."},
+    {"leftover", Level::Error, "--outputs: a temporary file stayed",
+     "A run was ended, or could not rename the file: the output beside it may be old.",
+     "Run pagemeld again; remove a directory that has the output's name."},
+};
+
+} // namespace
 
 const std::vector<Rule>& AllRules()
 {
-    static const std::vector<Rule> rules = {
-        {"no-modules", Level::Error, "--discover found no module",
-         "Nothing is combined; earlier outputs stay, and the run ends with status 0.",
-         "Give the directory above the modules: a module holds the directory Manual/docdata."},
-        {"duplicate-root", Level::Error, "two roots are the same directory",
-         "The module's pages are in the search twice, and its links in the contents may be those of either "
-         "name.",
-         "Give each module once."},
-        {"passed-over", Level::Warning, "a directory looks like a module, but --discover does not take it",
-         "The module is missing from search and contents, and receives no outputs.",
-         "Move it out of a hidden directory, replace a link by the directory, add Manual/docdata, or give "
-         "the roots by name."},
-        {"output-blocked", Level::Error, "an output can't be written",
-         "For global_index.js the run ends there with status 255, and later modules stay unwritten; any "
-         "other output stays as it was.",
-         "Create the docdata directory, make it writable, and remove what is in the way of the output or of "
-         "its temporary file."},
-        {"wrong-link-path", Level::Error, "links from a module to another one lead astray",
-         "The links are dead, or lead to another module. Prefixes are computed on the paths as typed.",
-         "Rename a module whose name begins with another's, give absolute roots, put no slash at their end, "
-         "and keep quotes, backslashes and line breaks out of their names."},
-        {"unreadable", Level::Error, "a file of the set is missing beside the other one, or can't be read",
-         "The module is missing from the search (index.json) or from the contents (toc.json).",
-         "Create the file or make it readable."},
-        {"set-empty", Level::Note, "a module has the docdata directory of a set, but neither file",
-         "The module adds nothing to the set; it receives the outputs.",
-         "None is needed if the module has no such documentation."},
-        {"nothing-to-combine", Level::Error, "no module of the set has a sound index, or none sound contents",
-         "Nothing is written for the set, and earlier outputs stay.",
-         "Mend at least one index.json and one toc.json of the set."},
-        {"not-json", Level::Error, "a file is no JSON, or exceeds a limit of the reader",
-         "The module is missing from the search (index.json) or from the contents (toc.json).",
-         "Mend the text at the place that is named; write the file by a JSON library."},
-        {"structure", Level::Error, "a file breaks its format",
-         "The module is missing from the search (index.json) or from the contents (toc.json); the run names "
-         "the first such fault only.",
-         "Mend every entry that is named; docs/FORMATS.md has the formats."},
-        {"merged-input", Level::Error, "an input is an output of an earlier run",
-         "An index.json is refused, and the module is missing from the search. A toc.json is taken, and its "
-         "links lead to other modules than they should.",
-         "Put the module's own file in its place."},
-        {"root-differs", Level::Error, "the root of a toc.json differs from that of the first module",
-         "The module is missing from the contents, without a message.",
-         "Give the roots of all modules the same link and title."},
-        {"script-broken", Level::Error, "a title, page path or link is no whole string in the scripts",
-         "The script is a syntax error in every module: nobody can search, or nobody sees the contents.",
-         "Replace the backslash, quote or line break by another character."},
-        {"script-altered", Level::Warning, "a title, page path or link has another value in the scripts",
-         "Readers see another title, or the link is dead.",
-         "Replace the backslash by another character, and remove NUL characters."},
-        {"prefixed-url", Level::Warning, "a page path or link is an address of its own (https://...)",
-         "The module's prefix is put before it, so that it is dead unless the page script takes it off "
-         "again.",
-         "Link to a page of the module, or use the page script."},
-        {"special-term", Level::Warning, "__proto__ is a term or common word",
-         "In the scripts it sets the prototype of the object instead of a member: it is not found.",
-         "Leave it out, or use global_index.json."},
-        {"invalid-utf8", Level::Warning, "a file is no UTF-8",
-         "Readers see replacement characters, and can't search for the words.", "Save the file as UTF-8."},
-        {"text-after-nul", Level::Warning, "bytes after a NUL byte are not seen",
-         "What follows is missing without a message.", "Remove the NUL byte; a file in UTF-16 has many."},
-        {"common-ignored", Level::Note, "modules of a set have different common words",
-         "Those of the first module that has any count for all; the others' are ignored.",
-         "Use one list for all modules."},
-        {"missing-target", Level::Warning, "--targets: a page path or link leads to no file",
-         "The link is dead.", "Mend the path; it is relative to the set's directory."},
-        {"output-missing", Level::Error, "--outputs: an output is not there",
-         "Readers of the module can't search, or see no contents.", "Run pagemeld, and read its messages."},
-        {"output-broken", Level::Error, "--outputs: an output is cut short or no JSON",
-         "Readers of the module can't search, or see no contents.",
-         "Free space on the disk and run pagemeld again."},
-        {"output-differs", Level::Error, "--outputs: an output has other content than in the first module",
-         "Readers of different modules find different things: a run ended early.",
-         "Run pagemeld again, and look at its exit status."},
-        {"output-stale", Level::Error, "--outputs: an output is older than an input of the set",
-         "Readers see what an earlier build said.", "Run pagemeld again."},
-        {"leftover", Level::Error, "--outputs: a temporary file stayed",
-         "A run was ended, or could not rename the file: the output beside it may be old.",
-         "Run pagemeld again; remove a directory that has the output's name."},
-    };
+    static const std::vector<Rule> rules(std::begin(kRules), std::end(kRules));
     return rules;
 }
 
