@@ -5,10 +5,10 @@
 #include "tests/support/TemporaryFolder.h"
 #include "tests/support/WholeFile.h"
 
-// The checker takes any bytes as the input files of two modules, tells a module as missing exactly if the
-// tool's own reader and structure checks refuse its file or its root differs, and can print what it tells.
+// The checker takes any bytes as the input files of two modules, reports a module as missing exactly if the
+// tool's own reader and structure checks refuse its file or its root differs, and can print what it finds.
 //
-// A byte 0xFF ends a file, so that a NUL byte can stand in one.
+// A byte 0xFF ends a file, so that one can hold a NUL byte.
 
 namespace
 {
@@ -22,7 +22,7 @@ constexpr const char* kNames[kFiles] = {"a/Manual/docdata/index.json", "b/Manual
 std::vector<std::string> SplitFiles(const std::uint8_t* data, std::size_t size)
 {
     std::vector<std::string> files(1);
-    for (const char c : InputText(data, size))
+    for (const char c : std::string_view(reinterpret_cast<const char*>(data), size))
     {
         if (c == '\xFF' && files.size() < kFiles)
         {
