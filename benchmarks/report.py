@@ -38,7 +38,7 @@ GOALS = [
 
 
 def goal_table(results):
-    """Returns the goals with what was measured; what misses its goal stands in bold."""
+    """Returns the goals with what was measured; those that miss their goal are bold."""
     rows = [("measure", "goal", *results), ("---",) * (2 + len(results))]
     for text, goal, measured in GOALS:
         rows.append((text, goal, *(goal_cell(goal, measured, rounds_of) for rounds_of in results.values())))

@@ -25,7 +25,7 @@ namespace
 
 namespace fs = std::filesystem;
 
-// What stands at a path instead of a file.
+// What is at a path instead of a file.
 const std::string kGone = "(gone)";
 const std::string kDirectory = "(directory)";
 const std::string kPipe = "(pipe)";

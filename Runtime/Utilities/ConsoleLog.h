@@ -19,7 +19,7 @@ using LogEntryHandler = bool (*)(LogType type, const char* format, std::va_list 
 /// Replaces the handler; null accepts every message.
 void SetLogEntryHandler(LogEntryHandler handler);
 
-/// Makes the stream the console; null stands for standard output, which is the console at first. The caller
+/// Makes the stream the console; null means standard output, which is the console at first. The caller
 /// owns the stream, and must set another before closing it.
 void SetConsoleStream(std::FILE* stream);
 
