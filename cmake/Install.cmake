@@ -1,7 +1,7 @@
 # What cmake --install puts where: the programs, the CMake package, the page script, and the documents.
 
 include(CMakePackageConfigHelpers)
-set(CMAKE_INSTALL_DOCDIR share/doc/pagemeld CACHE PATH "Directory of README, LICENSE, CHANGELOG and the examples")
+set(CMAKE_INSTALL_DOCDIR share/doc/pagemeld CACHE PATH "Directory of README, docs and the examples")
 include(GNUInstallDirs)
 
 install(TARGETS pagemeld pagemeld-check EXPORT PagemeldTargets)
@@ -22,7 +22,8 @@ install(FILES ${PROJECT_BINARY_DIR}/PagemeldConfig.cmake ${PROJECT_BINARY_DIR}/P
         DESTINATION ${package_directory})
 
 install(DIRECTORY web/ DESTINATION ${PAGEMELD_WEB_DIRECTORY})
-install(FILES README.md LICENSE CHANGELOG.md DESTINATION ${CMAKE_INSTALL_DOCDIR})
+install(FILES README.md LICENSE CHANGELOG.md CONTRIBUTING.md SECURITY.md DESTINATION ${CMAKE_INSTALL_DOCDIR})
+install(DIRECTORY docs DESTINATION ${CMAKE_INSTALL_DOCDIR})
 install(DIRECTORY examples DESTINATION ${CMAKE_INSTALL_DOCDIR} PATTERN __pycache__ EXCLUDE)
 install(PROGRAMS examples/make-docdata.py DESTINATION ${CMAKE_INSTALL_DOCDIR}/examples)
 

@@ -151,7 +151,7 @@ status 1
 )"},
         {{"docs/m1", "docs/m12", "docs/m2/", R"(docs/a\b)"},
          {},
-         R"(docs/m1: error: links to docs/a\b will lead to docs/a/b/Manual: give absolute paths [wrong-link-path]
+         R"(docs/m1: error: links to docs/a\b will lead to docs/a/b/Manual: rename the directory [wrong-link-path]
 docs/m12: error: links to docs/m1 and 1 more will lead to docs/m12/Manual: one name begins with the other: rename one [wrong-link-path]
 docs/m2/: error: links to docs/m1 and 2 more will lead to m1/Manual: give the roots without a slash at the end [wrong-link-path]
 docs/a\b: error: a quote, backslash or line break in the path breaks both scripts of docs/m1: rename the directory [wrong-link-path]
@@ -274,7 +274,7 @@ status 1
           {"c/Manual/docdata/index.json", Index(R"(["p.html","P"])")},
           {"c/Manual/docdata/toc.json", Toc("", R"("link":"toc","title":"toc\u0000x")")}},
          R"(@/b/Manual/docdata/toc.json:1:23: error: root title "x" differs from "toc" of @/a; "b" will be missing from the contents of Manual [root-differs] /title
-@/c/Manual/docdata/toc.json:1:23: warning: title "toc\x00x" is "toc" in global_toc.js [script-altered] /title
+@/c/Manual/docdata/toc.json:1:23: warning: title "toc\x00x" is "toc" in global_toc.js: readers see that [script-altered] /title
 3 modules, 1 error, 1 warning; missing from the contents of Manual: b
 status 1
 )"},
@@ -304,8 +304,8 @@ status 1
          {{"a/Manual/docdata/index.json", Index(R"(["a.html","C:/new"])")},
           {"b/Manual/docdata/index.json", Index(R"(["a.html","C:\\new"])")},
           {"b/Manual/docdata/toc.json", Toc(R"({"link":"a\u0000.html","title":"A","children":null})")}},
-         R"(@/b/Manual/docdata/index.json:1:21: warning: title "C:\\new" of page "a.html" is "C:\new" in global_index.js [script-altered] /pages/0/1
-@/b/Manual/docdata/toc.json:1:49: warning: link "a\x00.html" is "a" in global_toc.js [script-altered] /children/0/link
+         R"(@/b/Manual/docdata/index.json:1:21: warning: title "C:\\new" of page "a.html" is "C:\new" in global_index.js: readers see that [script-altered] /pages/0/1
+@/b/Manual/docdata/toc.json:1:49: warning: link "a\x00.html" is "a" in global_toc.js: the link is dead [script-altered] /children/0/link
 2 modules, 0 errors, 2 warnings
 status 0
 )"},
@@ -360,9 +360,9 @@ status 0
           {"b/Manual/docdata/toc.json",
            Toc(R"({"link":"#x","title":"X","children":null},{"link":"q.html#p","title":"Q","children":null})",
                R"("link":"null","title":"")")}},
-         R"(@/b/Manual/docdata/index.json:1:12: warning: page path "docdata" leads to no file [missing-target] /pages/0/0
-@/b/Manual/docdata/toc.json:1:47: warning: link "#x" leads to no file [missing-target] /children/0/link
-@/b/Manual/docdata/toc.json:1:89: warning: link "q.html#p" leads to no file [missing-target] /children/1/link
+         R"(@/b/Manual/docdata/index.json:1:12: warning: page path "docdata" leads to no file: the link is dead [missing-target] /pages/0/0
+@/b/Manual/docdata/toc.json:1:47: warning: link "#x" leads to no file: the link is dead [missing-target] /children/0/link
+@/b/Manual/docdata/toc.json:1:89: warning: link "q.html#p" leads to no file: the link is dead [missing-target] /children/1/link
 2 modules, 0 errors, 3 warnings
 status 0
 )"},
@@ -465,7 +465,7 @@ TEST(PagemeldCheck, ShowsHostileNamesEscapedAndSurvivesHostileTrees)
          {{name + "/Manual/docdata/toc.json", "7"}},
          R"(@/c\n\x1B[1m\xE9\u009B/Manual/docdata/index.json: error: is missing beside toc.json; "c\n\x1B[1m\xE9\u009B" will be missing from the search of Manual [unreadable]
 @/c\n\x1B[1m\xE9\u009B/Manual/docdata/toc.json:1:1: error: node is 7, not an object; "c\n\x1B[1m\xE9\u009B" will be missing from the contents of Manual [structure]
-Manual: error: no module has a sound index.json: nothing will be written, and earlier outputs stay [nothing-to-combine]
+Manual: error: no module has a sound index.json, and none a sound toc.json: nothing will be written, and earlier outputs stay [nothing-to-combine]
 1 module, 3 errors, 0 warnings; missing from the search of Manual: c\n\x1B[1m\xE9\u009B; from its contents: c\n\x1B[1m\xE9\u009B
 status 1
 )"},
@@ -473,7 +473,7 @@ status 1
          {{name + "/Manual/docdata/toc.json", "7"}},
          R"({"level":"error","rule":"unreadable","file":"@/c\n\u001B[1m\\xE9\u009B/Manual/docdata/index.json","module":"@/c\n\u001B[1m\\xE9\u009B","set":"Manual","message":"is missing beside toc.json; \"c\\n\\x1B[1m\\xE9\\u009B\" will be missing from the search of Manual"}
 {"level":"error","rule":"structure","file":"@/c\n\u001B[1m\\xE9\u009B/Manual/docdata/toc.json","line":1,"column":1,"offset":0,"pointer":"","module":"@/c\n\u001B[1m\\xE9\u009B","set":"Manual","message":"node is 7, not an object; \"c\\n\\x1B[1m\\xE9\\u009B\" will be missing from the contents of Manual"}
-{"level":"error","rule":"nothing-to-combine","set":"Manual","message":"no module has a sound index.json: nothing will be written, and earlier outputs stay"}
+{"level":"error","rule":"nothing-to-combine","set":"Manual","message":"no module has a sound index.json, and none a sound toc.json: nothing will be written, and earlier outputs stay"}
 {"summary":{"modules":1,"errors":3,"warnings":0,"notes":0,"missing":{"Manual":{"search":["@/c\n\u001B[1m\\xE9\u009B"],"contents":["@/c\n\u001B[1m\\xE9\u009B"]},"ScriptReference":{"search":[],"contents":[]}}}}
 status 1
 )"},
@@ -495,7 +495,7 @@ status 1
 @/a/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module go without [output-missing]
 @/a/Manual/docdata/global_toc.json: error: is not there, or can't be read: readers of the module go without [output-missing]
 @/a/Manual/docdata/index.json: error: can't be read; "a" will be missing from the search of Manual [unreadable]
-@/a/Manual/docdata/toc.json:1:9: warning: link "toc" leads to no file [missing-target] /link
+@/a/Manual/docdata/toc.json:1:9: warning: link "toc" leads to no file: the link is dead [missing-target] /link
 @/b/Manual/docdata/global_index.js: error: is not there, or can't be read: readers of the module go without [output-missing]
 @/b/Manual/docdata/global_index.json: error: is not there, or can't be read: readers of the module go without [output-missing]
 @/b/Manual/docdata/global_toc.js: error: a directory is in the place of the output: the new one stays as .tmp [output-blocked]

@@ -98,7 +98,7 @@ public:
                               m_findings.AddAtValue("structure", value, pointer, wording);
                               return true;
                           });
-        (void)ReportTaggedNode(m_document, JsonPointer());
+        (void)ReportTaggedNode(m_document, JsonPointer(), isSound);
         return isSound;
     }
 
@@ -129,7 +129,7 @@ private:
     }
 
     /// Reports the first node that has a module. Returns whether to go on.
-    bool ReportTaggedNode(const Value& node, const JsonPointer& pointer)
+    bool ReportTaggedNode(const Value& node, const JsonPointer& pointer, bool isSound)
     {
         if (FindMember(node, "module") != nullptr)
         {
@@ -138,7 +138,8 @@ private:
                                   {
                                       return "this is an output: the node names its module, " +
                                              DescribeValue(*FindMember(node, "module"), QuoteSize()) +
-                                             "; its links will lead to that module";
+                                             (isSound ? "; its links will lead to that module"
+                                                      : Consequence(InputKind::Toc));
                                   });
             return false;
         }
@@ -147,7 +148,7 @@ private:
         for (rapidjson::SizeType i = 0; children != nullptr && children->IsArray() && i < children->Size();
              ++i)
         {
-            if (!ReportTaggedNode((*children)[i], {list, i}))
+            if (!ReportTaggedNode((*children)[i], {list, i}, isSound))
             {
                 return false;
             }

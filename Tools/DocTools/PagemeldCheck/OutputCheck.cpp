@@ -23,14 +23,15 @@ struct OutputForm
     const char* name;
     bool endsRun;               ///< whether a run ends where it can't be created
     std::string_view bodyStart; ///< of a script, after the prefix lines; empty for JSON
+    std::string_view lastPart;  ///< of a script, where its last statement or line begins
     std::string_view bodyEnd;
 };
 
 constexpr OutputForm kOutputs[] = {
-    {kIndexJsonOutput, false, "", ""},
-    {kIndexScriptOutput, true, "pages = [\n", "};\n"},
-    {kTocJsonOutput, false, "", ""},
-    {kTocScriptOutput, false, "toc = {\n", "]};\n"},
+    {kIndexJsonOutput, false, "", "", ""},
+    {kIndexScriptOutput, true, "pages = [\n", "\nsearchIndex = {", "};\n"},
+    {kTocJsonOutput, false, "", "", ""},
+    {kTocScriptOutput, false, "toc = {\n", "\n\"link\": ", "]};\n"},
 };
 
 Finding At(const char* rule, std::size_t module, std::size_t set, const std::string& file,
@@ -148,6 +149,7 @@ std::optional<std::string_view> BodyOf(const OutputForm& output, const InputText
         ++start;
     }
     const bool isWhole = whole.size() >= output.bodyEnd.size() &&
+                         whole.find(output.lastPart, start) != std::string_view::npos &&
                          whole.substr(whole.size() - output.bodyEnd.size()) == output.bodyEnd;
     return isWhole ? std::optional(whole.substr(start)) : std::nullopt;
 }
@@ -238,7 +240,7 @@ void CheckLeftovers(std::size_t set, const std::vector<SetModule>& modules, Repo
         for (const OutputForm& output : kOutputs)
         {
             const std::string path = modules[i].path.File(output.name) + ".tmp";
-            if (ModeOf(path) != 0)
+            if (S_ISREG(ModeOf(path)))
             {
                 report.Add(
                     At("leftover", i, set, path,

@@ -110,6 +110,14 @@ std::string JsonLine(const Finding& finding, const std::vector<std::string>& roo
     return buffer.GetString();
 }
 
+/// Returns a pointer after a space, cut if it is long; nothing for the root.
+std::string ShownPointer(const std::string& pointer)
+{
+    constexpr std::size_t kLongPointer = 200;
+    const std::string shown = pointer.empty() ? "" : " " + Visible(pointer.substr(0, kLongPointer));
+    return pointer.size() > kLongPointer ? shown + "..." : shown;
+}
+
 std::string TextLine(const Finding& finding, const ReportForm& form)
 {
     std::string line = finding.file.empty() && finding.set ? kSetNames[*finding.set] : Visible(finding.file);
@@ -121,7 +129,7 @@ std::string TextLine(const Finding& finding, const ReportForm& form)
     line += line.empty() ? "" : ": ";
     line += form.isColored ? ColorOf(finding.rule->level) + level + ":\033[0m " : level + ": ";
     line += finding.message + " [" + finding.rule->id + "]";
-    return line + (finding.pointer && !finding.pointer->empty() ? " " + Visible(*finding.pointer) : "");
+    return line + ShownPointer(finding.pointer.value_or(""));
 }
 
 /// Returns the names of modules with commas between them.

@@ -129,7 +129,8 @@ std::string Remedy(const std::string& from, const std::string& to)
     {
         return "one name begins with the other: rename one";
     }
-    return from[0] == '/' && to[0] == '/' ? "rename the directory" : "give absolute paths";
+    const bool isSpecial = to.find_first_of("%#?\\\n\r\t") != std::string::npos;
+    return isSpecial || (from[0] == '/' && to[0] == '/') ? "rename the directory" : "give absolute paths";
 }
 
 std::string DescribeWrongLinks(const std::vector<std::string>& roots, std::size_t from,
@@ -194,6 +195,7 @@ void CheckRoots(const std::vector<std::string>& roots, Report& report)
             report.Add(AtRoot("wrong-link-path", i, roots[i],
                               "a quote, backslash or line break in the path breaks both scripts of " +
                                   Visible(roots[*from]) + ": rename the directory"));
+            continue;
         }
         const WrongLinks wrong = FindWrongLinks(paths, i);
         if (wrong.count > 0)

@@ -44,7 +44,8 @@ constexpr Rule kRules[] = {
      "the first such fault only.",
      "Mend every entry that is named; docs/FORMATS.md has the formats."},
     {"merged-input", Level::Error, "an input is an output of an earlier run",
-     "An index.json is refused, and the module is missing from the search. A toc.json is taken, and its "
+     "An index.json is refused, and the module is missing from the search. A sound toc.json is taken, and "
+     "its "
      "links lead to other modules than they should.",
      "Put the module's own file in its place."},
     {"root-differs", Level::Error, "the root of a toc.json differs from that of the first module",

@@ -92,7 +92,12 @@ public:
         else if (*value != BytesOf(text))
         {
             m_findings.AddAtValue("script-altered", text, pointer,
-                                  [&] { return named() + " is " + Quote(*value) + " in " + m_script; });
+                                  [&]
+                                  {
+                                      return named() + " is " + Quote(*value) + " in " + m_script +
+                                             (kind == TextKind::Title ? ": readers see that"
+                                                                      : ": the link is dead");
+                                  });
         }
     }
 
@@ -120,9 +125,11 @@ public:
         if (m_checks.checksTargets && !IsAddress(BytesOf(link)) &&
             !LeadsToFile(m_checks.setDirectory, CStringOf(link)))
         {
-            m_findings.AddAtValue(
-                "missing-target", link, pointer,
-                [&] { return std::string(name) + " " + Quote(BytesOf(link)) + " leads to no file"; });
+            m_findings.AddAtValue("missing-target", link, pointer,
+                                  [&] {
+                                      return std::string(name) + " " + Quote(BytesOf(link)) +
+                                             " leads to no file: the link is dead";
+                                  });
         }
     }
 

@@ -261,7 +261,9 @@ private:
         {
             m_report.Add(At("nothing-to-combine", std::nullopt, "",
                             std::string("no module has ") +
-                                (hasIndex ? "a sound toc.json" : "a sound index.json") +
+                                (hasIndex ? "a sound toc.json"
+                                 : hasToc ? "a sound index.json"
+                                          : "a sound index.json, and none a sound toc.json") +
                                 ": nothing will be written, and earlier outputs stay"));
         }
         return hasIndex && hasToc;
