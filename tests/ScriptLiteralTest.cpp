@@ -16,7 +16,7 @@ const std::string kBroken = "\xFE"; // no value holds this byte
 constexpr const char* kValueInNode = R"(
     const vm = require('vm');
     const surrogate = c => Buffer.of(0xE0 | c >> 12, 0x80 | c >> 6 & 0x3F, 0x80 | c & 0x3F);
-    const bytes = c => c.isWellFormed() ? Buffer.from(c) : surrogate(c.charCodeAt(0));
+    const bytes = c => /^\p{Cs}$/u.test(c) ? surrogate(c.charCodeAt(0)) : Buffer.from(c);
     function answer(literal) {
         try {
             vm.runInThisContext('({' + literal + ': 0})');
