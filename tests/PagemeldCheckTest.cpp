@@ -93,16 +93,30 @@ void WriteSoundModules(const TemporaryFolder& folder)
     }
 }
 
+/// A run over the sound modules after some changes, and all that it prints.
+struct CheckCase
+{
+    std::vector<std::string> arguments;
+    std::vector<Change> changes;
+    const char* output;
+};
+
+void ExpectReport(const CheckCase& c)
+{
+    const TemporaryFolder folder;
+    WriteSoundModules(folder);
+    for (const Change& change : c.changes)
+    {
+        Apply(folder, change);
+    }
+    EXPECT_EQ(c.output, ReportOfCheck(folder, c.arguments)) << c.arguments.back();
+}
+
 } // namespace
 
 TEST(PagemeldCheck, TellsWhatBreaksARuleAndNotWhatComesClose)
 {
-    const struct
-    {
-        std::vector<std::string> arguments;
-        std::vector<Change> changes;
-        const char* output;
-    } cases[] = {
+    const CheckCase cases[] = {
         {{"--discover=@"},
          {},
          R"(2 modules, 0 errors, 0 warnings
@@ -138,6 +152,7 @@ status 0
           {"b/Manual/docdata/global_toc.json.tmp", kPipe},
           {"b/Manual/docdata/global_index.js.tmp", kDirectory},
           {"a/Manual/docdata/global_index.js.tmp", "x"},
+          {"a/Manual/docdata/global_toc.js", kLink + "b"}, // the rename replaces it
           {"a/ScriptReference/docdata/index.json", Index(R"(["p.html","P"])")},
           {"a/ScriptReference/docdata/toc.json", Toc("")}},
          R"(@/b/Manual/docdata/global_index.js.tmp: error: a directory is in the place of the temporary file: the run ends here with status 255, and leaves 1 later module and ScriptReference unwritten [output-blocked]
@@ -373,19 +388,21 @@ status 0
 )"},
         {{"--outputs", "@/a", "@/b"},
          {{"", kCombined},
-          {"a/Manual/docdata/global_index.js", kGone},
+          {"a/Manual/docdata/global_index.js", "pages = [\n];\ninfo = []\ncommon = {};\n"},
           {"a/Manual/docdata/global_index.json", "{"},
+          {"a/Manual/docdata/global_toc.js", kGone},
           {"b/Manual/docdata/global_toc.js", "toc = {\n\""},
           {"b/Manual/docdata/global_toc.json", "{}"},
           {"b/Manual/docdata/global_toc.js.tmp", ""},
           {"b/Manual/docdata/global_index.js", kOld}},
-         R"(@/a/Manual/docdata/global_index.js: error: is not there, or can't be read: readers of the module go without [output-missing]
+         R"(@/a/Manual/docdata/global_index.js: error: is cut short or broken: readers of the module go without [output-broken]
 @/a/Manual/docdata/global_index.json: error: is cut short or broken: readers of the module go without [output-broken]
+@/a/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module go without [output-missing]
 @/b/Manual/docdata/global_index.js: error: is older than an input of the set: readers see an earlier build [output-stale]
 @/b/Manual/docdata/global_toc.js: error: is cut short or broken: readers of the module go without [output-broken]
 @/b/Manual/docdata/global_toc.js.tmp: error: a temporary file stayed: a run was ended, and the output beside it may be old [leftover]
 @/b/Manual/docdata/global_toc.json: error: has other content than in @/a: a run ended early, and readers find different things [output-differs]
-2 modules, 6 errors, 0 warnings
+2 modules, 7 errors, 0 warnings
 status 1
 )"},
         {{"-n", "1", "@/a", "@/b"},
@@ -440,27 +457,16 @@ status 1
 status 1
 )"},
     };
-    for (const auto& c : cases)
+    for (const CheckCase& c : cases)
     {
-        const TemporaryFolder folder;
-        WriteSoundModules(folder);
-        for (const Change& change : c.changes)
-        {
-            Apply(folder, change);
-        }
-        EXPECT_EQ(c.output, ReportOfCheck(folder, c.arguments)) << c.arguments.back();
+        ExpectReport(c);
     }
 }
 
 TEST(PagemeldCheck, ShowsHostileNamesEscapedAndSurvivesHostileTrees)
 {
     const std::string name = "c\n\x1B[1m\xE9\xC2\x9B";
-    const struct
-    {
-        std::vector<std::string> arguments;
-        std::vector<Change> changes;
-        const char* output;
-    } cases[] = {
+    const CheckCase cases[] = {
         {{"@/" + name},
          {{name + "/Manual/docdata/toc.json", "7"}},
          R"(@/c\n\x1B[1m\xE9\u009B/Manual/docdata/index.json: error: is missing beside toc.json; "c\n\x1B[1m\xE9\u009B" will be missing from the search of Manual [unreadable]
@@ -506,15 +512,9 @@ status 1
 status 1
 )"},
     };
-    for (const auto& c : cases)
+    for (const CheckCase& c : cases)
     {
-        const TemporaryFolder folder;
-        WriteSoundModules(folder);
-        for (const Change& change : c.changes)
-        {
-            Apply(folder, change);
-        }
-        EXPECT_EQ(c.output, ReportOfCheck(folder, c.arguments)) << c.arguments.back();
+        ExpectReport(c);
     }
 }
 

@@ -81,6 +81,13 @@ std::string ProblemOf(const std::string& docdata)
     return ::faccessat(AT_FDCWD, docdata.c_str(), W_OK | X_OK, AT_EACCESS) == 0 ? "" : "can't be written to";
 }
 
+/// Whether a directory itself has the path. A link to one is no obstacle: the rename replaces it.
+bool IsDirectoryItself(const std::string& path)
+{
+    struct stat status = {};
+    return ::lstat(path.c_str(), &status) == 0 && S_ISDIR(status.st_mode);
+}
+
 void CheckPlaces(std::size_t module, std::size_t set, const SetModule& place, const std::string& endOfRun,
                  Report& report)
 {
@@ -88,7 +95,7 @@ void CheckPlaces(std::size_t module, std::size_t set, const SetModule& place, co
     {
         const std::string path = place.path.File(output.name);
         const mode_t temporary = ModeOf(path + ".tmp");
-        if (S_ISDIR(ModeOf(path)))
+        if (IsDirectoryItself(path))
         {
             report.Add(At("output-blocked", module, set, path,
                           "a directory is in the place of the output: the new one stays as .tmp"));
