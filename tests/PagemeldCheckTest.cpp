@@ -1,4 +1,4 @@
-#include "Tools/DocTools/PagemeldCheck/Rules.h"
+#include "Tools/DocTools/PagemeldCheck/Report/Rules.h"
 #include "tests/support/NeutralText.h"
 #include "tests/support/RunProgram.h"
 #include "tests/support/WholeFile.h"

@@ -1,4 +1,4 @@
-#include "Tools/DocTools/PagemeldCheck/ScriptLiteral.h"
+#include "Tools/DocTools/PagemeldCheck/Browse/ScriptLiteral.h"
 
 #include "tests/support/AnswersOfNode.h"
 

@@ -1,4 +1,4 @@
-#include "Tools/DocTools/PagemeldCheck/ValuePlaces.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/ValuePlaces.h"
 
 #include "tests/support/ParsedJson.h"
 #include "tests/support/Repeated.h"

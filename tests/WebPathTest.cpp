@@ -1,4 +1,4 @@
-#include "Tools/DocTools/PagemeldCheck/WebPath.h"
+#include "Tools/DocTools/PagemeldCheck/Browse/WebPath.h"
 
 #include "Tools/DocTools/VantorPagemeld/ModulePath.h"
 #include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"

@@ -1,8 +1,8 @@
 #include "Tools/DocTools/PagemeldCheck/InputCheck.h"
 
-#include "Tools/DocTools/PagemeldCheck/FaultText.h"
-#include "Tools/DocTools/PagemeldCheck/ParseFailure.h"
-#include "Tools/DocTools/PagemeldCheck/ShownText.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/FaultText.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/ParseFailure.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/Check/IndexStructure.h"
 #include "Tools/DocTools/VantorPagemeld/Check/TocStructure.h"
 #include "Tools/DocTools/VantorPagemeld/Read/InputFile.h"

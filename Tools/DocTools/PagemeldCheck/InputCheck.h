@@ -1,7 +1,7 @@
 #pragma once
 
-#include "Tools/DocTools/PagemeldCheck/FileFindings.h"
-#include "Tools/DocTools/PagemeldCheck/ScriptTexts.h"
+#include "Tools/DocTools/PagemeldCheck/Report/FileFindings.h"
+#include "Tools/DocTools/PagemeldCheck/TextCheck.h"
 
 #include <set>
 #include <string>

@@ -1,7 +1,7 @@
+#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/PagemeldCheck/Options.h"
 #include "Tools/DocTools/PagemeldCheck/RootCheck.h"
 #include "Tools/DocTools/PagemeldCheck/SetCheck.h"
-#include "Tools/DocTools/PagemeldCheck/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/System/Messages.h"
 
 #include <cstdio>

@@ -1,6 +1,6 @@
 #include "Tools/DocTools/PagemeldCheck/Options.h"
 
-#include "Tools/DocTools/PagemeldCheck/Rules.h"
+#include "Tools/DocTools/PagemeldCheck/Report/Rules.h"
 
 #include <cstdio>
 #include <cstdlib>

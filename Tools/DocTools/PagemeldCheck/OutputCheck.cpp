@@ -1,6 +1,6 @@
 #include "Tools/DocTools/PagemeldCheck/OutputCheck.h"
 
-#include "Tools/DocTools/PagemeldCheck/ShownText.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/Read/InputFile.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonReader.h"
 
@@ -33,18 +33,6 @@ constexpr OutputForm kOutputs[] = {
     {kTocJsonOutput, false, "", "", ""},
     {kTocScriptOutput, false, "toc = {\n", "\n\"link\": ", "]};\n"},
 };
-
-Finding At(const char* rule, std::size_t module, std::size_t set, const std::string& file,
-           std::string message)
-{
-    Finding finding;
-    finding.rule = &RuleOf(rule);
-    finding.message = std::move(message);
-    finding.module = module;
-    finding.set = set;
-    finding.file = file;
-    return finding;
-}
 
 /// Returns the mode of what is at path, or 0 if nothing is.
 mode_t ModeOf(const std::string& path)
@@ -97,15 +85,15 @@ void CheckPlaces(std::size_t module, std::size_t set, const SetModule& place, co
         const mode_t temporary = ModeOf(path + ".tmp");
         if (IsDirectoryItself(path))
         {
-            report.Add(At("output-blocked", module, set, path,
-                          "a directory is in the place of the output: the new one stays as .tmp"));
+            report.Add({"output-blocked", module, set, path,
+                        "a directory is in the place of the output: the new one stays as .tmp"});
         }
         if (S_ISDIR(temporary) || S_ISFIFO(temporary))
         {
             const std::string what = S_ISDIR(temporary) ? "a directory" : "a pipe";
-            report.Add(At("output-blocked", module, set, path + ".tmp",
-                          what + " is in the place of the temporary file: " +
-                              (output.endsRun ? endOfRun : "the run keeps the old output")));
+            report.Add({"output-blocked", module, set, path + ".tmp",
+                        what + " is in the place of the temporary file: " +
+                            (output.endsRun ? endOfRun : "the run keeps the old output")});
         }
     }
 }
@@ -176,20 +164,20 @@ void CheckCopy(const OutputForm& output, std::size_t module, std::size_t set, co
     const InputText text = ReadInputFile(path.c_str());
     if (text.outcome != InputText::Outcome::Read)
     {
-        report.Add(At("output-missing", module, set, path,
-                      "is not there, or can't be read: readers of the module go without"));
+        report.Add({"output-missing", module, set, path,
+                    "is not there, or can't be read: readers of the module go without"});
         return;
     }
     if (IsOlder(path, newestInput))
     {
-        report.Add(At("output-stale", module, set, path,
-                      "is older than an input of the set: readers see an earlier build"));
+        report.Add({"output-stale", module, set, path,
+                    "is older than an input of the set: readers see an earlier build"});
     }
     const std::optional<std::string_view> body = BodyOf(output, text);
     if (!body)
     {
-        report.Add(At("output-broken", module, set, path,
-                      "is cut short or broken: readers of the module go without"));
+        report.Add(
+            {"output-broken", module, set, path, "is cut short or broken: readers of the module go without"});
         return;
     }
     const std::size_t hash = std::hash<std::string_view>()(*body);
@@ -199,9 +187,9 @@ void CheckCopy(const OutputForm& output, std::size_t module, std::size_t set, co
     }
     else if (first.size != body->size() || first.hash != hash)
     {
-        report.Add(At("output-differs", module, set, path,
-                      "has other content than in " + Visible(*first.root) +
-                          ": a run ended early, and readers find different things"));
+        report.Add({"output-differs", module, set, path,
+                    "has other content than in " + Visible(*first.root) +
+                        ": a run ended early, and readers find different things"});
     }
 }
 
@@ -219,7 +207,7 @@ void CheckWritable(std::size_t set, const std::vector<SetModule>& modules, Repor
         }
         else
         {
-            report.Add(At("output-blocked", i, set, modules[i].docdata, problem + ": " + endOfRun));
+            report.Add({"output-blocked", i, set, modules[i].docdata, problem + ": " + endOfRun});
         }
     }
 }
@@ -249,9 +237,8 @@ void CheckLeftovers(std::size_t set, const std::vector<SetModule>& modules, Repo
             const std::string path = modules[i].path.File(output.name) + ".tmp";
             if (S_ISREG(ModeOf(path)))
             {
-                report.Add(
-                    At("leftover", i, set, path,
-                       "a temporary file stayed: a run was ended, and the output beside it may be old"));
+                report.Add({"leftover", i, set, path,
+                            "a temporary file stayed: a run was ended, and the output beside it may be old"});
             }
         }
     }

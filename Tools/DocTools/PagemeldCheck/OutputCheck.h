@@ -1,6 +1,6 @@
 #pragma once
 
-#include "Tools/DocTools/PagemeldCheck/Report.h"
+#include "Tools/DocTools/PagemeldCheck/Report/Report.h"
 #include "Tools/DocTools/PagemeldCheck/SetModule.h"
 
 #include <vector>

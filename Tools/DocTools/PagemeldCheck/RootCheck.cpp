@@ -1,7 +1,7 @@
 #include "Tools/DocTools/PagemeldCheck/RootCheck.h"
 
-#include "Tools/DocTools/PagemeldCheck/ShownText.h"
-#include "Tools/DocTools/PagemeldCheck/WebPath.h"
+#include "Tools/DocTools/PagemeldCheck/Browse/WebPath.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/ModuleDiscovery.h"
 #include "Tools/DocTools/VantorPagemeld/ModulePath.h"
 #include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"
@@ -13,16 +13,6 @@
 
 namespace
 {
-
-Finding AtRoot(const char* rule, std::size_t module, const std::string& root, std::string message)
-{
-    Finding finding;
-    finding.rule = &RuleOf(rule);
-    finding.message = std::move(message);
-    finding.module = module;
-    finding.file = root;
-    return finding;
-}
 
 const char* DescribePassedOver(PassedOver reason)
 {
@@ -51,9 +41,9 @@ void ReportDuplicates(const std::vector<std::string>& roots, Report& report)
         const auto [first, isNew] = known.try_emplace({status.st_dev, status.st_ino}, i);
         if (!isNew)
         {
-            report.Add(AtRoot("duplicate-root", i, roots[i],
-                              "is the same directory as " + Visible(roots[first->second]) +
-                                  ": its pages will be in the search twice"));
+            report.Add({"duplicate-root", i, std::nullopt, roots[i],
+                        "is the same directory as " + Visible(roots[first->second]) +
+                            ": its pages will be in the search twice"});
         }
     }
 }
@@ -165,22 +155,14 @@ void DiscoverRoots(const std::string& directory, std::vector<std::string>& roots
     std::replace(converted.begin(), converted.end(), '\\', '/');
     std::list<std::string> found;
     FindModules(converted, found,
-                [&](const std::string& path, PassedOver reason)
-                {
-                    Finding finding;
-                    finding.rule = &RuleOf("passed-over");
-                    finding.message = DescribePassedOver(reason);
-                    finding.file = path;
-                    report.Add(std::move(finding));
+                [&](const std::string& path, PassedOver reason) {
+                    report.Add({"passed-over", std::nullopt, std::nullopt, path, DescribePassedOver(reason)});
                 });
     roots.assign(found.begin(), found.end());
     if (roots.empty())
     {
-        Finding finding;
-        finding.rule = &RuleOf("no-modules");
-        finding.message = "no directory below it has Manual/docdata: nothing will be combined";
-        finding.file = directory;
-        report.Add(std::move(finding));
+        report.Add({"no-modules", std::nullopt, std::nullopt, directory,
+                    "no directory below it has Manual/docdata: nothing will be combined"});
     }
 }
 
@@ -192,15 +174,15 @@ void CheckRoots(const std::vector<std::string>& roots, Report& report)
     {
         if (const std::optional<std::size_t> from = FindUnnamable(paths, i))
         {
-            report.Add(AtRoot("wrong-link-path", i, roots[i],
-                              "a quote, backslash or line break in the path breaks both scripts of " +
-                                  Visible(roots[*from]) + ": rename the directory"));
+            report.Add({"wrong-link-path", i, std::nullopt, roots[i],
+                        "a quote, backslash or line break in the path breaks both scripts of " +
+                            Visible(roots[*from]) + ": rename the directory"});
             continue;
         }
         const WrongLinks wrong = FindWrongLinks(paths, i);
         if (wrong.count > 0)
         {
-            report.Add(AtRoot("wrong-link-path", i, roots[i], DescribeWrongLinks(roots, i, wrong)));
+            report.Add({"wrong-link-path", i, std::nullopt, roots[i], DescribeWrongLinks(roots, i, wrong)});
         }
     }
 }

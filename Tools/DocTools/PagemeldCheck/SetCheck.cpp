@@ -1,8 +1,8 @@
 #include "Tools/DocTools/PagemeldCheck/SetCheck.h"
 
+#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/PagemeldCheck/OutputCheck.h"
 #include "Tools/DocTools/PagemeldCheck/SetModule.h"
-#include "Tools/DocTools/PagemeldCheck/ShownText.h"
 
 #include <algorithm>
 #include <cerrno>
@@ -73,18 +73,6 @@ public:
     }
 
 private:
-    Finding At(const char* rule, std::optional<std::size_t> module, const std::string& file,
-               std::string message) const
-    {
-        Finding finding;
-        finding.rule = &RuleOf(rule);
-        finding.message = std::move(message);
-        finding.module = module;
-        finding.set = m_set;
-        finding.file = file;
-        return finding;
-    }
-
     void CheckModule(std::size_t i)
     {
         SetModule& module = m_modules[i];
@@ -92,9 +80,9 @@ private:
         module.toc = CheckFile(InputKind::Toc, i);
         if (!module.HasFiles())
         {
-            m_report.Add(At("set-empty", i, module.docdata,
-                            std::string("has neither index.json nor toc.json: the module adds nothing to ") +
-                                kSetNames[m_set]));
+            m_report.Add({"set-empty", i, m_set, module.docdata,
+                          std::string("has neither index.json nor toc.json: the module adds nothing to ") +
+                              kSetNames[m_set]});
             return;
         }
         ReportUnreadable(i, InputKind::Index);
@@ -133,10 +121,10 @@ private:
             facts.state == InputFacts::State::Unreadable
                 ? "can't be read"
                 : std::string("is missing beside ") + (isIndex ? "toc.json" : "index.json");
-        m_report.Add(At("unreadable", i, PathOf(module, kind),
-                        reason + "; " + Quoted(NameOfRoot(module.root), m_checks.quoteSize) +
-                            " will be missing from the " + (isIndex ? "search" : "contents") + " of " +
-                            kSetNames[m_set]));
+        m_report.Add({"unreadable", i, m_set, PathOf(module, kind),
+                      reason + "; " + Quoted(NameOfRoot(module.root), m_checks.quoteSize) +
+                          " will be missing from the " + (isIndex ? "search" : "contents") + " of " +
+                          kSetNames[m_set]});
     }
 
     [[nodiscard]] std::vector<std::size_t> SoundContents() const
@@ -212,9 +200,9 @@ private:
         const auto& own = linkDiffers ? facts.rootLink : facts.rootTitle;
         const auto& others = linkDiffers ? otherFacts.rootLink : otherFacts.rootTitle;
         const char* const member = linkDiffers ? "link" : "title";
-        Finding finding = At("root-differs", i, PathOf(m_modules[i], InputKind::Toc),
-                             std::string("root ") + member + " " + Quoted(own, m_checks.quoteSize) +
-                                 " differs from " + Quoted(others, m_checks.quoteSize) + " " + consequence);
+        Finding finding("root-differs", i, m_set, PathOf(m_modules[i], InputKind::Toc),
+                        std::string("root ") + member + " " + Quoted(own, m_checks.quoteSize) +
+                            " differs from " + Quoted(others, m_checks.quoteSize) + " " + consequence);
         const std::vector<ValuePlace> places = LocateRoot(finding.file);
         if (!places.empty())
         {
@@ -245,9 +233,9 @@ private:
         }
         if (!differing.empty())
         {
-            m_report.Add(At("common-ignored", std::nullopt, "",
-                            "the common words of " + Quoted(NameOfRoot(counts->root), m_checks.quoteSize) +
-                                " count for all modules; those that differ are ignored, of " + differing));
+            m_report.Add({"common-ignored", std::nullopt, m_set, "",
+                          "the common words of " + Quoted(NameOfRoot(counts->root), m_checks.quoteSize) +
+                              " count for all modules; those that differ are ignored, of " + differing});
         }
     }
 
@@ -259,12 +247,12 @@ private:
         const bool hasToc = has([](const SetModule& module) { return module.toc.IsSound(); });
         if (has([](const SetModule& module) { return module.HasFiles(); }) && !(hasIndex && hasToc))
         {
-            m_report.Add(At("nothing-to-combine", std::nullopt, "",
-                            std::string("no module has ") +
-                                (hasIndex ? "a sound toc.json"
-                                 : hasToc ? "a sound index.json"
-                                          : "a sound index.json, and none a sound toc.json") +
-                                ": nothing will be written, and earlier outputs stay"));
+            m_report.Add({"nothing-to-combine", std::nullopt, m_set, "",
+                          std::string("no module has ") +
+                              (hasIndex ? "a sound toc.json"
+                               : hasToc ? "a sound index.json"
+                                        : "a sound index.json, and none a sound toc.json") +
+                              ": nothing will be written, and earlier outputs stay"});
         }
         return hasIndex && hasToc;
     }

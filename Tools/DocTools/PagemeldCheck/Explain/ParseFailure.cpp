@@ -1,6 +1,6 @@
-#include "Tools/DocTools/PagemeldCheck/ParseFailure.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/ParseFailure.h"
 
-#include "Tools/DocTools/PagemeldCheck/ShownText.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonReader.h"
 #include "Tools/DocTools/VantorPagemeld/Read/NumberGuard.h"
 

@@ -1,4 +1,4 @@
-#include "Tools/DocTools/PagemeldCheck/WebPath.h"
+#include "Tools/DocTools/PagemeldCheck/Browse/WebPath.h"
 
 #include <algorithm>
 #include <charconv>

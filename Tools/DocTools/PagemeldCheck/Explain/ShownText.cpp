@@ -1,4 +1,4 @@
-#include "Tools/DocTools/PagemeldCheck/ShownText.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 
 #include <cstdint>
 #include <cstring>

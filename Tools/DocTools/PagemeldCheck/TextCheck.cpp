@@ -1,8 +1,8 @@
-#include "Tools/DocTools/PagemeldCheck/ScriptTexts.h"
+#include "Tools/DocTools/PagemeldCheck/TextCheck.h"
 
-#include "Tools/DocTools/PagemeldCheck/ScriptLiteral.h"
-#include "Tools/DocTools/PagemeldCheck/ShownText.h"
-#include "Tools/DocTools/PagemeldCheck/WebPath.h"
+#include "Tools/DocTools/PagemeldCheck/Browse/ScriptLiteral.h"
+#include "Tools/DocTools/PagemeldCheck/Browse/WebPath.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 #include "Tools/DocTools/VantorPagemeld/Render/TextBuffer.h"
 

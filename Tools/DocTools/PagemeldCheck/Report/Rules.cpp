@@ -1,4 +1,4 @@
-#include "Tools/DocTools/PagemeldCheck/Rules.h"
+#include "Tools/DocTools/PagemeldCheck/Report/Rules.h"
 
 #include <algorithm>
 #include <iterator>
@@ -11,8 +11,8 @@ constexpr Rule kRules[] = {
      "Nothing is combined; earlier outputs stay, and the run ends with status 0.",
      "Give the directory above the modules: a module holds the directory Manual/docdata."},
     {"duplicate-root", Level::Error, "two roots are the same directory",
-     "The module's pages are in the search twice, and its links in the contents may be those of either "
-     "name.",
+     "The module's pages are in the search twice, and its links in the contents may be those of "
+     "either name.",
      "Give each module once."},
     {"passed-over", Level::Warning, "a directory looks like a module, but --discover does not take it",
      "The module is missing from search and contents, and receives no outputs.",
@@ -44,9 +44,8 @@ constexpr Rule kRules[] = {
      "the first such fault only.",
      "Mend every entry that is named; docs/FORMATS.md has the formats."},
     {"merged-input", Level::Error, "an input is an output of an earlier run",
-     "An index.json is refused, and the module is missing from the search. A sound toc.json is taken, and "
-     "its "
-     "links lead to other modules than they should.",
+     "An index.json is refused, and the module is missing from the search. A sound toc.json is taken, "
+     "and its links lead to other modules than they should.",
      "Put the module's own file in its place."},
     {"root-differs", Level::Error, "the root of a toc.json differs from that of the first module",
      "The module is missing from the contents, without a message.",
@@ -58,8 +57,8 @@ constexpr Rule kRules[] = {
      "Readers see another title, or the link is dead.",
      "Replace the backslash by another character, and remove NUL characters."},
     {"prefixed-url", Level::Warning, "a page path or link is an address of its own (https://...)",
-     "The module's prefix is put before it, so that it is dead unless the page script takes it off "
-     "again.",
+     "The module's prefix is put before it, so that it is dead unless the page script takes it "
+     "off again.",
      "Link to a page of the module, or use the page script."},
     {"special-term", Level::Warning, "__proto__ is a term or common word",
      "In the scripts it sets the prototype of the object instead of a member: it is not found.",

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "Tools/DocTools/PagemeldCheck/Report.h"
+#include "Tools/DocTools/PagemeldCheck/Report/Report.h"
 #include "Tools/DocTools/VantorPagemeld/Check/StructureFault.h"
 
 #include <map>
@@ -53,7 +53,7 @@ private:
     {
         Finding finding;
         const rapidjson::Value* value = nullptr;
-        std::optional<std::size_t> offset;
+        std::optional<std::size_t> offset = std::nullopt;
     };
 
     [[nodiscard]] Item* AddItem(const char* rule);

@@ -1,6 +1,6 @@
-#include "Tools/DocTools/PagemeldCheck/FaultText.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/FaultText.h"
 
-#include "Tools/DocTools/PagemeldCheck/ShownText.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 #include "Tools/DocTools/VantorPagemeld/Render/TextBuffer.h"
 

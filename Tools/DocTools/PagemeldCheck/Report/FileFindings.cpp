@@ -1,4 +1,4 @@
-#include "Tools/DocTools/PagemeldCheck/FileFindings.h"
+#include "Tools/DocTools/PagemeldCheck/Report/FileFindings.h"
 
 void FileFindings::AddAtOffset(const char* rule, std::size_t offset, std::string message)
 {
@@ -27,12 +27,7 @@ FileFindings::Item* FileFindings::AddItem(const char* rule)
     {
         return nullptr;
     }
-    Item& item = m_items.emplace_back();
-    item.finding.rule = &RuleOf(rule);
-    item.finding.module = m_scope.module;
-    item.finding.set = m_scope.set;
-    item.finding.file = m_scope.path;
-    return &item;
+    return &m_items.emplace_back(Item{{rule, m_scope.module, m_scope.set, m_scope.path, ""}});
 }
 
 void FileFindings::Locate(const char* text, const rapidjson::Value* document)
@@ -73,13 +68,8 @@ void FileFindings::AddCounts(Report& report) const
             continue;
         }
         const std::size_t hidden = count - m_scope.limit;
-        Finding more;
-        more.rule = &RuleOf(id);
-        more.message = std::to_string(hidden) + " more of this rule; --limit=0 shows all";
-        more.module = m_scope.module;
-        more.set = m_scope.set;
-        more.file = m_scope.path;
-        report.Add(std::move(more));
+        report.Add({id, m_scope.module, m_scope.set, m_scope.path,
+                    std::to_string(hidden) + " more of this rule; --limit=0 shows all"});
         report.Count(RuleOf(id), hidden - 1);
     }
 }

@@ -1,4 +1,4 @@
-#include "Tools/DocTools/PagemeldCheck/ValuePlaces.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/ValuePlaces.h"
 
 #include <rapidjson/reader.h>
 

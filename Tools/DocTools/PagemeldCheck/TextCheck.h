@@ -1,6 +1,6 @@
 #pragma once
 
-#include "Tools/DocTools/PagemeldCheck/FileFindings.h"
+#include "Tools/DocTools/PagemeldCheck/Report/FileFindings.h"
 
 /// What of the texts of a sound file is looked at beside the scripts.
 struct TextChecks

@@ -1,0 +1,119 @@
+#include "Tools/DocTools/PagemeldCheck/Report/JsonReport.h"
+
+#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
+
+#include <rapidjson/stringbuffer.h>
+#include <rapidjson/writer.h>
+
+#include <algorithm>
+#include <iterator>
+
+namespace
+{
+
+// In ASCII, so that no control character above it reaches a terminal.
+using JsonWriter = rapidjson::Writer<rapidjson::StringBuffer, rapidjson::UTF8<>, rapidjson::ASCII<>>;
+
+/// Writes a text that may hold bytes that are no UTF-8, which become escapes.
+void WriteText(JsonWriter& writer, const std::string& text)
+{
+    std::string valid;
+    for (std::size_t start = 0; start < text.size();)
+    {
+        const std::string_view rest = std::string_view(text).substr(start);
+        const std::size_t invalid = std::min(FindInvalidUtf8(rest), rest.size());
+        valid += rest.substr(0, invalid);
+        start += invalid;
+        if (start < text.size())
+        {
+            valid += Visible(std::string_view(text).substr(start++, 1));
+        }
+    }
+    writer.String(valid.c_str(), static_cast<rapidjson::SizeType>(valid.size()));
+}
+
+void WriteMember(JsonWriter& writer, const char* name, const std::string& text)
+{
+    writer.Key(name);
+    WriteText(writer, text);
+}
+
+void WriteMember(JsonWriter& writer, const char* name, std::size_t number)
+{
+    writer.Key(name);
+    writer.Uint64(number);
+}
+
+void WriteNames(JsonWriter& writer, const char* name, const std::vector<std::string>& modules)
+{
+    writer.Key(name);
+    writer.StartArray();
+    for (const std::string& module : modules)
+    {
+        WriteText(writer, module);
+    }
+    writer.EndArray();
+}
+
+} // namespace
+
+std::string JsonLine(const Finding& finding, const std::vector<std::string>& roots)
+{
+    rapidjson::StringBuffer buffer;
+    JsonWriter writer(buffer);
+    writer.StartObject();
+    WriteMember(writer, "level", NameOf(finding.rule->level));
+    WriteMember(writer, "rule", finding.rule->id);
+    if (!finding.file.empty())
+    {
+        WriteMember(writer, "file", finding.file);
+    }
+    if (finding.place)
+    {
+        WriteMember(writer, "line", finding.place->line);
+        WriteMember(writer, "column", finding.place->column);
+        WriteMember(writer, "offset", finding.place->offset);
+    }
+    if (finding.pointer)
+    {
+        WriteMember(writer, "pointer", *finding.pointer);
+    }
+    if (finding.module)
+    {
+        WriteMember(writer, "module", roots[*finding.module]);
+    }
+    if (finding.set)
+    {
+        WriteMember(writer, "set", kSetNames[*finding.set]);
+    }
+    WriteMember(writer, "message", finding.message);
+    writer.EndObject();
+    return buffer.GetString();
+}
+
+std::string JsonSummary(const Summary& summary)
+{
+    rapidjson::StringBuffer buffer;
+    JsonWriter writer(buffer);
+    writer.StartObject();
+    writer.Key("summary");
+    writer.StartObject();
+    WriteMember(writer, "modules", summary.modules);
+    WriteMember(writer, "errors", summary.CountOf(Level::Error));
+    WriteMember(writer, "warnings", summary.CountOf(Level::Warning));
+    WriteMember(writer, "notes", summary.CountOf(Level::Note));
+    writer.Key("missing");
+    writer.StartObject();
+    for (std::size_t set = 0; set < std::size(kSetNames); ++set)
+    {
+        writer.Key(kSetNames[set]);
+        writer.StartObject();
+        WriteNames(writer, "search", summary.missing[set].search);
+        WriteNames(writer, "contents", summary.missing[set].contents);
+        writer.EndObject();
+    }
+    writer.EndObject();
+    writer.EndObject();
+    writer.EndObject();
+    return buffer.GetString();
+}
