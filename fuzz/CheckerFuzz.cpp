@@ -2,8 +2,8 @@
 #include "Tools/DocTools/VantorPagemeld/Check/IndexStructure.h"
 #include "Tools/DocTools/VantorPagemeld/Check/TocStructure.h"
 #include "fuzz/MergeProperty.h"
-#include "tests/support/TemporaryFolder.h"
-#include "tests/support/WholeFile.h"
+#include "tests/support/Files.h"
+#include "tests/support/TemporaryDirectory.h"
 
 // The checker takes any bytes as the input files of two modules, reports a module as missing exactly if the
 // tool's own reader and structure checks refuse its file or its root differs, and can print what it finds.
@@ -93,12 +93,12 @@ void RequirePrintable(Report& report, bool isJson, const std::vector<std::string
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
 {
-    static const TemporaryFolder folder;
-    static const std::vector<std::string> roots = {folder / "a", folder / "b"};
+    static const TemporaryDirectory directory;
+    static const std::vector<std::string> roots = {directory / "a", directory / "b"};
     const std::vector<std::string> files = SplitFiles(data, size);
     for (std::size_t i = 0; i < kFiles; ++i)
     {
-        WriteWholeFile(folder / kNames[i], files[i]);
+        WriteFile(directory / kNames[i], files[i]);
     }
     const MissingModules refused = Refused(files, roots);
     for (const bool isJson : {false, true})

@@ -85,7 +85,7 @@ private:
         default:
             break;
         }
-        WriteWholeFile(path, text);
+        WriteFile(path, text);
     }
 
     std::mt19937 m_random;
@@ -141,7 +141,7 @@ private:
 /// contents.
 Names NamesIn(const std::string& path)
 {
-    const std::string text = ReadWholeFile(path);
+    const std::string text = ReadFile(path);
     Names names;
     for (const std::string& name : kModules)
     {
@@ -161,12 +161,12 @@ TEST(CheckerAgreement, TellsWhichModulesARunMerges)
     int writtenCount = 0;
     for (unsigned seed = 0; seed < 150; ++seed)
     {
-        const TemporaryFolder folder;
+        const TemporaryDirectory directory;
         std::vector<std::string> roots;
         TreeMaker maker(seed);
         for (const std::string& name : kModules)
         {
-            roots.push_back(folder / name);
+            roots.push_back(directory / name);
             std::filesystem::create_directories(Docdata(roots.back()));
             maker.Write(roots.back(), name);
         }
@@ -204,8 +204,8 @@ TEST(CheckerAgreement, TellsWhichModulesARunMerges)
         EXPECT_EQ(inContents, NamesIn(combined + "/global_toc.json")) << "seed " << seed;
         if (!told.Has({"script-broken", "wrong-link-path", "merged-input"}))
         {
-            scripts.push_back(ReadWholeFile(combined + "/global_index.js"));
-            scripts.push_back(ReadWholeFile(combined + "/global_toc.js"));
+            scripts.push_back(ReadFile(combined + "/global_index.js"));
+            scripts.push_back(ReadFile(combined + "/global_toc.js"));
         }
     }
     EXPECT_GT(writtenCount, 60);

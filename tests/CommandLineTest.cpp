@@ -1,6 +1,6 @@
-#include "tests/support/NeutralText.h"
+#include "tests/support/Files.h"
+#include "tests/support/Placeholders.h"
 #include "tests/support/RunProgram.h"
-#include "tests/support/WholeFile.h"
 
 #include <gtest/gtest.h>
 
@@ -43,12 +43,12 @@ WARNING: #RapidJsonIoUtil:47 Unable to read -Verify/ScriptReference/docdata/inde
 status 0
 )"},
     };
-    const TemporaryFolder folder;
+    const TemporaryDirectory directory;
     for (const auto& c : cases)
     {
-        EXPECT_EQ(c.report, ReportOfRun(folder, c.arguments));
+        EXPECT_EQ(c.report, RunPagemeld(directory, c.arguments));
     }
-    EXPECT_TRUE(ReadTree(folder.Path()).empty());
+    EXPECT_TRUE(ReadTree(directory.Path()).empty());
 }
 
 TEST(CommandLine, SelfTestModeRunsTheTestsThatTheFilterNames)
@@ -100,7 +100,7 @@ status 0
     {
         std::vector<std::string> arguments = {"-runNativeTests"};
         arguments.insert(arguments.end(), c.arguments.begin(), c.arguments.end());
-        EXPECT_EQ(c.report, WithoutNumbers(ReportOfRun(TemporaryFolder(), arguments)));
+        EXPECT_EQ(c.report, WithoutNumbers(RunPagemeld(TemporaryDirectory(), arguments)));
     }
 }
 
@@ -143,15 +143,15 @@ status 255
                                  "ScriptReference/docdata/toc.json", "ScriptReference/docdata/index.json"};
     for (const auto& c : cases)
     {
-        const TemporaryFolder folder;
+        const TemporaryDirectory directory;
         for (int i = 0; i < 4; ++i)
         {
             if (c.contents[i] != nullptr)
             {
-                WriteWholeFile(folder / (std::string("en/") + names[i]), c.contents[i]);
+                WriteFile(directory / (std::string("en/") + names[i]), c.contents[i]);
             }
         }
         EXPECT_EQ(std::string("executing Pagemeld\nrootDocPath = @\n") + c.report,
-                  ReportOfRun(folder, {"-verify", "@", "ignored"}));
+                  RunPagemeld(directory, {"-verify", "@", "ignored"}));
     }
 }

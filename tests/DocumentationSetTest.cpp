@@ -1,6 +1,6 @@
+#include "tests/support/Files.h"
 #include "tests/support/ParsedJson.h"
 #include "tests/support/RunProgram.h"
-#include "tests/support/WholeFile.h"
 
 #include <gtest/gtest.h>
 
@@ -20,18 +20,18 @@ const char* const kTocA =
 const char* const kTocB =
     R"({"link":"toc","title":"toc","children":[{"link":"null","title":"B","children":[{"link":"b.html","title":"","children":[]}]}]})";
 
-void AddModule(const TemporaryFolder& folder, const std::string& modulePath, const std::string& index,
+void AddModule(const TemporaryDirectory& directory, const std::string& modulePath, const std::string& index,
                const std::string& toc)
 {
-    WriteWholeFile(folder / (modulePath + "/docdata/index.json"), index);
-    WriteWholeFile(folder / (modulePath + "/docdata/toc.json"), toc);
+    WriteFile(directory / (modulePath + "/docdata/index.json"), index);
+    WriteFile(directory / (modulePath + "/docdata/toc.json"), toc);
 }
 
 /// Returns every file that is no input of a module, by its path.
-std::map<std::string, std::string> Outputs(const TemporaryFolder& folder)
+std::map<std::string, std::string> Outputs(const TemporaryDirectory& directory)
 {
     std::map<std::string, std::string> outputs;
-    for (const auto& [path, content] : ReadTree(folder.Path()))
+    for (const auto& [path, content] : ReadTree(directory.Path()))
     {
         const std::string name = std::filesystem::path(path).filename();
         if (name != "index.json" && name != "toc.json")
@@ -43,10 +43,10 @@ std::map<std::string, std::string> Outputs(const TemporaryFolder& folder)
 }
 
 /// Returns the path of every file that is no input of a module, each on a line.
-std::string OutputNames(const TemporaryFolder& folder)
+std::string OutputNames(const TemporaryDirectory& directory)
 {
     std::string names;
-    for (const auto& [path, content] : Outputs(folder))
+    for (const auto& [path, content] : Outputs(directory))
     {
         names += path + "\n";
     }
@@ -80,13 +80,13 @@ const char* const kTocScript = R"(toc = {
 
 TEST(DocumentationSet, EveryModuleReceivesAllFourFiles)
 {
-    const TemporaryFolder folder;
-    AddModule(folder, "docs/a/Manual", kIndexA, kTocA);
-    AddModule(folder, "docs/b/Manual", kIndexB, kTocB);
-    AddModule(folder, "docs/c/Manual", "{}", "{}"); // is skipped, but receives the files
-    WriteWholeFile(folder / "docs/a/Manual/docdata/global_toc.js",
-                   "of an earlier run, and longer than what follows");
-    WriteWholeFile(folder / "docs/b/Manual/docdata/global_index.js.tmp", "of a killed run");
+    const TemporaryDirectory directory;
+    AddModule(directory, "docs/a/Manual", kIndexA, kTocA);
+    AddModule(directory, "docs/b/Manual", kIndexB, kTocB);
+    AddModule(directory, "docs/c/Manual", "{}", "{}"); // is skipped, but receives the files
+    WriteFile(directory / "docs/a/Manual/docdata/global_toc.js",
+              "of an earlier run, and longer than what follows");
+    WriteFile(directory / "docs/b/Manual/docdata/global_index.js.tmp", "of a killed run");
 
     EXPECT_EQ(R"(executing Pagemeld
 WARNING: #IndexCombiner:290 Pages is not an array or absent
@@ -96,7 +96,7 @@ WARNING: #RapidJsonIoUtil:47 Unable to read @/docs/b/ScriptReference/docdata/ind
 WARNING: #RapidJsonIoUtil:47 Unable to read @/docs/c/ScriptReference/docdata/index.json
 status 0
 )",
-              ReportOfRun(folder, {"-autopaths", "@\\docs"}));
+              RunPagemeld(directory, {"-autopaths", "@\\docs"}));
     std::map<std::string, std::string> expected;
     const std::string prefixes[][2] = {
         {"a", "var p0 = \"\";\nvar p1 = \"../../b/Manual/\";\n"},
@@ -110,20 +110,20 @@ status 0
         expected[docdata + "global_toc.json"] = Pretty(kTocJson);
         expected[docdata + "global_toc.js"] = lines + kTocScript;
 
-        const ProgramResult check = RunProgram(NODE_PROGRAM, {CHECK_SCRIPTS, folder / docdata});
+        const ProgramResult check = RunProgram(NODE_PROGRAM, {CHECK_SCRIPTS, directory / docdata});
         EXPECT_EQ("2 pages, 2 terms\n", check.standardOutput) << check.standardError;
     }
-    EXPECT_EQ(expected, Outputs(folder));
+    EXPECT_EQ(expected, Outputs(directory));
 }
 
 TEST(DocumentationSet, SetsAreIndependentAndPathsAreUsedAsGiven)
 {
-    const TemporaryFolder folder;
-    AddModule(folder, "a/Manual", kIndexA, "[]"); // no table of contents at all: the set is not written
-    AddModule(folder, "b/Manual", kIndexB, R"({"link":"l","title":"t"})");
-    AddModule(folder, "b/ScriptReference", kIndexB, kTocB);
-    WriteWholeFile(folder / "a/Manual/docdata/global_toc.js", "stale");
-    std::filesystem::create_directories(folder / "a/ScriptReference/docdata");
+    const TemporaryDirectory directory;
+    AddModule(directory, "a/Manual", kIndexA, "[]"); // no table of contents at all: the set is not written
+    AddModule(directory, "b/Manual", kIndexB, R"({"link":"l","title":"t"})");
+    AddModule(directory, "b/ScriptReference", kIndexB, kTocB);
+    WriteFile(directory / "a/Manual/docdata/global_toc.js", "stale");
+    std::filesystem::create_directories(directory / "a/ScriptReference/docdata");
     EXPECT_EQ(R"(executing Pagemeld
 WARNING: #TocCombiner:372 Title is non-string or absent
 WARNING: #TocCombiner:382 Children is not an array or null
@@ -131,7 +131,7 @@ WARNING: #RapidJsonIoUtil:47 Unable to read @/a//ScriptReference/docdata/index.j
 WARNING: #RapidJsonIoUtil:47 Unable to read @/a//ScriptReference/docdata/toc.json
 status 0
 )",
-              ReportOfRun(folder, {"@/a/", "@/b"}));
+              RunPagemeld(directory, {"@/a/", "@/b"}));
     EXPECT_EQ(R"(a/Manual/docdata/global_toc.js
 a/ScriptReference/docdata/global_index.js
 a/ScriptReference/docdata/global_index.json
@@ -142,23 +142,23 @@ b/ScriptReference/docdata/global_index.json
 b/ScriptReference/docdata/global_toc.js
 b/ScriptReference/docdata/global_toc.json
 )",
-              OutputNames(folder));
-    EXPECT_EQ("stale", ReadWholeFile(folder / "a/Manual/docdata/global_toc.js"));
+              OutputNames(directory));
+    EXPECT_EQ("stale", ReadFile(directory / "a/Manual/docdata/global_toc.js"));
     EXPECT_EQ(R"(var p0 = "../../../b/ScriptReference/";
 toc = {
 "link": "toc","title": "toc","children": [{"link": "null","title": "B","children": [{"link": p0+"b.html","title": "","children": []}]}]};
 )",
-              ReadWholeFile(folder / "a/ScriptReference/docdata/global_toc.js"));
+              ReadFile(directory / "a/ScriptReference/docdata/global_toc.js"));
 }
 
 TEST(DocumentationSet, UnwritableScripts)
 {
-    const TemporaryFolder folder;
+    const TemporaryDirectory directory;
     for (const char* modulePath : {"a/Manual", "c/Manual", "a/ScriptReference", "c/ScriptReference"})
     {
-        AddModule(folder, modulePath, kIndexA, kTocA);
+        AddModule(directory, modulePath, kIndexA, kTocA);
     }
-    std::filesystem::create_directory(folder / "a/Manual/docdata/global_toc.js.tmp");
+    std::filesystem::create_directory(directory / "a/Manual/docdata/global_toc.js.tmp");
     EXPECT_EQ(R"(executing Pagemeld
 WARNING: #RapidJsonIoUtil:47 Unable to read @/b/Manual/docdata/index.json
 WARNING: #RapidJsonIoUtil:47 Unable to read @/b/Manual/docdata/toc.json
@@ -166,10 +166,10 @@ ERROR: #TocCombiner:314 Failed to open output file @/a/Manual/docdata/global_toc
 WARNING: #RapidJsonIoUtil:23 Failed to open @/b/Manual/docdata/global_index.json.tmp for writing
 CRITICAL: #IndexCombiner:176 Unable to open file @/b/Manual/docdata/global_index.js.tmp for writingstatus 255
 )",
-              ReportOfRun(folder, {"@/a", "@/b", "@/c"}));
+              RunPagemeld(directory, {"@/a", "@/b", "@/c"}));
     EXPECT_EQ(R"(a/Manual/docdata/global_index.js
 a/Manual/docdata/global_index.json
 a/Manual/docdata/global_toc.json
 )",
-              OutputNames(folder));
+              OutputNames(directory));
 }

@@ -1,9 +1,9 @@
 #include "Tools/DocTools/VantorPagemeld/Read/JsonReader.h"
 #include "tests/support/ExampleDocs.h"
+#include "tests/support/Files.h"
 #include "tests/support/HasMatch.h"
 #include "tests/support/Repeated.h"
 #include "tests/support/RunProgram.h"
-#include "tests/support/WholeFile.h"
 
 #include <gtest/gtest.h>
 
@@ -37,7 +37,7 @@ TEST(Environment, OutputsNeverTakeTheDescriptorsOfMessages)
         command.insert(command.end(), shell.begin(), shell.end());
         EXPECT_EQ(0, docs.Run(command).status) << redirections;
         EXPECT_EQ("NNNN NNNN", docs.Describe()) << redirections;
-        const std::string trace = ReadWholeFile(docs / "trace");
+        const std::string trace = ReadFile(docs / "trace");
         EXPECT_TRUE(HasMatch(trace, "global_toc.js.tmp.* = [0-9]+$")) << trace;
         EXPECT_FALSE(HasMatch(trace, "global_.* = [012]$")) << redirections << trace;
         docs.Restore();
@@ -65,13 +65,13 @@ TEST(Environment, RunningOutOfMemoryEndsTheRunBeforeItsFirstOutput)
     const ExampleDocs docs;
     const std::string input = docs / "b/Manual/docdata/index.json";
     const std::string largeInput =
-        ReadWholeFile(input).insert(1, "\"ignored\":[0" + Repeated(",0", 500'000) + "],");
+        ReadFile(input).insert(1, "\"ignored\":[0" + Repeated(",0", 500'000) + "],");
 
     int ended = 0;
     for (int megabytes = 6;; ++megabytes)
     {
         ASSERT_LT(megabytes, 100);
-        WriteWholeFile(input, largeInput);
+        WriteFile(input, largeInput);
         const ProgramResult result = docs.Run({"prlimit", "--as=" + std::to_string(megabytes << 20)});
         if (result.standardError.find("RapidJsonIoUtil:60 Unable to read entire file") != std::string::npos)
         {
@@ -99,7 +99,7 @@ TEST(Environment, DeepInputNeedsNoMoreThanASmallStack)
     const ExampleDocs docs;
     const std::string input = docs / "b/Manual/docdata/index.json";
     const std::string deep = Repeated("[", kMaxNestingDepth - 1) + Repeated("]", kMaxNestingDepth - 1);
-    WriteWholeFile(input, ReadWholeFile(input).insert(1, "\"ignored\":" + deep + ","));
+    WriteFile(input, ReadFile(input).insert(1, "\"ignored\":" + deep + ","));
     std::vector<std::string> limits = {"--stack=2097152"};
     for (std::size_t megabytes = 3; megabytes <= 12; ++megabytes) // just above what the heap would reserve
     {
@@ -131,14 +131,14 @@ TEST(Environment, SymbolicLinksAreFollowedButForOutputs)
     for (const auto& c : cases)
     {
         const ExampleDocs docs;
-        WriteWholeFile(docs / "a/Manual/docdata/global_toc.js.tmp", "stale");
+        WriteFile(docs / "a/Manual/docdata/global_toc.js.tmp", "stale");
         fs::rename(docs / c.link, docs / "elsewhere");
         fs::create_symlink(docs / "elsewhere", docs / c.link);
         EXPECT_EQ(0, docs.Run().status) << c.link;
         EXPECT_EQ("NNNN NNNN", docs.Describe()) << c.link;
         if (c.elsewhere != nullptr)
         {
-            const std::string bytes = ReadWholeFile(docs / "elsewhere");
+            const std::string bytes = ReadFile(docs / "elsewhere");
             EXPECT_EQ(c.elsewhere, bytes.substr(0, std::strlen(c.elsewhere))) << c.link;
         }
     }
@@ -158,7 +158,7 @@ TEST(Environment, AnyNameIsUsedAsItIs)
         };
         for (const auto& [module, lines] : prefixes)
         {
-            const std::string script = ReadWholeFile(docs / module + "/Manual/docdata/global_toc.js");
+            const std::string script = ReadFile(docs / module + "/Manual/docdata/global_toc.js");
             EXPECT_EQ(lines, script.substr(0, lines.size()));
         }
     }

@@ -1,11 +1,11 @@
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "Tools/DocTools/VantorPagemeld/Read/NumberGuard.h"
 #include "tests/support/CapturedStderr.h"
-#include "tests/support/NeutralText.h"
+#include "tests/support/Files.h"
 #include "tests/support/ParsedJson.h"
+#include "tests/support/Placeholders.h"
 #include "tests/support/Repeated.h"
-#include "tests/support/TemporaryFolder.h"
-#include "tests/support/WholeFile.h"
+#include "tests/support/TemporaryDirectory.h"
 
 #include <gtest/gtest.h>
 
@@ -73,12 +73,12 @@ TEST(JsonReading, AcceptsOneRootOrNamesTheOffset)
         {Repeated("[{\"a\":", 5'000) + "[" + Repeated("}]", 5'000), ParseError(30'001)},
         {"[" + Repeated("[[{}]],", 10'000) + "1]", "read"}, // many, but not inside one another
     };
-    const TemporaryFolder folder;
+    const TemporaryDirectory directory;
     for (const auto& c : cases)
     {
-        WriteWholeFile(folder / "file", c.text);
+        WriteFile(directory / "file", c.text);
         rapidjson::Document document;
-        EXPECT_EQ(c.report, Read(folder / "file", document)) << c.text.substr(0, 80);
+        EXPECT_EQ(c.report, Read(directory / "file", document)) << c.text.substr(0, 80);
         EXPECT_EQ(c.report == "read", RapidJsonIoUtil::TryGetJsonDocFromString(c.text.c_str(), document))
             << c.text.substr(0, 80);
     }
@@ -86,18 +86,18 @@ TEST(JsonReading, AcceptsOneRootOrNamesTheOffset)
 
 TEST(JsonReading, WarnsAboutFilesThatCannotBeReadWhole)
 {
-    const TemporaryFolder folder;
-    std::filesystem::create_directory(folder / "folder");
-    ASSERT_EQ(0, ::mkfifo((folder / "pipe").c_str(), 0600));
-    std::ofstream(folder / "huge").put(' ');
-    std::filesystem::resize_file(folder / "huge", (std::uintmax_t(1) << 32) + 5);
+    const TemporaryDirectory directory;
+    std::filesystem::create_directory(directory / "directory");
+    ASSERT_EQ(0, ::mkfifo((directory / "pipe").c_str(), 0600));
+    std::ofstream(directory / "huge").put(' ');
+    std::filesystem::resize_file(directory / "huge", (std::uintmax_t(1) << 32) + 5);
 
     const std::string unread = "WARNING: " + kTag + "60 Unable to read entire file @, requested ";
     rapidjson::Document document = ParsedJson("[1]");
-    EXPECT_EQ("WARNING: " + kTag + "47 Unable to read @\n", Read(folder / "missing", document));
-    EXPECT_EQ(unread + "-1, got 0 bytes\n", Read(folder / "pipe", document));
-    EXPECT_EQ(unread + "5, got 0 bytes\n", Read(folder / "huge", document)); // in 32 bits
-    EXPECT_EQ(unread + "-1, got 0 bytes\n", Read(folder / "folder", document));
+    EXPECT_EQ("WARNING: " + kTag + "47 Unable to read @\n", Read(directory / "missing", document));
+    EXPECT_EQ(unread + "-1, got 0 bytes\n", Read(directory / "pipe", document));
+    EXPECT_EQ(unread + "5, got 0 bytes\n", Read(directory / "huge", document)); // in 32 bits
+    EXPECT_EQ(unread + "-1, got 0 bytes\n", Read(directory / "directory", document));
     EXPECT_EQ(unread + "-1, got 0 bytes\n", Read("/proc", document)); // a directory of size 0
     EXPECT_EQ("[1]", RapidJsonIoUtil::OutputJsonValueToString(document))
         << "an unread file leaves the document alone";
@@ -105,16 +105,16 @@ TEST(JsonReading, WarnsAboutFilesThatCannotBeReadWhole)
 
 TEST(JsonReading, WaitsForALeaseToBeGivenBack)
 {
-    const TemporaryFolder folder;
-    WriteWholeFile(folder / "file", "[1]");
-    s_leased = ::open((folder / "file").c_str(), O_RDWR);
+    const TemporaryDirectory directory;
+    WriteFile(directory / "file", "[1]");
+    s_leased = ::open((directory / "file").c_str(), O_RDWR);
     const auto handler = std::signal(SIGIO, [](int) { (void)::fcntl(s_leased, F_SETLEASE, F_UNLCK); });
     if (::fcntl(s_leased, F_SETLEASE, F_WRLCK) != 0)
     {
         GTEST_SKIP() << "no leases here";
     }
     rapidjson::Document document;
-    EXPECT_EQ("read", Read(folder / "file", document));
+    EXPECT_EQ("read", Read(directory / "file", document));
     (void)std::signal(SIGIO, handler);
     ::close(s_leased);
 }

@@ -1,7 +1,7 @@
 #include "tests/support/CapturedStderr.h"
+#include "tests/support/Files.h"
 #include "tests/support/ParsedJson.h"
-#include "tests/support/TemporaryFolder.h"
-#include "tests/support/WholeFile.h"
+#include "tests/support/TemporaryDirectory.h"
 
 #include <gtest/gtest.h>
 
@@ -37,15 +37,16 @@ TEST(JsonWriting, CompactAndPrettyForm)
         {R"({"\u0000":1,"":2,"":3})", R"({"\u0000":1,"":2,"":3})",
          "{\n    \"\\u0000\": 1,\n    \"\": 2,\n    \"\": 3\n}"},
     };
-    const TemporaryFolder folder;
+    const TemporaryDirectory directory;
     for (const auto& c : cases)
     {
         const rapidjson::Document document = ParsedJson(c.json);
         EXPECT_EQ(c.compact, RapidJsonIoUtil::OutputJsonValueToString(document)) << c.json;
-        EXPECT_TRUE(RapidJsonIoUtil::OutputJsonValueToFile(document, (folder / "file").c_str())) << c.json;
-        EXPECT_EQ(c.pretty, ReadWholeFile(folder / "file")) << c.json;
+        EXPECT_TRUE(RapidJsonIoUtil::OutputJsonValueToFile(document, (directory / "file").c_str())) << c.json;
+        EXPECT_EQ(c.pretty, ReadFile(directory / "file")) << c.json;
     }
     CapturedStderr captured;
-    EXPECT_FALSE(RapidJsonIoUtil::OutputJsonValueToFile(ParsedJson("1"), (folder / "missing/file").c_str()));
+    EXPECT_FALSE(
+        RapidJsonIoUtil::OutputJsonValueToFile(ParsedJson("1"), (directory / "missing/file").c_str()));
     EXPECT_TRUE(RapidJsonIoUtil::OutputJsonValueToFile(ParsedJson("1"), "/dev/full")); // on purpose
 }

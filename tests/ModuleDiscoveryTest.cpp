@@ -1,8 +1,8 @@
 #include "Tools/DocTools/VantorPagemeld/ModuleDiscovery.h"
 
-#include "tests/support/NeutralText.h"
-#include "tests/support/TemporaryFolder.h"
-#include "tests/support/WholeFile.h"
+#include "tests/support/Files.h"
+#include "tests/support/Placeholders.h"
+#include "tests/support/TemporaryDirectory.h"
 
 #include <gtest/gtest.h>
 
@@ -12,31 +12,31 @@
 
 TEST(ModuleDiscovery, WalksInByteOrderAndStopsAtModules)
 {
-    const TemporaryFolder folder;
+    const TemporaryDirectory directory;
     for (const char* docdata :
          {"b/Manual/docdata", "a/Manual/docdata", "Zeta/Manual/docdata", "x/Manual/docdata",
           "x/y/Manual/docdata", "deep/er/m-1/Manual/docdata", "deep/er/m/Manual/docdata",
           "deep-er/Manual/docdata", ".hidden/Manual/docdata", "file/n/Manual/docdata",
           "scripts/ScriptReference/docdata", "Manual/docdata", "linked/Manual"})
     {
-        std::filesystem::create_directories(folder / docdata);
+        std::filesystem::create_directories(directory / docdata);
     }
-    WriteWholeFile(folder / "file/Manual/docdata", "");
-    WriteWholeFile(folder / "regular", "");
-    std::filesystem::create_directories(folder / "socket/Manual");
-    ASSERT_EQ(0, ::mknod((folder / "socket/Manual/docdata").c_str(), S_IFSOCK | 0600, 0));
-    std::filesystem::create_directory_symlink(folder / "a", folder / "link");
-    std::filesystem::create_directory_symlink(folder / "x/y", folder / "scripts/link");
-    std::filesystem::create_directory_symlink(folder / "a", folder / "linked/Manual/docdata");
+    WriteFile(directory / "file/Manual/docdata", "");
+    WriteFile(directory / "regular", "");
+    std::filesystem::create_directories(directory / "socket/Manual");
+    ASSERT_EQ(0, ::mknod((directory / "socket/Manual/docdata").c_str(), S_IFSOCK | 0600, 0));
+    std::filesystem::create_directory_symlink(directory / "a", directory / "link");
+    std::filesystem::create_directory_symlink(directory / "x/y", directory / "scripts/link");
+    std::filesystem::create_directory_symlink(directory / "a", directory / "linked/Manual/docdata");
 
     std::list<std::string> found = {"kept"};
-    GetPathsOfDocs(folder / "", found);
-    GetPathsOfDocs(folder / "missing", found);
-    GetPathsOfDocs(folder / "regular", found);
+    GetPathsOfDocs(directory / "", found);
+    GetPathsOfDocs(directory / "missing", found);
+    GetPathsOfDocs(directory / "regular", found);
     std::string text;
     for (const std::string& path : found)
     {
-        text += ReplaceAll(path, folder.Path(), "@") + "\n";
+        text += ReplaceAll(path, directory.Path(), "@") + "\n";
     }
     // The directory itself is no candidate, though it has a Manual/docdata; a linked docdata counts, and a
     // socket, which has the directory bit.

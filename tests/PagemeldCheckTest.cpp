@@ -1,7 +1,7 @@
 #include "Tools/DocTools/PagemeldCheck/Report/Rules.h"
-#include "tests/support/NeutralText.h"
+#include "tests/support/Files.h"
+#include "tests/support/Placeholders.h"
 #include "tests/support/RunProgram.h"
-#include "tests/support/WholeFile.h"
 
 #include <gtest/gtest.h>
 
@@ -50,12 +50,12 @@ std::string Toc(const std::string& children, const std::string& root = R"("link"
     return "{" + root + R"(,"children":[)" + children + "]}";
 }
 
-void Apply(const TemporaryFolder& folder, const Change& change)
+void Apply(const TemporaryDirectory& directory, const Change& change)
 {
-    const std::string path = folder / change.path;
+    const std::string path = directory / change.path;
     if (change.content == kCombined)
     {
-        (void)ReportOfRun(folder, {"@/a", "@/b"});
+        (void)RunPagemeld(directory, {"@/a", "@/b"});
         return;
     }
     if (change.content == kOld)
@@ -75,21 +75,21 @@ void Apply(const TemporaryFolder& folder, const Change& change)
     }
     else if (change.content.compare(0, kLink.size(), kLink) == 0)
     {
-        fs::create_symlink(folder / change.content.substr(kLink.size()), path);
+        fs::create_symlink(directory / change.content.substr(kLink.size()), path);
     }
     else if (change.content != kGone)
     {
-        WriteWholeFile(path, change.content);
+        WriteFile(path, change.content);
     }
 }
 
 /// Two sound modules, a and b.
-void WriteSoundModules(const TemporaryFolder& folder)
+void WriteSoundModules(const TemporaryDirectory& directory)
 {
     for (const char* docdata : {"a/Manual/docdata/", "b/Manual/docdata/"})
     {
-        WriteWholeFile(folder / docdata + "index.json", Index(""));
-        WriteWholeFile(folder / docdata + "toc.json", Toc(""));
+        WriteFile(directory / docdata + "index.json", Index(""));
+        WriteFile(directory / docdata + "toc.json", Toc(""));
     }
 }
 
@@ -103,13 +103,13 @@ struct CheckCase
 
 void ExpectReport(const CheckCase& c)
 {
-    const TemporaryFolder folder;
-    WriteSoundModules(folder);
+    const TemporaryDirectory directory;
+    WriteSoundModules(directory);
     for (const Change& change : c.changes)
     {
-        Apply(folder, change);
+        Apply(directory, change);
     }
-    EXPECT_EQ(c.output, ReportOfCheck(folder, c.arguments)) << c.arguments.back();
+    EXPECT_EQ(c.output, RunPagemeldCheck(directory, c.arguments)) << c.arguments.back();
 }
 
 } // namespace
@@ -520,19 +520,20 @@ status 1
 
 TEST(PagemeldCheck, TellsWhatAUserMayNotReadOrWrite)
 {
-    const TemporaryFolder folder;
-    WriteSoundModules(folder);
-    fs::permissions(folder / "a/Manual/docdata/index.json", fs::perms::none);
-    fs::permissions(folder / "a/Manual/docdata", fs::perms::owner_read | fs::perms::owner_exec);
-    fs::create_directories(folder / "c/Manual/docdata");
-    fs::permissions(folder / "c/Manual/docdata", fs::perms::none);
-    std::vector<std::string> command = {PAGEMELD_CHECK_PROGRAM, folder / "a", folder / "b", folder / "c"};
+    const TemporaryDirectory directory;
+    WriteSoundModules(directory);
+    fs::permissions(directory / "a/Manual/docdata/index.json", fs::perms::none);
+    fs::permissions(directory / "a/Manual/docdata", fs::perms::owner_read | fs::perms::owner_exec);
+    fs::create_directories(directory / "c/Manual/docdata");
+    fs::permissions(directory / "c/Manual/docdata", fs::perms::none);
+    std::vector<std::string> command = {PAGEMELD_CHECK_PROGRAM, directory / "a", directory / "b",
+                                        directory / "c"};
     if (::geteuid() == 0)
     {
         command.insert(command.begin(), {"setpriv", "--bounding-set=-dac_override,-dac_read_search"});
     }
     const ProgramResult result = RunProgram(command.front(), {command.begin() + 1, command.end()});
-    fs::permissions(folder / "c/Manual/docdata", fs::perms::owner_all);
+    fs::permissions(directory / "c/Manual/docdata", fs::perms::owner_all);
     EXPECT_EQ(1, result.status);
     EXPECT_EQ(
         R"(@/a/Manual/docdata: error: can't be written to: the run ends here with status 255, and leaves 2 later modules and ScriptReference unwritten [output-blocked]
@@ -542,26 +543,26 @@ TEST(PagemeldCheck, TellsWhatAUserMayNotReadOrWrite)
 @/c/Manual/docdata/toc.json: error: can't be read; "c" will be missing from the contents of Manual [unreadable]
 3 modules, 5 errors, 0 warnings; missing from the search of Manual: a, c; from its contents: c
 )",
-        Neutral(result.standardOutput, folder));
+        WithPlaceholders(result.standardOutput, directory));
 }
 
 TEST(PagemeldCheck, FilesMayVanishWhileItRuns)
 {
-    const TemporaryFolder folder;
-    WriteSoundModules(folder);
+    const TemporaryDirectory directory;
+    WriteSoundModules(directory);
     std::atomic<bool> ends = false;
     std::thread builder(
         [&]
         {
             while (!ends)
             {
-                fs::rename(folder / "b/Manual", folder / "b/other");
-                fs::rename(folder / "b/other", folder / "b/Manual");
+                fs::rename(directory / "b/Manual", directory / "b/other");
+                fs::rename(directory / "b/other", directory / "b/Manual");
             }
         });
     for (int run = 0; run < 50; ++run)
     {
-        const std::string report = ReportOfCheck(folder, {"-t", "-o", "@/a", "@/b"});
+        const std::string report = RunPagemeldCheck(directory, {"-t", "-o", "@/a", "@/b"});
         EXPECT_NE(std::string::npos, report.find("\n2 modules, ")) << report;
         EXPECT_NE(std::string::npos, report.find("\nstatus 1\n")) << report;
     }
@@ -582,10 +583,10 @@ TEST(PagemeldCheck, RefusesUnusableCommandLines)
         {{"-n", "-1", "a"}, "the limit is a number"},
         {{"-n", "9999999999999999999", "a"}, "the limit is a number"},
     };
-    const TemporaryFolder folder;
+    const TemporaryDirectory directory;
     for (const auto& [arguments, problem] : cases)
     {
-        EXPECT_EQ("pagemeld-check: " + problem + "\n" + usage, ReportOfCheck(folder, arguments));
+        EXPECT_EQ("pagemeld-check: " + problem + "\n" + usage, RunPagemeldCheck(directory, arguments));
     }
     EXPECT_EQ(2, RunProgram(PAGEMELD_CHECK_PROGRAM, {"--colour", "a"}).status);
     const ProgramResult unknown = RunProgram(PAGEMELD_CHECK_PROGRAM, {"--explain=no-such"});
@@ -598,7 +599,7 @@ TEST(PagemeldCheck, RefusesUnusableCommandLines)
 TEST(PagemeldCheck, ExplainsEveryRuleInHelpAndOnItsPage)
 {
     const std::string help = RunProgram(PAGEMELD_CHECK_PROGRAM, {"--help"}).standardOutput;
-    const std::string page = ReadWholeFile(RULES_PAGE);
+    const std::string page = ReadFile(RULES_PAGE);
     std::string expected = page.substr(0, page.find("\n## ") + 1);
     for (const Rule& rule : AllRules())
     {

@@ -8,7 +8,7 @@
 #include "Runtime/Utilities/CommandLine.h"
 #include "tests/support/CapturedConsole.h"
 #include "tests/support/DescribedTests.h"
-#include "tests/support/NeutralText.h"
+#include "tests/support/Placeholders.h"
 
 #include <gtest/gtest.h>
 
@@ -25,7 +25,7 @@ constexpr const char* kNoCategoryFailure =
 
 /// Returns what a run prints, and the number that it returns.
 template <class... Arguments>
-std::string ReportOf(Arguments&&... arguments)
+std::string RunWithPlaceholders(Arguments&&... arguments)
 {
     const CapturedConsole console;
     const int failedTestCount = RunNativeTests(arguments...);
@@ -86,7 +86,7 @@ TEST(RunNativeTests, ReportsFailedIgnoredAndUngroupedTests)
                   "[Own] DISABLED_X: No reason given\n"
                   "[Own] DISABLED_X: No reason given\n"
                   "returned 3",
-              ReportOf(filter, tests));
+              RunWithPlaceholders(filter, tests));
     EXPECT_TRUE(Testing::g_IsRunningNativeTests);
     EXPECT_EQ(nullptr, Testing::g_TestReporter);
 }
@@ -110,7 +110,7 @@ TEST(RunNativeTests, WidensColumnsUpTo64)
     EXPECT_EQ("[S]  " + std::string(63, ' ') + "Li%0Ane  " + std::string(57, ' ') + "PASS(Nms)\n[" +
                   longName + "]  " + longName +
                   "  PASS(Nms)\nRan 2 tests with 0 failures in N seconds\nreturned 0",
-              ReportOf(filter, tests));
+              RunWithPlaceholders(filter, tests));
 }
 
 TEST(RunNativeTests, RunsTheCompiledInTestsThatCategoryAndNameSelect)
@@ -118,13 +118,13 @@ TEST(RunNativeTests, RunsTheCompiledInTestsThatCategoryAndNameSelect)
     const std::string end = " tests with 0 failures in N seconds\nreturned 0";
     EXPECT_EQ("[IndexCombiner]  AppendJsonDocument_TwoValidJsons_ProducesCombinedJson  PASS(Nms)\nRan 1" +
                   end,
-              ReportOf("UN", "INDEX.two"));
-    EXPECT_EQ("Ran 0" + end, ReportOf("Perf", ""));
+              RunWithPlaceholders("UN", "INDEX.two"));
+    EXPECT_EQ("Ran 0" + end, RunWithPlaceholders("Perf", ""));
     TestFilter filter;
     filter.nameFilters = {".trivial"};
     EXPECT_EQ("[TocCombiner]  AppendJsonDocument_TrivialAndSimpleJson_ProducesSimpleJson  PASS(Nms)\nRan 1" +
                   end,
-              ReportOf(filter));
+              RunWithPlaceholders(filter));
 }
 
 TEST(RunNativeTests, ReportsPerformanceDataUnlessASwitchOrTheCategoriesForbidIt)
@@ -150,7 +150,7 @@ TEST(RunNativeTests, ReportsPerformanceDataUnlessASwitchOrTheCategoriesForbidIt)
         TestFilter filter;
         filter.categoryPrefixes = c.categoryPrefixes;
         reports = !c.expected;
-        (void)ReportOf(filter, tests);
+        (void)RunWithPlaceholders(filter, tests);
         EXPECT_EQ(c.expected, reports) << "case " << &c - cases;
     }
     SetCommandLine(0, nullptr);

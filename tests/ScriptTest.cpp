@@ -2,9 +2,9 @@
 #include "Tools/DocTools/VantorPagemeld/Render/TocScript.h"
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
 #include "tests/support/CapturedStderr.h"
+#include "tests/support/Files.h"
 #include "tests/support/ParsedJson.h"
-#include "tests/support/TemporaryFolder.h"
-#include "tests/support/WholeFile.h"
+#include "tests/support/TemporaryDirectory.h"
 
 #include <gtest/gtest.h>
 
@@ -100,8 +100,8 @@ TEST(ScriptWriting, FailedWritesOfPiecesOfATocAreReported)
 {
     TocCombiner toc;
     const rapidjson::Document node = ParsedJson(R"({"link":"a","title":"A","children":[],"module":1})");
-    const TemporaryFolder folder;
-    for (const std::string& path : {folder / "script", std::string("/dev/full")})
+    const TemporaryDirectory directory;
+    for (const std::string& path : {directory / "script", std::string("/dev/full")})
     {
         const ScopedFile file(std::fopen(path.c_str(), "wb"));
         (void)std::setvbuf(file.get(), nullptr, _IONBF, 0);
@@ -110,18 +110,18 @@ TEST(ScriptWriting, FailedWritesOfPiecesOfATocAreReported)
         EXPECT_EQ(isWritten, toc.OutputValueAsJs(file.get(), node, 0));
     }
     EXPECT_EQ("\"say \\\"a\\\"\": \n{\"link\": p1+\"a\",\"title\": \"A\",\"children\": []}",
-              ReadWholeFile(folder / "script"));
+              ReadFile(directory / "script"));
 }
 
 TEST(ScriptWriting, TocWithoutALinkIsNoFile)
 {
-    const TemporaryFolder folder;
+    const TemporaryDirectory directory;
     TocCombiner toc;
     CapturedStderr captured;
     for (const char* json : {"{}", R"({"link":"l"})", R"({"title":"t","children":[]})"})
     {
-        EXPECT_FALSE(toc.OutputJsonValueAsJs("m", ParsedJson(json), (folder / "script").c_str())) << json;
+        EXPECT_FALSE(toc.OutputJsonValueAsJs("m", ParsedJson(json), (directory / "script").c_str())) << json;
     }
     EXPECT_EQ("", captured.Text());
-    EXPECT_TRUE(ReadTree(folder.Path()).empty());
+    EXPECT_TRUE(ReadTree(directory.Path()).empty());
 }

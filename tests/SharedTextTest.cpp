@@ -1,7 +1,7 @@
 #include "Tools/DocTools/VantorPagemeld/Write/SharedText.h"
 
-#include "tests/support/TemporaryFolder.h"
-#include "tests/support/WholeFile.h"
+#include "tests/support/Files.h"
+#include "tests/support/TemporaryDirectory.h"
 
 #include <gtest/gtest.h>
 
@@ -78,8 +78,8 @@ TEST(SharedText, EveryFileIsWholeAndACloneWherePossible)
     };
     for (const auto& c : cases)
     {
-        const TemporaryFolder folder;
-        std::filesystem::create_symlink("/dev/full", folder / "full");
+        const TemporaryDirectory directory;
+        std::filesystem::create_symlink("/dev/full", directory / "full");
         const std::string text = "[" + std::string(kSize - 2, 'x') + "]";
         SharedText shared(BufferOf(text));
         s_refusal = c.refusal;
@@ -87,9 +87,9 @@ TEST(SharedText, EveryFileIsWholeAndACloneWherePossible)
         for (const std::string name : c.names)
         {
             const std::string head = name == "head" ? "head" : "";
-            ScopedFile file(std::fopen((folder / name).c_str(), "w+b"));
+            ScopedFile file(std::fopen((directory / name).c_str(), "w+b"));
             EXPECT_EQ(name != "full", shared.WriteTo(std::move(file), head)) << name << ": " << c.what;
-            EXPECT_TRUE(name == "full" || ReadWholeFile(folder / name) == head + text)
+            EXPECT_TRUE(name == "full" || ReadFile(directory / name) == head + text)
                 << name << ": " << c.what;
         }
         s_refusal = EOPNOTSUPP;

@@ -3,8 +3,8 @@
 #include "Tools/DocTools/VantorPagemeld/IndexCombiner.h"
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
 #include "tests/support/CapturedStderr.h"
+#include "tests/support/Files.h"
 #include "tests/support/ParsedJson.h"
-#include "tests/support/WholeFile.h"
 
 #include <gtest/gtest.h>
 #include <rapidjson/pointer.h>
@@ -61,7 +61,7 @@ std::string TextOf(const rapidjson::Value& row, const char* name)
 template <class Combiner, class Check>
 void ExpectStructure(const char* list, const std::string& tag, Check check)
 {
-    const rapidjson::Document cases = ParsedJson(ReadWholeFile(STRUCTURE_CASES));
+    const rapidjson::Document cases = ParsedJson(ReadFile(STRUCTURE_CASES));
     ASSERT_FALSE(cases[list].Empty());
     for (const rapidjson::Value& row : cases[list].GetArray())
     {

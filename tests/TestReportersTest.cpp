@@ -2,7 +2,7 @@
 #include "Runtime/Testing/ConsoleTestReporter.h"
 #include "tests/support/CapturedConsole.h"
 #include "tests/support/CapturedStderr.h"
-#include "tests/support/NeutralText.h"
+#include "tests/support/Placeholders.h"
 
 #include <gtest/gtest.h>
 

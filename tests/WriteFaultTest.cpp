@@ -1,5 +1,5 @@
 #include "tests/support/ExampleDocs.h"
-#include "tests/support/WholeFile.h"
+#include "tests/support/Files.h"
 
 #include <gtest/gtest.h>
 
@@ -53,14 +53,13 @@ TEST(WriteFault, FileSizeLimitAtAnyByteLeavesWholeScripts)
 TEST(WriteFault, ObstaclesHaveTheirDocumentedOutcome)
 {
     using Prepare = void (*)(const std::string& path);
-    const Prepare putFolder = [](const std::string& path)
+    const Prepare putDirectory = [](const std::string& path)
     {
         fs::remove(path);
         fs::create_directory(path);
     };
     const Prepare putPipe = [](const std::string& path) { EXPECT_EQ(0, ::mkfifo(path.c_str(), 0666)); };
-    const Prepare putStaleFile = [](const std::string& path)
-    { WriteWholeFile(path, std::string(10'000, 'x')); };
+    const Prepare putStaleFile = [](const std::string& path) { WriteFile(path, std::string(10'000, 'x')); };
     const Prepare forbidWriting = [](const std::string& path)
     { fs::permissions(path, fs::perms::owner_read | fs::perms::owner_exec); };
     const struct
@@ -74,16 +73,16 @@ TEST(WriteFault, ObstaclesHaveTheirDocumentedOutcome)
         {putStaleFile, "b/Manual/docdata/global_toc.js.tmp", 0, "NNNN NNNN"},
         {forbidWriting, "a/Manual/docdata", 255, "OOOO OOOO"},
         {forbidWriting, "b/Manual/docdata", 255, "NNNN OOOO"},
-        {putFolder, "a/Manual/docdata/global_index.json.tmp", 0, "O[D]NNN NNNN"},
-        {putFolder, "a/Manual/docdata/global_index.js.tmp", 255, "NO[D]OO OOOO"},
-        {putFolder, "a/Manual/docdata/global_toc.json.tmp", 0, "NNO[D]N NNNN"},
-        {putFolder, "a/Manual/docdata/global_toc.js.tmp", 0, "NNNO[D] NNNN"},
+        {putDirectory, "a/Manual/docdata/global_index.json.tmp", 0, "O[D]NNN NNNN"},
+        {putDirectory, "a/Manual/docdata/global_index.js.tmp", 255, "NO[D]OO OOOO"},
+        {putDirectory, "a/Manual/docdata/global_toc.json.tmp", 0, "NNO[D]N NNNN"},
+        {putDirectory, "a/Manual/docdata/global_toc.js.tmp", 0, "NNNO[D] NNNN"},
         {putPipe, "a/Manual/docdata/global_index.json.tmp", 0, "O[-]NNN NNNN"},
         {putPipe, "a/Manual/docdata/global_index.js.tmp", 255, "NO[-]OO OOOO"},
         {putPipe, "a/Manual/docdata/global_toc.js.tmp", 0, "NNNO[-] NNNN"},
         // A rename onto a directory fails, and is not reported.
-        {putFolder, "a/Manual/docdata/global_index.json", 0, "D[N]NNN NNNN"},
-        {putFolder, "a/Manual/docdata/global_toc.js", 0, "NNND[N] NNNN"},
+        {putDirectory, "a/Manual/docdata/global_index.json", 0, "D[N]NNN NNNN"},
+        {putDirectory, "a/Manual/docdata/global_toc.js", 0, "NNND[N] NNNN"},
     };
     const ExampleDocs docs;
     for (const auto& c : cases)
@@ -115,7 +114,7 @@ TEST(WriteFault, KilledRunLeavesWholeOutputsAndTheNextOneMendsThem)
             ASSERT_EQ(-9, status);
             for (const ExampleDocs::Output& output : docs.Outputs())
             {
-                const std::string bytes = ReadWholeFile(docs / output.path);
+                const std::string bytes = ReadFile(docs / output.path);
                 EXPECT_TRUE(bytes == output.newBytes || bytes == "the earlier output")
                     << output.path << ", killed at " << operation << ' ' << count;
             }

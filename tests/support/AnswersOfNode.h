@@ -1,7 +1,7 @@
 #pragma once
 
+#include "tests/support/Files.h"
 #include "tests/support/RunProgram.h"
-#include "tests/support/WholeFile.h"
 
 #include <sstream>
 #include <string>
@@ -22,10 +22,10 @@ inline std::vector<std::string> AnswersOfNode(const std::string& script,
     {
         input += text + kEnd;
     }
-    const TemporaryFolder folder;
-    WriteWholeFile(folder / "texts", input);
+    const TemporaryDirectory directory;
+    WriteFile(directory / "texts", input);
     std::istringstream output(
-        RunProgram(NODE_PROGRAM, {"-e", script + loop, folder / "texts"}).standardOutput);
+        RunProgram(NODE_PROGRAM, {"-e", script + loop, directory / "texts"}).standardOutput);
     std::vector<std::string> answers;
     for (std::string answer; std::getline(output, answer, kEnd);)
     {

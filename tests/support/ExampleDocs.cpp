@@ -1,6 +1,6 @@
 #include "tests/support/ExampleDocs.h"
 
-#include "tests/support/WholeFile.h"
+#include "tests/support/Files.h"
 
 #include <filesystem>
 
@@ -17,7 +17,7 @@ char Letter(const std::string& path, const std::string& newBytes)
     {
         return fs::is_directory(path) ? 'D' : '-';
     }
-    const std::string bytes = ReadWholeFile(path);
+    const std::string bytes = ReadFile(path);
     if (bytes == newBytes || bytes.empty())
     {
         return bytes.empty() ? 'E' : 'N';
@@ -45,7 +45,7 @@ ExampleDocs::ExampleDocs()
     (void)Run();
     for (Output& output : m_outputs)
     {
-        output.newBytes = ReadWholeFile(*this / output.path);
+        output.newBytes = ReadFile(*this / output.path);
     }
     Restore();
 }
@@ -65,15 +65,15 @@ void ExampleDocs::Restore() const
         std::error_code missing;
         fs::permissions(docdata, fs::perms::owner_all, missing); // a test may have taken them away
         fs::remove_all(docdata);
-        WriteWholeFile(docdata + "/index.json",
-                       R"({"pages":[["p.html","P"]],"info":[["t",0]],"common":{},"searchIndex":{")" + module +
-                           R"(":[0]}})");
-        WriteWholeFile(docdata + "/toc.json", R"({"link":"toc","title":"toc","children":[{"link":")" +
-                                                  module + R"(","title":"","children":null}]})");
+        WriteFile(docdata + "/index.json",
+                  R"({"pages":[["p.html","P"]],"info":[["t",0]],"common":{},"searchIndex":{")" + module +
+                      R"(":[0]}})");
+        WriteFile(docdata + "/toc.json", R"({"link":"toc","title":"toc","children":[{"link":")" + module +
+                                             R"(","title":"","children":null}]})");
     }
     for (const Output& output : m_outputs)
     {
-        WriteWholeFile(*this / output.path, kEarlierBytes);
+        WriteFile(*this / output.path, kEarlierBytes);
     }
 }
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "tests/support/RunProgram.h"
-#include "tests/support/TemporaryFolder.h"
+#include "tests/support/TemporaryDirectory.h"
 
 #include <string>
 #include <vector>
@@ -21,7 +21,7 @@ public:
     ExampleDocs();
 
     /// Returns the path of something below the directory.
-    [[nodiscard]] std::string operator/(const std::string& name) const { return m_folder / name; }
+    [[nodiscard]] std::string operator/(const std::string& name) const { return m_directory / name; }
 
     /// Runs pagemeld over both modules; through a command that runs another one, if given.
     [[nodiscard]] ProgramResult Run(const std::vector<std::string>& through = {}) const;
@@ -40,6 +40,6 @@ public:
     [[nodiscard]] std::string Describe() const;
 
 private:
-    TemporaryFolder m_folder;
+    TemporaryDirectory m_directory;
     std::vector<Output> m_outputs;
 };

@@ -1,8 +1,8 @@
 #pragma once
 
+#include "tests/support/Files.h"
 #include "tests/support/ParsedJson.h"
-#include "tests/support/TemporaryFolder.h"
-#include "tests/support/WholeFile.h"
+#include "tests/support/TemporaryDirectory.h"
 
 #include <list>
 #include <vector>
@@ -14,12 +14,12 @@ class MergedModules
 public:
     explicit MergedModules(const std::vector<std::string>& modules)
     {
-        const TemporaryFolder folder;
+        const TemporaryDirectory directory;
         std::list<std::string> paths;
         for (const std::string& json : modules)
         {
-            paths.push_back(folder / std::to_string(paths.size()));
-            WriteWholeFile(paths.back() + "/module.json", json);
+            paths.push_back(directory / std::to_string(paths.size()));
+            WriteFile(paths.back() + "/module.json", json);
         }
         (void)m_combiner.CombineJson(paths, "module.json");
     }

@@ -1,7 +1,7 @@
 #include "tests/support/RunProgram.h"
 
-#include "tests/support/NeutralText.h"
-#include "tests/support/WholeFile.h"
+#include "tests/support/Files.h"
+#include "tests/support/Placeholders.h"
 
 #include <stdexcept>
 
@@ -13,28 +13,28 @@
 namespace
 {
 
-std::string ReportOf(const char* program, const TemporaryFolder& folder,
-                     const std::vector<std::string>& arguments)
+std::string RunWithPlaceholders(const char* program, const TemporaryDirectory& directory,
+                                const std::vector<std::string>& arguments)
 {
     std::vector<std::string> fullArguments;
     fullArguments.reserve(arguments.size());
     for (const std::string& argument : arguments)
     {
-        fullArguments.push_back(ReplaceAll(argument, "@", folder.Path()));
+        fullArguments.push_back(ReplaceAll(argument, "@", directory.Path()));
     }
     const ProgramResult result = RunProgram(program, fullArguments);
     const std::string report =
         result.standardOutput + result.standardError + "status " + std::to_string(result.status) + "\n";
-    return Neutral(report, folder);
+    return WithPlaceholders(report, directory);
 }
 
 } // namespace
 
 ProgramResult RunProgram(const std::string& program, const std::vector<std::string>& arguments)
 {
-    const TemporaryFolder folder;
-    const std::string output = folder / "output";
-    const std::string error = folder / "error";
+    const TemporaryDirectory directory;
+    const std::string output = directory / "output";
+    const std::string error = directory / "error";
     posix_spawn_file_actions_t actions;
     ::posix_spawn_file_actions_init(&actions);
     ::posix_spawn_file_actions_addopen(&actions, STDOUT_FILENO, output.c_str(), O_CREAT | O_WRONLY, 0600);
@@ -56,16 +56,16 @@ ProgramResult RunProgram(const std::string& program, const std::vector<std::stri
     }
     int status = 0;
     ::waitpid(process, &status, 0);
-    return {WIFEXITED(status) ? WEXITSTATUS(status) : -WTERMSIG(status), ReadWholeFile(output),
-            ReadWholeFile(error)};
+    return {WIFEXITED(status) ? WEXITSTATUS(status) : -WTERMSIG(status), ReadFile(output), ReadFile(error)};
 }
 
-std::string ReportOfRun(const TemporaryFolder& folder, const std::vector<std::string>& arguments)
+std::string RunPagemeld(const TemporaryDirectory& directory, const std::vector<std::string>& arguments)
 {
-    return ReplaceAll(ReportOf(PAGEMELD_PROGRAM, folder, arguments), PAGEMELD_PROGRAM, "PROGRAM");
+    return ReplaceAll(RunWithPlaceholders(PAGEMELD_PROGRAM, directory, arguments), PAGEMELD_PROGRAM,
+                      "PROGRAM");
 }
 
-std::string ReportOfCheck(const TemporaryFolder& folder, const std::vector<std::string>& arguments)
+std::string RunPagemeldCheck(const TemporaryDirectory& directory, const std::vector<std::string>& arguments)
 {
-    return ReportOf(PAGEMELD_CHECK_PROGRAM, folder, arguments);
+    return RunWithPlaceholders(PAGEMELD_CHECK_PROGRAM, directory, arguments);
 }

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "tests/support/TemporaryFolder.h"
+#include "tests/support/TemporaryDirectory.h"
 
 #include <string>
 #include <vector>
@@ -20,7 +20,7 @@ ProgramResult RunProgram(const std::string& program, const std::vector<std::stri
 ///
 /// Returns its standard output, its standard error and a line that reads "status 0", with @ for the directory
 /// and PROGRAM for its own path.
-std::string ReportOfRun(const TemporaryFolder& folder, const std::vector<std::string>& arguments);
+std::string RunPagemeld(const TemporaryDirectory& directory, const std::vector<std::string>& arguments);
 
 /// The same for the built pagemeld-check, whose path is not replaced.
-std::string ReportOfCheck(const TemporaryFolder& folder, const std::vector<std::string>& arguments);
+std::string RunPagemeldCheck(const TemporaryDirectory& directory, const std::vector<std::string>& arguments);

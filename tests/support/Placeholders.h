@@ -1,6 +1,6 @@
 #pragma once
 
-#include "tests/support/TemporaryFolder.h"
+#include "tests/support/TemporaryDirectory.h"
 
 #include <vector>
 
@@ -16,9 +16,9 @@ inline std::string ReplaceAll(std::string text, const std::string& from, const s
 }
 
 /// Returns a report with @ for the directory and # for the place of the sources in the tags of messages.
-inline std::string Neutral(const std::string& report, const TemporaryFolder& folder)
+inline std::string WithPlaceholders(const std::string& report, const TemporaryDirectory& directory)
 {
-    return ReplaceAll(ReplaceAll(report, folder.Path(), "@"), "./Tools/DocTools/VantorPagemeld/", "#");
+    return ReplaceAll(ReplaceAll(report, directory.Path(), "@"), "./Tools/DocTools/VantorPagemeld/", "#");
 }
 
 /// Returns the output of self-tests with N for the numbers that differ from run to run: those after the

@@ -5,25 +5,25 @@
 #include <string>
 
 /// A new empty directory that is removed, with its contents, at the end of this object's life.
-class TemporaryFolder
+class TemporaryDirectory
 {
 public:
-    TemporaryFolder() : m_path(std::filesystem::temp_directory_path() / "pagemeld-test-XXXXXX")
+    TemporaryDirectory() : m_path(std::filesystem::temp_directory_path() / "pagemeld-test-XXXXXX")
     {
         if (::mkdtemp(m_path.data()) == nullptr)
         {
-            throw std::filesystem::filesystem_error("no temporary folder", m_path, {});
+            throw std::filesystem::filesystem_error("no temporary directory", m_path, {});
         }
     }
 
-    ~TemporaryFolder()
+    ~TemporaryDirectory()
     {
         std::error_code ignored;
         std::filesystem::remove_all(m_path, ignored);
     }
 
-    TemporaryFolder(const TemporaryFolder&) = delete;
-    TemporaryFolder& operator=(const TemporaryFolder&) = delete;
+    TemporaryDirectory(const TemporaryDirectory&) = delete;
+    TemporaryDirectory& operator=(const TemporaryDirectory&) = delete;
 
     [[nodiscard]] const std::string& Path() const { return m_path; }
 

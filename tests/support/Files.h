@@ -7,28 +7,28 @@
 #include <string>
 
 /// Returns all bytes of a file; a text that says so if it can't be opened, so that a comparison shows it.
-inline std::string ReadWholeFile(const std::string& path)
+inline std::string ReadFile(const std::string& path)
 {
     std::ifstream file(path, std::ios::binary);
     return file ? std::string(std::istreambuf_iterator<char>(file), {}) : "(no file " + path + ")";
 }
 
 /// Writes a file, and makes the directories above it that are missing.
-inline void WriteWholeFile(const std::string& path, const std::string& bytes)
+inline void WriteFile(const std::string& path, const std::string& bytes)
 {
     std::filesystem::create_directories(std::filesystem::path(path).parent_path());
     std::ofstream(path, std::ios::binary) << bytes;
 }
 
 /// Returns the content of every regular file below a directory, by its path relative to that.
-inline std::map<std::string, std::string> ReadTree(const std::string& folder)
+inline std::map<std::string, std::string> ReadTree(const std::string& directory)
 {
     std::map<std::string, std::string> files;
-    for (const auto& entry : std::filesystem::recursive_directory_iterator(folder))
+    for (const auto& entry : std::filesystem::recursive_directory_iterator(directory))
     {
         if (entry.is_regular_file())
         {
-            files[entry.path().lexically_relative(folder)] = ReadWholeFile(entry.path());
+            files[entry.path().lexically_relative(directory)] = ReadFile(entry.path());
         }
     }
     return files;
