@@ -7,7 +7,8 @@
 
 // What the merges of search indexes and of tables of contents have in common.
 
-/// Returns whether a structure check accepts the document, and requires that it finds no fault just then.
+/// Returns whether a structure check accepts the document. Requires that it accepts exactly what has no
+/// fault.
 template <class Check>
 bool IsSound(Check check, const rapidjson::Value& document)
 {

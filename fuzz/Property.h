@@ -13,13 +13,13 @@
 void Require(bool holds, const char* property);
 
 /// Whether two values are the same down to the order of members and the type of numbers. The library's own
-/// comparison takes objects with a name twice for different from themselves.
+/// comparison finds an object that has a name twice different from itself.
 bool IsSameValue(const rapidjson::Value& a, const rapidjson::Value& b);
 
 /// Requires that the reader accepts a text that was written for the value, and that the text has the value.
 ///
-/// The library's reader is right to a few units in the last place of a double by default; what the text has
-/// is read with its exact one.
+/// By default the library's reader can be off by a few units in the last place of a double. So the value of
+/// the text is read with its exact mode.
 void RequireReadsBack(const rapidjson::Value& value, const char* written);
 
 /// Returns the texts that a fuzzer's input holds, each up to a NUL byte. There is always one.

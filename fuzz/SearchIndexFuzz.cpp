@@ -4,8 +4,8 @@
 #include "fuzz/MergeProperty.h"
 #include "tests/support/PlainMerge.h"
 
-// Search indexes that pass the structure check merge as in a plain linear merge, and what is written of
-// the merged one reads back equal. The first module is a fixed one.
+// Search indexes that pass the structure check merge as in a plain linear merge, and the JSON that is
+// written of the result reads back equal. The first module is a fixed one.
 
 namespace
 {

@@ -3,8 +3,8 @@
 #include "fuzz/MergeProperty.h"
 #include "tests/support/PlainMerge.h"
 
-// Tables of contents that pass the structure check merge as in a plain linear merge, and what is written
-// of the merged one reads back equal.
+// Tables of contents that pass the structure check merge as in a plain linear merge, and the JSON that is
+// written of the result reads back equal.
 
 namespace
 {

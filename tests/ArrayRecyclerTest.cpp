@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-TEST(ArrayRecycler, ListsGrowIntoStorageThatOthersLeft)
+TEST(ArrayRecycler, ListsReuseTheStorageOfOthers)
 {
     rapidjson::Document lists =
         ParsedJson("[[1,2,3,4],[5,6,7,8],[9],[10,11],[12,13],[14,15],[16,17,18],[19,20],[21]]");

@@ -10,7 +10,8 @@
 #include <set>
 #include <sstream>
 
-// What the checker tells before a run, and what the run then makes of the same modules, on damaged ones.
+// What the checker reports before a run must agree with what the run then makes of the same modules, some of
+// them damaged.
 
 namespace
 {
@@ -91,11 +92,11 @@ private:
     std::mt19937 m_random;
 };
 
-/// What the checker told of a tree.
-class Told
+/// What the checker finds in a tree.
+class Findings
 {
 public:
-    explicit Told(const std::string& lines)
+    explicit Findings(const std::string& lines)
     {
         std::istringstream stream(lines);
         for (std::string line; std::getline(stream, line);)
@@ -113,7 +114,8 @@ public:
                            });
     }
 
-    /// Whether the module's contents are told as dropped: at its own file, or by name at the first one's.
+    /// Whether the module's contents are reported as dropped: at its own file, or by name at the first
+    /// module's.
     [[nodiscard]] bool IsDropped(const std::string& root, const std::string& name) const
     {
         return std::any_of(m_findings.begin(), m_findings.end(),
@@ -155,7 +157,7 @@ Names NamesIn(const std::string& path)
 
 } // namespace
 
-TEST(CheckerAgreement, TellsWhichModulesARunMerges)
+TEST(CheckerAgreement, PredictsWhichModulesARunMerges)
 {
     std::vector<std::string> scripts;
     int writtenCount = 0;
@@ -172,12 +174,12 @@ TEST(CheckerAgreement, TellsWhichModulesARunMerges)
         }
         std::vector<std::string> arguments = {"--format=json", "--limit=0"};
         arguments.insert(arguments.end(), roots.begin(), roots.end());
-        const Told told(RunProgram(PAGEMELD_CHECK_PROGRAM, arguments).standardOutput);
+        const Findings findings(RunProgram(PAGEMELD_CHECK_PROGRAM, arguments).standardOutput);
         EXPECT_EQ(0, RunProgram(PAGEMELD_PROGRAM, roots).status);
 
         const std::string combined = Docdata(roots.back());
         const bool isWritten = std::filesystem::exists(combined + "/global_toc.js");
-        EXPECT_EQ(isWritten, !told.Has({"nothing-to-combine"})) << "seed " << seed;
+        EXPECT_EQ(isWritten, !findings.Has({"nothing-to-combine"})) << "seed " << seed;
         if (!isWritten)
         {
             continue;
@@ -190,19 +192,19 @@ TEST(CheckerAgreement, TellsWhichModulesARunMerges)
             const Names refused = {"unreadable", "not-json", "structure"};
             const std::string index = Docdata(roots[i]) + "/index.json";
             const std::string toc = Docdata(roots[i]) + "/toc.json";
-            const bool hasFiles = !told.Has({"set-empty"}, Docdata(roots[i]));
-            if (hasFiles && !told.Has(refused, index) && !told.Has({"merged-input"}, index))
+            const bool hasFiles = !findings.Has({"set-empty"}, Docdata(roots[i]));
+            if (hasFiles && !findings.Has(refused, index) && !findings.Has({"merged-input"}, index))
             {
                 inSearch.insert(kModules[i]);
             }
-            if (hasFiles && !told.Has(refused, toc) && !told.IsDropped(roots[i], kModules[i]))
+            if (hasFiles && !findings.Has(refused, toc) && !findings.IsDropped(roots[i], kModules[i]))
             {
                 inContents.insert(kModules[i]);
             }
         }
         EXPECT_EQ(inSearch, NamesIn(combined + "/global_index.json")) << "seed " << seed;
         EXPECT_EQ(inContents, NamesIn(combined + "/global_toc.json")) << "seed " << seed;
-        if (!told.Has({"script-broken", "wrong-link-path", "merged-input"}))
+        if (!findings.Has({"script-broken", "wrong-link-path", "merged-input"}))
         {
             scripts.push_back(ReadFile(combined + "/global_index.js"));
             scripts.push_back(ReadFile(combined + "/global_toc.js"));

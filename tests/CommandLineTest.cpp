@@ -94,7 +94,7 @@ status 0
 status 0
 )text"},
         {{"no such test"}, "Ran 0 tests with 0 failures in N seconds\nstatus 0\n"},
-        {{"-automated"}, "status 0\n"}, // the switch is in the filter's place, and so is the filter too
+        {{"-automated"}, "status 0\n"}, // in the filter's place, the switch is the filter as well
     };
     for (const auto& c : cases)
     {

@@ -10,7 +10,7 @@
 
 #include <pthread.h>
 
-// Documents as deep as the reader lets them be, on a quarter of the usual stack.
+// Documents as deep as the reader allows, on a quarter of the usual stack.
 
 namespace
 {

@@ -27,7 +27,7 @@ void AddModule(const TemporaryDirectory& directory, const std::string& modulePat
     WriteFile(directory / (modulePath + "/docdata/toc.json"), toc);
 }
 
-/// Returns every file that is no input of a module, by its path.
+/// Returns every file that is not an input of a module, by its path.
 std::map<std::string, std::string> Outputs(const TemporaryDirectory& directory)
 {
     std::map<std::string, std::string> outputs;
@@ -42,7 +42,7 @@ std::map<std::string, std::string> Outputs(const TemporaryDirectory& directory)
     return outputs;
 }
 
-/// Returns the path of every file that is no input of a module, each on a line.
+/// Returns the path of every file that is not an input of a module, each on a line.
 std::string OutputNames(const TemporaryDirectory& directory)
 {
     std::string names;
@@ -151,7 +151,7 @@ toc = {
               ReadFile(directory / "a/ScriptReference/docdata/global_toc.js"));
 }
 
-TEST(DocumentationSet, UnwritableScripts)
+TEST(DocumentationSet, OnlyAnUnwritableIndexScriptEndsTheRun)
 {
     const TemporaryDirectory directory;
     for (const char* modulePath : {"a/Manual", "c/Manual", "a/ScriptReference", "c/ScriptReference"})

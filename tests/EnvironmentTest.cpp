@@ -112,7 +112,7 @@ TEST(Environment, DeepInputNeedsNoMoreThanASmallStack)
     }
 }
 
-TEST(Environment, SymbolicLinksAreFollowedButForOutputs)
+TEST(Environment, SymbolicLinksAreFollowedExceptForOutputs)
 {
     const struct
     {

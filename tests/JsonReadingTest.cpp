@@ -133,7 +133,7 @@ TEST(JsonReading, DocumentCarriesTheErrorOfTheLastParse)
         {"{\"a\":1,}", rapidjson::kParseErrorObjectMissName, 7},
         {"[1e400]", rapidjson::kParseErrorNumberTooBig, 1},
         {"[0.00000000001e-2147483639,]", rapidjson::kParseErrorValueInvalid, 27},
-        {"[1.8e308]", rapidjson::kParseErrorDocumentEmpty, 1}, // our own limit; the code says nothing
+        {"[1.8e308]", rapidjson::kParseErrorDocumentEmpty, 1}, // our own limit: the code is unspecified
         {"[1,2,\"x\"], oops", rapidjson::kParseErrorDocumentRootNotSingular, 9},
     };
     for (const auto& c : cases)

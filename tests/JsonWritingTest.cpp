@@ -33,7 +33,7 @@ TEST(JsonWriting, CompactAndPrettyForm)
         {R"(["\"\\\/\b\f\n\r\t\u0000\u0001\u001f\u007f\u00e9\ud83d\ude00"])",
          "[\"\\\"\\\\/\\b\\f\\n\\r\\t\\u0000\\u0001\\u001F\x7F\xC3\xA9\xF0\x9F\x98\x80\"]",
          "[\n    \"\\\"\\\\/\\b\\f\\n\\r\\t\\u0000\\u0001\\u001F\x7F\xC3\xA9\xF0\x9F\x98\x80\"\n]"},
-        {"[\"\xFF\xC3\"]", "[\"\xFF\xC3\"]", "[\n    \"\xFF\xC3\"\n]"}, // bytes that are no UTF-8
+        {"[\"\xFF\xC3\"]", "[\"\xFF\xC3\"]", "[\n    \"\xFF\xC3\"\n]"}, // bytes that are not UTF-8
         {R"({"\u0000":1,"":2,"":3})", R"({"\u0000":1,"":2,"":3})",
          "{\n    \"\\u0000\": 1,\n    \"\": 2,\n    \"\": 3\n}"},
     };

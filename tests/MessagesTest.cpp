@@ -10,7 +10,7 @@
 TEST(Messages, EachIsOneWrite)
 {
     int ends[2] = {};
-    ASSERT_EQ(0, ::socketpair(AF_UNIX, SOCK_DGRAM, 0, ends)); // keeps the bounds of writes
+    ASSERT_EQ(0, ::socketpair(AF_UNIX, SOCK_DGRAM, 0, ends)); // preserves the boundaries of writes
     const int standardError = ::dup(STDERR_FILENO);
     ::dup2(ends[1], STDERR_FILENO);
     const std::string longName(20'000, 'n');

@@ -38,7 +38,7 @@ TEST(ModuleDiscovery, WalksInByteOrderAndStopsAtModules)
     {
         text += ReplaceAll(path, directory.Path(), "@") + "\n";
     }
-    // The directory itself is no candidate, though it has a Manual/docdata; a linked docdata counts, and a
+    // The directory itself is not a candidate, though it has a Manual/docdata; a linked docdata counts, and a
     // socket, which has the directory bit.
     EXPECT_EQ("kept\n@//Zeta\n@//a\n@//b\n@//deep/er/m\n@//deep/er/m-1\n@//deep-er\n@//file/n\n@//linked\n"
               "@//socket\n@//x\n",

@@ -17,8 +17,8 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-// What the checker prints, whole. Each row of the table has, for some rules, what breaks them, mostly in
-// module b, and what comes close and is not told, mostly in module a.
+// All that the checker prints. Each row of the table has, for some rules, what breaks them, mostly in module
+// b, and what comes close and is not reported, mostly in module a.
 
 namespace
 {
@@ -114,7 +114,7 @@ void ExpectReport(const CheckCase& c)
 
 } // namespace
 
-TEST(PagemeldCheck, TellsWhatBreaksARuleAndNotWhatComesClose)
+TEST(PagemeldCheck, ReportsWhatBreaksARuleAndNotWhatComesClose)
 {
     const CheckCase cases[] = {
         {{"--discover=@"},
@@ -518,7 +518,7 @@ status 1
     }
 }
 
-TEST(PagemeldCheck, TellsWhatAUserMayNotReadOrWrite)
+TEST(PagemeldCheck, ReportsWhatAUserMayNotReadOrWrite)
 {
     const TemporaryDirectory directory;
     WriteSoundModules(directory);

@@ -198,7 +198,7 @@ TEST(TestRunner, RunsTheSelectedTestsOfASuiteAndReturnsTheFailures)
     EXPECT_GT(15.0F, reportedSeconds);
 }
 
-TEST(TestResults, CountWithoutAReporterToo)
+TEST(TestResults, CountEvenWithoutAReporter)
 {
     UnitTest::TestResults results(nullptr);
     for (const int earlierTests : {0, 1})

@@ -113,7 +113,7 @@ TEST(ScriptWriting, FailedWritesOfPiecesOfATocAreReported)
               ReadFile(directory / "script"));
 }
 
-TEST(ScriptWriting, TocWithoutALinkIsNoFile)
+TEST(ScriptWriting, TocWithoutALinkWritesNoFile)
 {
     const TemporaryDirectory directory;
     TocCombiner toc;

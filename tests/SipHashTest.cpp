@@ -5,9 +5,9 @@
 #include <numeric>
 #include <string>
 
-/// The expected values are those of an implementation in another language, which has the published example of
-/// SipHash-2-4 when it runs as many rounds.
-TEST(SipHash, HasTheValuesOfTheFunction)
+/// The expected values come from an implementation in another language, which gives the published example of
+/// SipHash-2-4 when it runs the rounds of that function.
+TEST(SipHash, ReturnsTheReferenceValues)
 {
     const struct
     {
@@ -27,5 +27,5 @@ TEST(SipHash, HasTheValuesOfTheFunction)
     EXPECT_EQ(0xf30eb725bb91c9eaU,
               SipHash13({0, 0}, std::string("\0\1\2\3\4\5\6\7\10\11\12\13\14\15\16", 15)));
     EXPECT_EQ(KeyedHash("term"), KeyedHash("term"));
-    EXPECT_NE(SipHash13({0, 0}, "term"), KeyedHash("term")) << "the key is drawn";
+    EXPECT_NE(SipHash13({0, 0}, "term"), KeyedHash("term")) << "the key is random";
 }

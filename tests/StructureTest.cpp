@@ -12,7 +12,7 @@
 namespace
 {
 
-/// Refuses what a derived class may refuse beyond the format: a node with the title "secret".
+/// Refuses more than the format requires, as a derived class may: a node with the title "secret".
 class SecretiveCombiner : public TocCombiner
 {
 public:
@@ -53,8 +53,8 @@ std::string TextOf(const rapidjson::Value& row, const char* name)
     return member == row.MemberEnd() ? "" : member->value.GetString();
 }
 
-/// Holds a combiner and a check to the rows of a list in structureCases.json, to which the schemas of the
-/// formats are held as well.
+/// Tests a combiner and a structure check against the rows of a list in structureCases.json, against which
+/// script/check-schemas tests the schemas as well.
 ///
 /// A row has a document and, if that is faulty, "faults": the number and place of each, and "message": the
 /// number and text of the first one.

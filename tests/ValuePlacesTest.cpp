@@ -59,7 +59,7 @@ TEST(ValuePlaces, LocatesEveryValueOfADocument)
     }
 }
 
-TEST(ValuePlaces, AnswersInTheOrderOfTheQuestion)
+TEST(ValuePlaces, ReturnsPlacesInTheOrderOfTheValues)
 {
     const char* const text = "{\"a\":[1,\n2],\"b\":3}";
     const rapidjson::Document document = ParsedJson(text);

@@ -94,7 +94,7 @@ TEST(WriteFault, ObstaclesHaveTheirDocumentedOutcome)
     }
 }
 
-TEST(WriteFault, KilledRunLeavesWholeOutputsAndTheNextOneMendsThem)
+TEST(WriteFault, KilledRunLeavesWholeOutputsAndTheNextOneReplacesThem)
 {
     const ExampleDocs docs;
     int runs = 0;

@@ -35,7 +35,7 @@ enum class TestState : std::uint32_t
     Failed = 5
 };
 
-/// Returns the line for a test that begins. (The spelling of both functions is kept.)
+/// Returns the line for a test that begins. The misspelling in both names is kept on purpose.
 core::string TestStatusBeginMesssageToQZMString(const char* name);
 
 /// Returns the line for a test that ended, with its failure text, which may be empty, and the place where it

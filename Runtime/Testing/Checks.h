@@ -3,7 +3,7 @@
 #include "Runtime/Core/Containers/String.h"
 #include "Runtime/Testing/TestDetails.h"
 
-// What test bodies check with. A check that fails reports a failure; the test goes on.
+// The checks that test bodies call. One that fails reports a failure; the test goes on.
 
 namespace UnitTest
 {

@@ -17,7 +17,8 @@ int FillerWidth(int columnWidth, std::size_t textLength)
     return std::max(0, columnWidth - static_cast<int>(textLength));
 }
 
-float ClampDuration(const TestDetails& details, float seconds)
+/// Returns the duration to print: 0 for a negative one, which it reports on standard error.
+float ClampPrintedDuration(const TestDetails& details, float seconds)
 {
     if (seconds >= 0)
     {
@@ -130,7 +131,7 @@ void ConsoleTestReporter::ReportTestStatusOnFinish(const TestDetails& details, f
     }
     else
     {
-        printf_console("%s", DescribePass(*this, ClampDuration(details, seconds)).c_str());
+        printf_console("%s", DescribePass(*this, ClampPrintedDuration(details, seconds)).c_str());
     }
     std::for_each(failures.begin(), failures.end(), PrintFailure);
 }

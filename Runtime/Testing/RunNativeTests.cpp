@@ -18,7 +18,7 @@ int Testing::g_AssertCountBeforeTests = 0;
 namespace
 {
 
-int Widen(int width, const core::string& name)
+int WidenColumn(int width, const core::string& name)
 {
     constexpr std::size_t kWidestColumn = 64;
     return std::max(width, static_cast<int>(std::min(name.size(), kWidestColumn)));
@@ -32,8 +32,8 @@ struct GetLengthsOfLongestSuiteAndTestNamesState
     {
         if (filter.Filter(test))
         {
-            longestSuiteNameLength = Widen(longestSuiteNameLength, test->m_details.suiteName);
-            longestTestNameLength = Widen(longestTestNameLength, GetDisplayedTestName(test->m_details));
+            longestSuiteNameLength = WidenColumn(longestSuiteNameLength, test->m_details.suiteName);
+            longestTestNameLength = WidenColumn(longestTestNameLength, GetDisplayedTestName(test->m_details));
         }
     }
 

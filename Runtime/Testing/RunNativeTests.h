@@ -16,7 +16,8 @@ class TestList;
 ///
 /// The filter ignores ASCII case; TestFilter says which names it selects. An empty filter selects all. On the
 /// command line that SetCommandLine was given, the switch "automated" chooses status lines for programs
-/// instead of lines for people, and "dontReportPerformanceData" is passed on to the reporter of those.
+/// instead of lines for people, and "dontReportPerformanceData" clears reportPerformanceData of their
+/// reporter.
 int RunNativeTests(const core::string& filter);
 
 /// The same for the categories that begin with categoryFilter; an empty one selects all.
@@ -28,10 +29,10 @@ int RunNativeTests(const core::string& categoryFilter, const core::string& nameF
 /// installed.
 int RunNativeTests(TestFilter& filter);
 
-/// The same for another list of tests than that of the process.
+/// The same for a list of tests other than that of the process.
 int RunNativeTests(TestFilter& filter, UnitTest::TestList& tests);
 
-/// Keeps what a test body prints from the console: refuses every message while the reporter of the current
+/// Keeps the output of test bodies off the console: refuses every message while the reporter of the current
 /// run has a test in progress, and accepts all others, among them the reporter's own. A mutex serialises its
 /// callers.
 bool LogEntryHandlerForTests(LogType type, const char* format, std::va_list arguments);

@@ -71,8 +71,8 @@ void SetReason(DisabledTestInfo& info, const TestAttribute& attribute)
 }
 
 /// Describes why a test is ignored. If attributes of several types give a reason, the highest type counts.
-/// Only the first attribute of each type gives one, so a condition that holds after one that does not makes
-/// the test ignored without a reason. That is intentional.
+/// Only the first attribute of each type gives one: if the first condition does not hold but a later one
+/// does, the test is ignored without a reason. That is intentional.
 DisabledTestInfo DescribeIgnored(const TestDetails& details)
 {
     DisabledTestInfo info;
@@ -164,7 +164,7 @@ void NoCategoryTest::RunImpl() const
 
 void AddNoCategoryTests(UnitTest::TestList& tests, const TestFilter& filter)
 {
-    static std::deque<NoCategoryTest> substitutes; // which the list refers to, also in later runs
+    static std::deque<NoCategoryTest> substitutes; // the list points to them, even in later runs
     NoCategoryTestCollector collector{filter, {}};
     tests.ForEach(collector);
     for (const TestDetails& details : collector.collected)

@@ -3,8 +3,8 @@
 #include <cstdarg>
 #include <cstdio>
 
-// The program's console: one stream that all of the runtime prints to, with a handler that sees every message
-// first. For use by one thread.
+// The program's console: one stream that all of the runtime prints to, and a handler that is called with
+// every message first. For use by one thread.
 
 enum class LogType
 {
@@ -13,7 +13,7 @@ enum class LogType
     Console = 5 ///< printed by printf_console
 };
 
-/// Sees a message before it is printed; returns whether to print it.
+/// Is called with a message before it is printed; returns whether to print it.
 using LogEntryHandler = bool (*)(LogType type, const char* format, std::va_list arguments);
 
 /// Replaces the handler; null accepts every message.

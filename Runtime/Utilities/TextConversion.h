@@ -4,7 +4,7 @@
 
 #include <string_view>
 
-// New texts from old ones, and comparisons that ignore case. Only the ASCII letters have a case here; all
+// Conversions of text, and comparisons that ignore case. Only the ASCII letters have a case here; all
 // other bytes stand for themselves.
 
 /// Returns what printf would print.

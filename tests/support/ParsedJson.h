@@ -5,7 +5,7 @@
 #include <stdexcept>
 #include <string>
 
-/// Returns the document of a JSON text, which a test holds to be valid.
+/// Returns the document of a JSON text, which must be valid.
 inline rapidjson::Document ParsedJson(const std::string& json)
 {
     rapidjson::Document document;

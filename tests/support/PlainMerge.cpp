@@ -14,7 +14,7 @@ void Raise(Value& number, int offset, rapidjson::SizeType count)
 {
     if (number.GetInt() < 0 || number.GetUint() >= count)
     {
-        std::abort(); // the check let a number through that is out of bounds
+        std::abort(); // the check accepted a number that is out of bounds
     }
     number = number.GetInt() + offset;
 }

@@ -2,8 +2,8 @@
 
 #include <rapidjson/document.h>
 
-// The merges as the formats word them, for the real ones to be held against: everything is searched for from
-// the first on, every value copied. For documents that passed their structure check.
+// The merges as the formats describe them, to compare the real ones with: every search is linear, and every
+// value is copied. For documents that passed their structure check.
 
 /// Merges search indexes.
 class PlainIndexMerge

@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-/// What became of a process.
+/// How a process ended, and what it printed.
 struct ProgramResult
 {
     int status; ///< exit status, or minus the number of the signal that ended it
@@ -13,7 +13,7 @@ struct ProgramResult
     std::string standardError;
 };
 
-/// Runs a program, found on the search path unless it has a slash, to its end.
+/// Runs a program to its end. It is found on the search path unless its name has a slash.
 ProgramResult RunProgram(const std::string& program, const std::vector<std::string>& arguments);
 
 /// Runs the built pagemeld to its end, with the directory for @ in its arguments.

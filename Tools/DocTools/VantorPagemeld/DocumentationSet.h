@@ -6,7 +6,7 @@
 /// Combines one documentation set, "Manual" or "ScriptReference", of all module roots.
 ///
 /// Reads docdata/index.json and docdata/toc.json of every module, and writes the merged search index and
-/// table of contents into every module's docdata directory, as JSON and as scripts: also into those whose own
+/// table of contents into every module's docdata directory, as JSON and as scripts: even into those whose own
 /// files were skipped. Paths are used as they are. Each output is written under a temporary name and renamed
 /// into place only if it counts as written; a failed rename is not reported.
 ///

@@ -43,8 +43,8 @@ public:
                                      const char* outputPath) = 0;
 
     /// Reads the file of that name below every module path, and merges those that can be read and are sound.
-    /// These take the module indices 0, 1, 2, ... in list order; the others are skipped, and their readers
-    /// report why.
+    /// These take the module indices 0, 1, 2, ... in list order. The others are skipped:
+    /// TryGetJsonDocFromFile and VerifyJSONStructure report why.
     ///
     /// Returns whether any module was merged. To be called once.
     bool CombineJson(const std::list<std::string>& modulePaths, const std::string& fileName);
@@ -56,7 +56,7 @@ public:
     /// paths.
     [[nodiscard]] std::string PrefixLines(const char* modulePath) const;
 
-    /// Writes PrefixLines to the stream. Returns false when the stream took less.
+    /// Writes PrefixLines to the stream. Returns false if not all was written.
     bool OutputPrefixVars(const char* modulePath, std::FILE* stream) const;
 
 protected:
@@ -66,7 +66,7 @@ protected:
     bool InitializeCombinedDocument();
 
     /// Returns whether CombineJson has merged another document before the one that it merges now. Nothing has
-    /// changed combinedDocument since, so look-up tables of the last merge are still right.
+    /// changed combinedDocument since, so look-up tables of the last merge are still valid.
     [[nodiscard]] bool ContinuesMerging() const { return m_continuesMerging; }
 
     std::map<int, std::string> modulePathTable;

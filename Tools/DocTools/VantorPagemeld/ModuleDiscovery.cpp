@@ -23,8 +23,8 @@ bool IsModuleRoot(const std::string& path)
     return HasDocdata(path, "Manual");
 }
 
-/// Tells of a hidden or linked entry that leads to a module.
-void TellOfSkipped(const std::string& path, const char* name, const PassedOverHandler& onPassedOver)
+/// Reports a hidden or linked entry that leads to a module.
+void ReportPassedOver(const std::string& path, const char* name, const PassedOverHandler& onPassedOver)
 {
     const std::string_view entry = name;
     if (onPassedOver && entry != "." && entry != ".." && IsModuleRoot(path))
@@ -48,7 +48,7 @@ void FindModules(const std::string& directory, std::list<std::string>& moduleRoo
         const std::string path = directory + "/" + entry->d_name;
         if (entry->d_name[0] == '.' || !IsDirectory(*entry, path))
         {
-            TellOfSkipped(path, entry->d_name, onPassedOver);
+            ReportPassedOver(path, entry->d_name, onPassedOver);
             continue;
         }
         if (IsModuleRoot(path))

@@ -8,8 +8,8 @@
 /// Manual/docdata.
 ///
 /// Walks depth first, siblings in the byte order of their names, and does not look inside a module. The
-/// directory itself is no candidate. Hidden directories and symbolic links are passed over, and what can't be
-/// listed counts as empty; silent.
+/// directory itself is not a candidate. Hidden directories and symbolic links are passed over, and what can't
+/// be listed counts as empty. Prints nothing.
 void GetPathsOfDocs(const std::string& directory, std::list<std::string>& moduleRoots);
 
 /// Why a directory that looks like a module is passed over.
@@ -22,7 +22,7 @@ enum class PassedOver
 
 using PassedOverHandler = std::function<void(const std::string& path, PassedOver reason)>;
 
-/// The same as GetPathsOfDocs, and tells what looks like a module and is not taken, where the walk comes by.
-/// That takes further questions to the file system.
+/// The same as GetPathsOfDocs. Also calls onPassedOver, unless it is empty, for what the walk passes over
+/// although it looks like a module, which takes more file system calls.
 void FindModules(const std::string& directory, std::list<std::string>& moduleRoots,
                  const PassedOverHandler& onPassedOver);

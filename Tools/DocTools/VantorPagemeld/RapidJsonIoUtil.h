@@ -15,10 +15,11 @@ namespace RapidJsonIoUtil
 /// byte is not seen.
 ///
 /// Returns true when the file was read and parsed. Otherwise one message says why: the document is then left
-/// as it was if the file could not be read, and null with a parse error if the text is no JSON.
+/// as it was if the file could not be read, and null with a parse error if the text is not JSON.
 bool TryGetJsonDocFromFile(const char* path, rapidjson::Document& document);
 
-/// Parses NUL-terminated JSON text into document, as ParseJson does. Returns whether it was accepted; silent.
+/// Parses NUL-terminated JSON text into document, as ParseJson does. Returns whether it was accepted. Prints
+/// nothing.
 bool TryGetJsonDocFromString(const char* json, rapidjson::Document& document);
 
 /// Returns the value as compact JSON, up to the first NUL.

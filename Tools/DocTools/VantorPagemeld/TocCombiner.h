@@ -45,7 +45,8 @@ public:
     /// written.
     void AddPlatformPrefixToLinks(rapidjson::Value& value, int moduleIndex);
 
-    /// Writes text in double quotes, its own escaped, and then extra. Returns false if the write fails.
+    /// Writes text in double quotes, with those inside it escaped, and then extra. Returns false if the write
+    /// fails.
     bool WriteQuotedStringPlusExtra(std::FILE* file, const char* text, const char* extra, int indent,
                                     bool newLine);
 

@@ -33,7 +33,7 @@ constexpr StructureFault kTermNotArray = {387, "Value in searchIndex is not arra
 constexpr StructureFault kPostingNotInt = {396, "Value in index is not int"};
 constexpr StructureFault kPostingOutOfBounds = {401, "Value in index is out of bounds"};
 
-/// The size that a missing array is given, so that numbers that refer to it are no further faults.
+/// The size that a missing array is given, so that numbers that refer to it are not reported as well.
 constexpr std::int64_t kUnbounded = INT64_MAX;
 
 bool IsPair(const Value& entry)

@@ -13,8 +13,8 @@ using ChildCheck = std::function<bool(const rapidjson::Value& child, const JsonP
 /// checkChild.
 ///
 /// Hands every fault of the node itself to onFault: one per member that is missing (at the node) or of the
-/// wrong type (at the member), or a single one for a node that is no object. Returns false as soon as onFault
-/// or checkChild does. Changes nothing.
+/// wrong type (at the member), or a single one for a node that is not an object. Returns false as soon as
+/// onFault or checkChild does. Changes nothing.
 bool CheckTocNode(const rapidjson::Value& node, const JsonPointer& pointer, const FaultHandler& onFault,
                   const ChildCheck& checkChild);
 

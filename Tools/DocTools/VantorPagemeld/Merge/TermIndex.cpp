@@ -17,7 +17,7 @@ LargeObjectPool::Allocator& LargeObjectPool::AllocatorFor(rapidjson::SizeType me
     }
     if (m_allocator.Capacity() == 0)
     {
-        // A pool without memory crashes when it is to grow what another one allocated.
+        // A pool without memory crashes when it is asked to grow what another one allocated.
         (void)m_allocator.Malloc(1);
     }
     return m_allocator;

@@ -21,7 +21,7 @@ int OpenDescriptor(const char* path)
     const int descriptor = ::open(path, O_RDONLY | O_CLOEXEC | O_NONBLOCK);
     if (descriptor < 0 && errno == EWOULDBLOCK)
     {
-        // Another process holds a lease on this regular file: an open that waits asks for it back.
+        // Another process holds a lease on this regular file: a blocking open asks for it back.
         return ::open(path, O_RDONLY | O_CLOEXEC);
     }
     return descriptor;

@@ -7,10 +7,10 @@
 #include <cmath>
 
 // The library parses into a document without any limit on nesting: a recursion over what it accepted, its own
-// included, could overflow the stack. So its reader hands the events to a builder that counts levels and
-// refuses what no writer could write, before the document sees them. That costs two comparisons for an array
-// or object and one for a string or double. A text that is refused is parsed twice, since only a parse of
-// its own sets the error of a document.
+// included, could overflow the stack. So its reader hands the events to a builder, which counts levels,
+// refuses what no writer could write, and passes the rest on to the document. That costs two comparisons for
+// an array or object and one for a string or double. A text that is refused is parsed twice, since only a
+// document's own parse sets its error.
 
 namespace
 {

@@ -6,8 +6,8 @@
 
 // The JSON library counts the decimals of a number in 32 bits and adds its exponent to them: the number
 // 0.00000000001e-2147483639 overflows the sum, and the library then reads outside a table. A text that can do
-// so is changed before the library sees it. Nearly none can: one search for "e-" and a comparison of sizes
-// are all that other texts cost.
+// so is changed before the library sees it. Nearly none can: other texts cost only one search for
+// "-" and a comparison of sizes.
 
 namespace
 {
@@ -69,7 +69,7 @@ std::size_t FindStringEnd(const std::string& text, std::size_t start)
     return std::min(i, text.size());
 }
 
-/// Makes an exponent of count digits one of at most nine that count, with zeros before them.
+/// Makes an exponent of count digits one of at most nine significant digits, with zeros before them.
 void CutExponent(std::string& text, std::size_t start, std::size_t count)
 {
     if (count <= kMaxExponentDigits)

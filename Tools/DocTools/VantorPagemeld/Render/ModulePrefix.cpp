@@ -6,7 +6,7 @@
 namespace
 {
 
-/// Returns where the paths part: the position of a '/' in toModule, or its start.
+/// Returns where the paths diverge: the position of a '/' in toModule, or its start.
 std::size_t FindSplit(std::string_view fromModule, std::string_view toModule)
 {
     const auto difference =

@@ -13,7 +13,7 @@
 /// fromModule after the common start, then the rest of toModule.
 ///
 /// Works on bytes; neither splits into components nor normalises nor escapes. toModule ends in '/',
-/// fromModule does not. Two results differ from what the directories ask for, and pages rely on both: a
+/// fromModule does not. Two results differ from the true relative path, and pages rely on both: a
 /// module whose name begins with a sibling's gets a shorter climb to that sibling, and relative paths without
 /// a common directory climb one level less.
 std::string RelativePrefix(std::string_view fromModule, std::string_view toModule);

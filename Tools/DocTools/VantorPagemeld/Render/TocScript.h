@@ -24,7 +24,7 @@ struct TocScriptLayout
 void AppendTocValue(TextBuffer& script, const rapidjson::Value& value, int indent,
                     const TocScriptLayout& layout);
 
-/// Appends text in double quotes, its own escaped, then extra; spaces before and a "\n" after it as layout
-/// and newLine say.
+/// Appends text in double quotes, with those inside it escaped, then extra; spaces before and a "\n" after it
+/// as layout and newLine say.
 void AppendTocString(TextBuffer& script, const char* text, const char* extra, int indent, bool newLine,
                      const TocScriptLayout& layout);

@@ -1,6 +1,6 @@
 #pragma once
 
-/// Fits the heap to a run that fills it with a few large documents and texts and then ends. To be called
+/// Tunes the heap for a run that fills it with a few large documents and texts and then ends. To be called
 /// once, before those.
 ///
 /// All memory comes from one region that only grows, and the first gigabyte of it lies in huge pages where

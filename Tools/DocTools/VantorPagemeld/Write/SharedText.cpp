@@ -49,8 +49,8 @@ bool SharedText::CloneTo(std::FILE*) const
 
 bool WriteText(std::FILE* stream, std::string_view text)
 {
-    // One write of all makes the kernel look for long runs of fresh memory, which takes ext4 two to four
-    // times as long; blocks of 64 KB cost more calls.
+    // A single write of everything makes the kernel look for long runs of fresh memory, which takes ext4 two
+    // to four times as long; blocks of 64 KB cost more calls.
     constexpr std::size_t kBlockSize = std::size_t{1} << 20;
     for (; !text.empty(); text.remove_prefix(std::min(kBlockSize, text.size())))
     {

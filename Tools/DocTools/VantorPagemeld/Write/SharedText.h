@@ -29,5 +29,5 @@ private:
     ScopedFile m_original; // the first file that holds the text, all of it and nothing else
 };
 
-/// Writes all of text to the stream, block by block. Returns false when the stream took less.
+/// Writes all of text to the stream, block by block. Returns false if not all was written.
 bool WriteText(std::FILE* stream, std::string_view text);
