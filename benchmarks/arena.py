@@ -48,10 +48,10 @@ def blocks_of(files):
 
 
 class Arena:
-    """A corpus, made below folder, with finished outputs to be copied and to be compared with."""
+    """A corpus, made below directory, with finished outputs to copy and to compare with."""
 
-    def __init__(self, name, folder, tool):
-        self._corpus = Path(folder) / name
+    def __init__(self, name, directory, tool):
+        self._corpus = Path(directory) / name
         corpus.make(name, self._corpus)
         roots = sorted(map(str, self._corpus.glob("m*")))
         self._commands = {
@@ -86,7 +86,7 @@ class Arena:
             pass
 
     def require_outputs(self, program):
-        """Ends the benchmark if an output is missing or too short, as on a full disk: the run was no run then."""
+        """Ends the benchmark if an output is missing or too short, as on a full disk: such a run does not count."""
         for output in self._outputs(program):
             ready = self._corpus / "ready" / output.parts[-3] / output.name
             if not output.exists() or output.stat().st_size < ready.stat().st_size:
@@ -111,7 +111,7 @@ class Arena:
 
 
 class Rounds:
-    """The costs of several contenders, measured in turn, round by round, so that a slow moment hits all alike."""
+    """The costs of several contenders, measured in turn, round by round, so that a slow moment affects all alike."""
 
     def __init__(self, contenders, count):
         """Contenders are pairs of arena and program, by name."""

@@ -3,8 +3,8 @@
 A corpus is a directory of module roots m000, m001, ... All randomness comes from random.Random(seed).random(),
 whose sequence the language guarantees.
 
-No term is a number: an object of JavaScript would put it before the others, and the Node alternative could not
-keep the order of terms.
+No term is a number: a JavaScript object would put it before the others, and the Node alternative could not keep the
+order of terms.
 """
 
 import json
@@ -21,8 +21,8 @@ OWN_WORD_SHARE = 0.15
 INFOS_PER_PAGE = 2
 WORDS_PER_INFO = 16
 GROUPS = 12  # on the first level, each with as many on the second
-FLAT_SHARE = 0.5  # of the pages stand in the flat group
-SHARED_PAGE_SHARE = 0.1  # of the pages there stand in every module's
+FLAT_SHARE = 0.5  # of the pages are in the flat group
+SHARED_PAGE_SHARE = 0.1  # of the pages there are in every module's
 
 
 # The kinds of corpora: they yield module, documentation sets, search index and table of contents.

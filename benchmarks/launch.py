@@ -1,6 +1,6 @@
 """Runs a command, its output thrown away, and prints exit status, seconds (wall, user, system) and peak memory in bytes.
 
-A program of its own, because whatever is started begins with the peak memory of who starts it: this one is small.
+A separate program, because a process starts with the peak memory of its parent, and this one is small.
 """
 
 import os

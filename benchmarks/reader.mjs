@@ -23,7 +23,8 @@ function random() { // the same numbers everywhere
 const syllables = "ba ce di fo gu ha je ki lo mu na pe ri so tu va we xi yo zu an er in or un st".split(" ");
 const count = (length, make) => Array.from({ length }, (_, i) => make(i));
 const words = makeWords();
-const drawWord = () => words[Math.floor(words.length ** random())]; // one of rank r, 1 / r times as often as the first
+// The word of rank r comes 1 / r times as often as the first.
+const drawWord = () => words[Math.floor(words.length ** random())];
 
 function makeWords() {
     const made = new Set();
@@ -70,16 +71,17 @@ if (other) {
 
 // Combines modules and lays pages without a script and with each into one of them.
 function makeSite(name, makeIndex) {
-    const folders = count(moduleCount, (module) => path.join(root, name, `module${module}`));
-    folders.forEach((folder, module) => {
-        mkdirSync(path.join(folder, "ScriptReference/docdata"), { recursive: true });
-        mkdirSync(path.join(folder, "Manual/docdata"), { recursive: true });
-        const write = (file, value) => writeFileSync(path.join(folder, "Manual/docdata", file), JSON.stringify(value));
+    const directories = count(moduleCount, (module) => path.join(root, name, `module${module}`));
+    directories.forEach((directory, module) => {
+        mkdirSync(path.join(directory, "ScriptReference/docdata"), { recursive: true });
+        mkdirSync(path.join(directory, "Manual/docdata"), { recursive: true });
+        const write = (file, value) =>
+            writeFileSync(path.join(directory, "Manual/docdata", file), JSON.stringify(value));
         write("index.json", makeIndex(module));
         write("toc.json", makeToc(module));
     });
-    execFileSync(pagemeld, folders, { stdio: "ignore" });
-    const set = path.join(folders[0], "Manual");
+    execFileSync(pagemeld, directories, { stdio: "ignore" });
+    const set = path.join(directories[0], "Manual");
     cpSync(web, path.join(set, "docdata"), { recursive: true });
     other && cpSync(other, path.join(set, "other.js"));
     mkdirSync(path.join(set, "d1"));
@@ -105,7 +107,7 @@ const timed = (page, code) => page.evaluate(`(() => {
     return performance.now() - start;
 })()`);
 
-// When the page has what it shows at first, in milliseconds since it was asked for.
+// When the page first shows its contents, in milliseconds since it was asked for.
 const whenShown = (kind) => `new Promise((done) => {
     const check = () => ${isShown[kind]} && done(performance.now());
     new MutationObserver(check).observe(document, { childList: true, subtree: true });

@@ -9,7 +9,7 @@ search index and the table of contents of each, merges them, and writes the
 result into every module as JSON and as scripts, so that each page can search
 and browse all modules, from a web server or from a directory on disk.
 
-A checker tells beforehand what would go wrong and where. A CMake function runs
+A checker reports beforehand what would go wrong and where. A CMake function runs
 both in a build.")
 set(CPACK_STRIP_FILES ON)
 set(CPACK_PRE_BUILD_SCRIPTS ${PROJECT_SOURCE_DIR}/packaging/prepare.cmake)

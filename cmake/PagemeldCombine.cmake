@@ -11,7 +11,7 @@ Adds a target that combines documentation modules::
         [COMMENT <text>])
 
 It comes with ``find_package(Pagemeld)``, or with this project by ``add_subdirectory`` or ``FetchContent``. All of these
-define the targets ``Pagemeld::pagemeld`` and ``Pagemeld::pagemeld-check``, too. Ninja and Makefiles are supported.
+also define the targets ``Pagemeld::pagemeld`` and ``Pagemeld::pagemeld-check``. Ninja and Makefiles are supported.
 
 ``ROOTS``
   The module roots, in the order in which they are merged. Relative ones start at the current source directory. The
@@ -101,8 +101,8 @@ function(_pagemeld_list_outputs)
     set(outputs ${outputs} PARENT_SCOPE)
 endfunction()
 
-# Sets target_files to the files by which a build notices that a target in DEPENDS did something: CMake itself makes
-# only sure that it is built first.
+# Sets target_files to the files by which a build notices that a target in DEPENDS did something: CMake itself only
+# makes sure that it is built first.
 function(_pagemeld_list_target_files)
     set(target_files)
     foreach(dependency IN LISTS arg_DEPENDS)

@@ -1,5 +1,5 @@
-# The part of pagemeld_combine that must wait until the modules are made: copies the page script into them, and tells
-# the build their input files, in a dependency file.
+# The part of pagemeld_combine that must wait until the modules are made: copies the page script into them, and lists
+# their input files for the build, in a dependency file.
 #
 #     cmake -D arguments=FILE -P PagemeldModules.cmake
 

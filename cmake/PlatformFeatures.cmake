@@ -1,5 +1,5 @@
-# What a platform may lack. Each is looked for, and the program works without it; where it is found, the sources
-# in System/ and Write/ use it.
+# What a platform may lack. Each feature is looked for. Where it is found, the sources in System/ and Write/ use it; the
+# program works without it.
 
 include(CheckCXXSymbolExists)
 include(CheckLinkerFlag)

@@ -1,16 +1,16 @@
 #!/usr/bin/env python3
 """Makes docdata/index.json and docdata/toc.json of documentation sets from their HTML pages.
 
-The search index has every page below a set folder, with each heading and the first paragraph after it. The contents
-have an entry for the module, its start page, and below it the folders with their pages; or, with --toc, the links of
-a list that the documentation has: a page FILE in each set folder, such as Doxygen's annotated.html, Sphinx's
-contents.html or javadoc's overview-tree.html. Pages that the list passes over are found by the search alone.
+The search index has every page below a set directory, with each heading and the first paragraph after it. The contents
+have an entry for the module, its start page, and below it the directories with their pages; or, with --toc, the links
+of a list that the documentation has: a page FILE in each set directory, such as Doxygen's annotated.html, Sphinx's
+contents.html or javadoc's overview-tree.html. Pages that the list leaves out are found only by the search.
 
 Groups without a page at the top stand beside the module's entry, so that all modules with such a group share it. All
-modules of a set need the same root; by default it has the name of the set folder and leads to index.html.
+modules of a set need the same root; by default it has the name of the set directory and leads to index.html.
 
-Paths are as on disk, nothing is percent-encoded; after a "#" in a link of the contents comes the place in the page.
-Where a page has a <main>, what comes before it is passed over. The same pages always give the same files.
+Paths are as on disk, nothing is percent-encoded; a "#" in a link of the contents begins the fragment. If a page has a
+<main>, what comes before it is skipped. The same pages always give the same files.
 """
 import argparse
 import collections
@@ -24,11 +24,11 @@ from html.parser import HTMLParser
 from urllib.parse import unquote
 
 COMMON = dict.fromkeys("a an and are as at be by for from has in is it its of on one or that the to with".split(), 1)
-# Queries are split into runs of letters, marks, digits and "_". To \w belong all of these but the marks.
+# Queries are split into runs of letters, marks, digits and "_". \w matches all of these except the marks.
 MARKS = "".join(c for c in map(chr, range(0x300, 0xE0200)) if unicodedata.category(c)[0] == "M")
 WORD = re.compile(f"[\\w{MARKS}]+")
 
-# The scripts escape the quotes of titles and nothing else, in paths and links not even these; "#" would end a path.
+# The scripts escape only the quotes of titles, and nothing in paths and links. "#" would end a path.
 LOOK_ALIKES = {ord("\\"): "\u2216", 0x7F: "\u2421", **{code: 0x2400 + code for code in range(0x20)}}
 UNWRITABLE = re.compile('["\\\\#\0-\x1f\x7f\ud800-\udfff]')
 SCHEME = re.compile("[a-zA-Z][a-zA-Z0-9+.-]*:")
@@ -37,9 +37,9 @@ HEADINGS = {"h1", "h2", "h3", "h4", "h5", "h6"}
 LISTS = {"ul", "ol"}
 BLOCKS = HEADINGS | LISTS | set("blockquote body dd div dl dt hr li main p pre section table td th title tr".split())
 UNREAD_TAGS = {"nav", "noscript", "script", "style", "template"}
-UNREAD_PARTS = {("a", "headerlink"),  # of Sphinx, the others of Doxygen
+UNREAD_PARTS = {("a", "headerlink"),  # from Sphinx; the others from Doxygen
                 ("span", "permalink"), ("span", "arrow"), ("span", "icon"), ("ul", "tablist"), ("div", "navpath")}
-FOLDER_PAGES = ("index.html", "index.htm", "package-summary.html")
+DIRECTORY_PAGES = ("index.html", "index.htm", "package-summary.html")
 
 
 def say(message):
@@ -58,7 +58,7 @@ def make_title(text, place):
 
 
 def make_link(path, fragment=""):
-    """Foo:Bar.html would be an address; ./Foo:Bar.html is a path. A fragment that can't be written is left off."""
+    """Foo:Bar.html would be an address; ./Foo:Bar.html is a path. A fragment that can't be written is left out."""
     return ("./" if SCHEME.match(path) else "") + path + (
         "#" + fragment if fragment and not UNWRITABLE.search(fragment) else "")
 
@@ -71,15 +71,15 @@ def decode(data, place):
     except UnicodeDecodeError:
         declared = re.search(rb"""(?:charset|encoding)\s*=\s*["']?\s*([\w.:-]+)""", data[:4096])
     name = declared[1].decode("ascii", "replace").lower() if declared else "no encoding"
-    try:  # as browsers do, which take ISO 8859-1 for its superset
+    try:  # as browsers do, which read ISO 8859-1 as windows-1252
         return data.decode("cp1252" if name == "iso-8859-1" else name, "replace")
     except (LookupError, ValueError):
-        warn(f"{place}: is no UTF-8 and declares {name}: read as windows-1252")
+        warn(f"{place}: is not UTF-8 and declares {name}: read as windows-1252")
         return data.decode("cp1252", "replace")
 
 
 class Page(HTMLParser):
-    """What a page says of itself: its title, its main heading, its texts (each heading with the first paragraph after
+    """What is read from a page: its title, its main heading, its texts (each heading with the first paragraph after
     it) and its list items (depth, address or None, text, where in the text the link begins). Items are those of lists,
     the rows of Doxygen's tables and the first cells of javadoc's."""
 
@@ -88,7 +88,7 @@ class Page(HTMLParser):
         self.place = place
         self.title = self.heading = ""
         self.texts, self.items = [["", ""]], []
-        self.unread = None  # the tag that is passed over, and how often it is open
+        self.unread = None  # the tag that is skipped, and how many of it are open
         self.block, self.data = None, ""
         self.item, self.list_depth = None, 0
         try:
@@ -166,13 +166,13 @@ class Page(HTMLParser):
             self.texts[-1][1] = self.texts[-1][1] or text
 
 
-def read_pages(folder):
-    """Returns the pages by path, each folder's own page first and its subfolders last, and the paths of all files."""
+def read_pages(directory):
+    """Returns the pages by path, a directory's own first and its subdirectories last, and the paths of all files."""
     pages, files = {}, set()
-    for place, folders, names in os.walk(folder):
-        folders[:] = sorted(name for name in folders if (place, name) != (folder, "docdata"))
-        for name in sorted(names, key=lambda name: (name not in FOLDER_PAGES, name)):
-            path = os.path.relpath(os.path.join(place, name), folder)
+    for place, directories, names in os.walk(directory):
+        directories[:] = sorted(name for name in directories if (place, name) != (directory, "docdata"))
+        for name in sorted(names, key=lambda name: (name not in DIRECTORY_PAGES, name)):
+            path = os.path.relpath(os.path.join(place, name), directory)
             files.add(path)
             if not name.lower().endswith((".html", ".htm", ".xhtml")):
                 continue
@@ -189,7 +189,7 @@ def read_pages(folder):
 
 
 def choose_titles(pages):
-    """A <title> that several pages have says nothing: then the main heading is better."""
+    """A <title> that several pages share does not identify a page: then the main heading is better."""
     uses = collections.Counter(page.title for page in pages.values())
     for path, page in pages.items():
         title = page.title if page.title and uses[page.title] == 1 else page.heading or page.title
@@ -202,7 +202,7 @@ def make_index(pages):
         texts = [" \u2013 ".join(part for part in text if part and part != page.title) for text in page.texts]
         extra = page.title
         for text in list(filter(None, texts)) or [page.title]:
-            # A member __proto__ of an object literal is none.
+            # In an object literal, __proto__ sets the prototype and adds no member.
             words = set(WORD.findall(f"{extra} {text}".lower())) - COMMON.keys() - {"__proto__"}
             extra = ""
             for word in words:
@@ -212,14 +212,14 @@ def make_index(pages):
             "info": info, "common": COMMON, "searchIndex": dict(sorted(terms.items()))}
 
 
-def list_folders(pages, start):
-    """Returns folders and pages as rows (depth, link or "null", title); a folder leads to its own page."""
+def list_directories(pages, start):
+    """Returns directories and pages as rows (depth, link or "null", title); a directory leads to its own page."""
     rows, last_parents = [], []
     for path, page in pages.items():
         *parents, name = path.split("/")
         rows += [(depth, "null", parent) for depth, parent in enumerate(parents, 1)
                  if parents[:depth] != last_parents[:depth]]
-        if parents != last_parents and name in FOLDER_PAGES:
+        if parents != last_parents and name in DIRECTORY_PAGES:
             rows[-1] = (len(parents), make_link(path), page.title)
         elif path != start:
             rows.append((len(parents) + 1, make_link(path), page.title))
@@ -256,7 +256,7 @@ def list_links(pages, files, base):
 
 
 def take_nodes(rows, above):
-    """Takes the next rows that are deeper than above, last row next; those with nothing to open fall away."""
+    """Takes rows from the end of the list while they are deeper than above; drops those without a link or children."""
     nodes = []
     while rows and rows[-1][0] > above:
         depth, link, title = rows.pop()
@@ -272,43 +272,43 @@ def make_contents(root, module, rows):
     return {**root, "children": [node for node in nodes if node["link"] == "null"] + [module]}
 
 
-def make_docdata(folder, root, list_page):
+def make_docdata(directory, root, list_page):
     """Returns the values of both files. The root is its link and title."""
-    pages, files = read_pages(folder)
-    module = {"link": "null", "title": make_title(os.path.basename(os.path.dirname(folder)), folder)}
+    pages, files = read_pages(directory)
+    module = {"link": "null", "title": make_title(os.path.basename(os.path.dirname(directory)), directory)}
     if root["link"] in pages:
         module = {"link": root["link"], "title": pages[root["link"]].title}
     else:
-        warn(f"{folder}: there is no page {root['link']}, where the root of the contents leads")
+        warn(f"{directory}: there is no page {root['link']}, where the root of the contents leads")
     if list_page in pages:
         rows = list_links(pages, files, list_page)
     else:
-        rows = list_folders(pages, root["link"])
+        rows = list_directories(pages, root["link"])
         if list_page:
-            warn(f"{folder}: there is no page {list_page}: the contents are made from the folders")
+            warn(f"{directory}: there is no page {list_page}: the contents are made from the directories")
     index = make_index(pages)
-    say(f"{folder}: {len(pages)} pages, {len(index['info'])} texts, {len(index['searchIndex'])} terms")
+    say(f"{directory}: {len(pages)} pages, {len(index['info'])} texts, {len(index['searchIndex'])} terms")
     return {"index.json": index, "toc.json": make_contents(root, module, rows)}
 
 
 def main():
     parser = argparse.ArgumentParser(description="Makes index.json and toc.json from HTML pages.")
-    parser.add_argument("--root-title", metavar="T", help="default: the name of the set folder")
+    parser.add_argument("--root-title", metavar="T", help="default: the name of the set directory")
     parser.add_argument("--root-link", metavar="L", default="index.html", help="default: %(default)s")
-    parser.add_argument("--toc", metavar="FILE", help="page in each set folder whose lists are the contents")
-    parser.add_argument("set_folders", metavar="SET_FOLDER", nargs="+")
+    parser.add_argument("--toc", metavar="FILE", help="page in each set directory whose lists are the contents")
+    parser.add_argument("set_directories", metavar="SET_DIRECTORY", nargs="+")
     options = parser.parse_args()
     if UNWRITABLE.search(options.root_link):
         parser.error("the scripts can't hold this root link")
-    for folder in options.set_folders:
-        if not os.path.isdir(folder):
-            parser.error(f"{folder} is no folder")
-    for folder in map(os.path.abspath, options.set_folders):
-        title = make_title(options.root_title or os.path.basename(folder), folder)
-        files = make_docdata(folder, {"link": options.root_link, "title": title}, options.toc)
-        os.makedirs(os.path.join(folder, "docdata"), exist_ok=True)
+    for directory in options.set_directories:
+        if not os.path.isdir(directory):
+            parser.error(f"{directory} is not a directory")
+    for directory in map(os.path.abspath, options.set_directories):
+        title = make_title(options.root_title or os.path.basename(directory), directory)
+        files = make_docdata(directory, {"link": options.root_link, "title": title}, options.toc)
+        os.makedirs(os.path.join(directory, "docdata"), exist_ok=True)
         for name, value in files.items():
-            with open(os.path.join(folder, "docdata", name), "w", encoding="utf-8", newline="\n") as file:
+            with open(os.path.join(directory, "docdata", name), "w", encoding="utf-8", newline="\n") as file:
                 file.write(json.dumps(value, ensure_ascii=False, indent=1) + "\n")
 
 

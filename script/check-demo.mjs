@@ -1,11 +1,10 @@
-// Checks the combined example modules as a browser would meet them.
+// Checks the combined example modules as a browser would load them.
 //
-//     node check-demo.mjs FOLDER MESSAGES FINDINGS
+//     node check-demo.mjs DIRECTORY MESSAGES FINDINGS
 //
-// FOLDER holds the modules, MESSAGES is the file with what pagemeld said, and FINDINGS the one with what
-// pagemeld-check said before. Both scripts of every module and
-// set are evaluated as classic scripts; every link must lead from that module's folder to a page with the
-// title that it promises. Ends with status 1 at the first fault.
+// DIRECTORY holds the modules, MESSAGES is the file with what pagemeld printed, and FINDINGS the one with what
+// pagemeld-check printed before. Both scripts of every module and set are evaluated as classic scripts; every link must
+// lead from that module's directory to a page with the title that the link has. Ends with status 1 at the first fault.
 
 import assert from "node:assert/strict";
 import { existsSync, readdirSync, readFileSync } from "node:fs";
@@ -16,30 +15,30 @@ const combined = ["acquire", "charts", "logbook"];
 const broken = "telemetry";
 const sharedGroups = { Manual: "Getting started", ScriptReference: "Classes" };
 
-const [folder, messagesFile, findingsFile] = process.argv.slice(2);
+const [directory, messagesFile, findingsFile] = process.argv.slice(2);
 
-function loadScripts(setFolder) {
+function loadScripts(setDirectory) {
     const globals = vm.createContext({});
     for (const name of ["global_toc.js", "global_index.js"]) {
-        const filename = path.join(setFolder, "docdata", name);
+        const filename = path.join(setDirectory, "docdata", name);
         vm.runInContext(readFileSync(filename, "utf8"), globals, { filename });
     }
     return globals;
 }
 
 // Returns the module that the link leads to.
-function checkLink(setFolder, link, title) {
-    const page = path.join(setFolder, link);
-    assert(existsSync(page), `${setFolder}: "${title}" leads to ${page}, which does not exist`);
+function checkLink(setDirectory, link, title) {
+    const page = path.join(setDirectory, link);
+    assert(existsSync(page), `${setDirectory}: "${title}" leads to ${page}, which does not exist`);
     assert(readFileSync(page, "utf8").includes(`<h1>${title}</h1>`), `${page} is not "${title}"`);
-    return path.relative(folder, page).split(path.sep)[0];
+    return path.relative(directory, page).split(path.sep)[0];
 }
 
 // Returns the modules that the nodes of a list, and everything below, lead to.
-function checkTocNodes(setFolder, nodes) {
+function checkTocNodes(setDirectory, nodes) {
     return (nodes ?? []).flatMap(({ link, title, children }) => [
-        ...(link === "null" ? [] : [checkLink(setFolder, link, title)]),
-        ...checkTocNodes(setFolder, children),
+        ...(link === "null" ? [] : [checkLink(setDirectory, link, title)]),
+        ...checkTocNodes(setDirectory, children),
     ]);
 }
 
@@ -47,34 +46,34 @@ function checkModules(found, where) {
     assert.deepEqual([...new Set(found)].sort(), combined, `modules in ${where}`);
 }
 
-function filesBelow(folder) {
-    return readdirSync(folder, { withFileTypes: true }).flatMap((entry) =>
-        entry.isDirectory() ? filesBelow(path.join(folder, entry.name)) : [path.join(folder, entry.name)]);
+function filesBelow(directory) {
+    return readdirSync(directory, { withFileTypes: true }).flatMap((entry) =>
+        entry.isDirectory() ? filesBelow(path.join(directory, entry.name)) : [path.join(directory, entry.name)]);
 }
 
 function checkSet(module, set) {
-    const setFolder = path.join(folder, module, set);
-    const { toc, pages, info, common, searchIndex } = loadScripts(setFolder);
+    const setDirectory = path.join(directory, module, set);
+    const { toc, pages, info, common, searchIndex } = loadScripts(setDirectory);
 
-    assert(existsSync(path.join(setFolder, toc.link)), `${setFolder}: the root's ${toc.link} does not exist`);
-    checkModules(checkTocNodes(setFolder, toc.children), `${setFolder}, contents`);
+    assert(existsSync(path.join(setDirectory, toc.link)), `${setDirectory}: the root's ${toc.link} does not exist`);
+    checkModules(checkTocNodes(setDirectory, toc.children), `${setDirectory}, contents`);
     const groups = toc.children.filter(({ title }) => title === sharedGroups[set]);
-    assert.equal(groups.length, 1, `${setFolder}: groups "${sharedGroups[set]}"`);
-    checkModules(checkTocNodes(setFolder, groups[0].children), `${setFolder}, "${sharedGroups[set]}"`);
+    assert.equal(groups.length, 1, `${setDirectory}: groups "${sharedGroups[set]}"`);
+    checkModules(checkTocNodes(setDirectory, groups[0].children), `${setDirectory}, "${sharedGroups[set]}"`);
 
-    checkModules(pages.map(([link, title]) => checkLink(setFolder, link, title)), `${setFolder}, pages`);
-    assert(info.length > 0 && info.every(([, page]) => page in pages), `${setFolder}: page numbers`);
+    checkModules(pages.map(([link, title]) => checkLink(setDirectory, link, title)), `${setDirectory}, pages`);
+    assert(info.length > 0 && info.every(([, page]) => page in pages), `${setDirectory}: page numbers`);
     const numbers = Object.values(searchIndex).flat();
-    assert.deepEqual(new Set(numbers), new Set(info.keys()), `${setFolder}: info numbers`);
-    assert(common.the === 1, `${setFolder}: common words`);
+    assert.deepEqual(new Set(numbers), new Set(info.keys()), `${setDirectory}: info numbers`);
+    assert(common.the === 1, `${setDirectory}: common words`);
     return pages.length;
 }
 
 // The checker must find the broken module's two faults in each set, and nothing else.
 function checkFindings(lines) {
     const faults = Object.keys(sharedGroups).flatMap((set) => [
-        `${folder}/${broken}/${set}/docdata/index.json:6:43: error: [not-json]`,
-        `${folder}/${broken}/${set}/docdata/toc.json: error: [unreadable]`,
+        `${directory}/${broken}/${set}/docdata/index.json:6:43: error: [not-json]`,
+        `${directory}/${broken}/${set}/docdata/toc.json: error: [unreadable]`,
     ]);
     const missing = Object.keys(sharedGroups).map((set) =>
         `from the search of ${set}: ${broken}; from its contents: ${broken}`);
@@ -85,12 +84,12 @@ function checkFindings(lines) {
 checkFindings(readFileSync(findingsFile, "utf8").split("\n"));
 const messages = readFileSync(messagesFile, "utf8");
 for (const set of Object.keys(sharedGroups)) {
-    const index = path.join(folder, broken, set, "docdata/index.json");
+    const index = path.join(directory, broken, set, "docdata/index.json");
     const said = `Failed to parse JSON file ${index}, error at offset: `;
-    assert(messages.includes(said), `no word about ${index}`);
+    assert(messages.includes(said), `no message about ${index}`);
     const pageCounts = [...combined, broken].map((module) => checkSet(module, set));
-    console.log(`${set}: every link holds, from each of ${pageCounts.length} modules to ` +
+    console.log(`${set}: every link works, from each of ${pageCounts.length} modules to ` +
         `${pageCounts[0]} pages of ${combined.join(", ")}`);
 }
-const strays = filesBelow(folder).filter((name) => name.endsWith(".tmp"));
+const strays = filesBelow(directory).filter((name) => name.endsWith(".tmp"));
 assert.deepEqual(strays, [], "temporary files that stayed");

@@ -1,4 +1,4 @@
-// Sums up what gcov tells of every object file, one line of JSON each on standard input.
+// Sums up what gcov reports for every object file, one line of JSON each on standard input.
 import { createInterface } from 'node:readline';
 
 const OWN = /^(Tools|Runtime|Modules)\//;
@@ -7,7 +7,7 @@ const LEAST = { lines: 95, branches: 90 };
 const root = process.argv[2] + '/';
 const files = new Map(); // of { lines, branches }, each of counts by place
 
-// Code in headers is in several objects: what one of them reached is reached.
+// Code in headers is in several objects: what is reached in one of them counts as reached.
 function add(counts, place, count) {
     counts.set(place, (counts.get(place) ?? 0) + count);
 }

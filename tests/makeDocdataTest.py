@@ -43,13 +43,13 @@ FROM_LIST = node("index.html", "All",
                  node("null", "Group", node("a b.html#café", "Café"), node("./Foo:Bar.html", "Path")),
                  node("null", "ns", node("latin.htm", "Class")),
                  node("index.html", "Start", node("sub/index.html", "C:∖new")))
-FROM_FOLDERS = node("index.html", "Set", node(
+FROM_DIRECTORIES = node("index.html", "Set", node(
     "index.html", "Start", node("./Foo:Bar.html", "By “heading”"), node("a b.html", "a b.html"),
     node("latin.htm", "été"), node("sub/index.html", "C:∖new␀", node("sub/w%41?.html", 'Wide "quotes"'))))
-# In the order of a folder's pages, then what titles and links say.
+# Of the files in the order in which they are read, then of titles and links.
 WARNINGS = """'back\\\\slash.html': left out: the scripts can't hold its path
 'bytes\\udcff.html': left out: the scripts can't hold its path
-latin.htm: is no UTF-8 and declares no encoding: read as windows-1252
+latin.htm: is not UTF-8 and declares no encoding: read as windows-1252
 latin.htm: read in part: unknown status keyword 'odd' in marked section
 'line\\n.html': left out: the scripts can't hold its path
 'quote".html': left out: the scripts can't hold its path
@@ -64,21 +64,21 @@ class MakeDocdata(unittest.TestCase):
         self.maxDiff = None
         parent = tempfile.TemporaryDirectory()
         self.addCleanup(parent.cleanup)
-        self.folder = os.path.join(parent.name, "Set")
+        self.directory = os.path.join(parent.name, "Set")
         for path, page in PAGES.items():
-            path = os.path.join(os.fsencode(self.folder), os.fsencode(path))
+            path = os.path.join(os.fsencode(self.directory), os.fsencode(path))
             os.makedirs(os.path.dirname(path), exist_ok=True)
             with open(path, "wb") as file:
                 file.write(page if isinstance(page, bytes) else page.encode())
 
     def make(self, *options):
-        run = subprocess.run([sys.executable, SCRIPT, *options, self.folder], stderr=subprocess.PIPE, check=True,
+        run = subprocess.run([sys.executable, SCRIPT, *options, self.directory], stderr=subprocess.PIPE, check=True,
                              env={**os.environ, "PYTHONIOENCODING": "utf-8", "PYTHONHASHSEED": "random"})
         texts = []
         for name in ("index.json", "toc.json"):
-            with open(os.path.join(self.folder, "docdata", name), encoding="utf-8") as file:
+            with open(os.path.join(self.directory, "docdata", name), encoding="utf-8") as file:
                 texts.append(file.read())
-        return texts, run.stderr.decode().replace(self.folder + "/", "").splitlines()
+        return texts, run.stderr.decode().replace(self.directory + "/", "").splitlines()
 
     def test_writes_index_and_contents_and_says_what_it_left_out_or_replaced(self):
         (index, contents), said = self.make("--toc", "index.html", "--root-title", "All")
@@ -86,16 +86,16 @@ class MakeDocdata(unittest.TestCase):
         self.assertEqual(list(INDEX["searchIndex"]), list(json.loads(index)["searchIndex"]))
         self.assertEqual(FROM_LIST, json.loads(contents))
         self.assertEqual(["make-docdata.py: warning: " + warning for warning in WARNINGS], said[:-1])
-        self.assertEqual(f"make-docdata.py: {self.folder}: 6 pages, 7 texts, 16 terms", said[-1])
+        self.assertEqual(f"make-docdata.py: {self.directory}: 6 pages, 7 texts, 16 terms", said[-1])
 
     def test_same_pages_give_same_bytes(self):
         self.assertEqual(self.make()[0], self.make()[0])
 
-    def test_contents_from_folders_and_an_unknown_list(self):
-        self.assertEqual(FROM_FOLDERS, json.loads(self.make()[0][1]))
+    def test_contents_from_directories_and_an_unknown_list(self):
+        self.assertEqual(FROM_DIRECTORIES, json.loads(self.make()[0][1]))
         texts, said = self.make("--toc", "list.html")
-        self.assertEqual(FROM_FOLDERS, json.loads(texts[1]))
-        self.assertIn("there is no page list.html: the contents are made from the folders", "\n".join(said))
+        self.assertEqual(FROM_DIRECTORIES, json.loads(texts[1]))
+        self.assertIn("there is no page list.html: the contents are made from the directories", "\n".join(said))
 
 
 if __name__ == "__main__":

@@ -45,8 +45,8 @@ for (const [name, text] of Object.entries(pages)) {
     fs.mkdirSync(path.dirname(path.join(root, sea, name)), { recursive: true });
     fs.writeFileSync(path.join(root, sea, name), text);
 }
-[`${sea}/shared`, `${sea}/docdata`, "charts/Manual/docdata", "telemetry/Manual/docdata"].forEach((folder) =>
-    fs.cpSync("web", path.join(root, folder), { recursive: true }));
+[`${sea}/shared`, `${sea}/docdata`, "charts/Manual/docdata", "telemetry/Manual/docdata"].forEach((directory) =>
+    fs.cpSync("web", path.join(root, directory), { recursive: true }));
 execFileSync(process.argv[2], ["-autopaths", root], { stdio: "ignore" });
 fs.writeFileSync(path.join(root, "telemetry/Manual/docdata/global_index.js"), "pages = [");
 fs.rmSync(path.join(root, "telemetry/Manual/docdata/global_toc.js"));
