@@ -109,7 +109,7 @@
         };
     }
 
-    // Marks the texts and pages that hold a word: a page with HELD, in its title 2 more, whole 1 more.
+    // Marks texts and pages that hold a word. A page has HELD, also 2 if in its title, and 1 if whole.
     function lookUp(word, isPrefix) {
         const { searchIndex, titles, words, pageOfText } = index;
         const texts = new Uint8Array(pageOfText.length);
@@ -292,7 +292,7 @@
     const isPlain = (event) => !event.isComposing &&
         !["Control", "Alt", "Meta", "AltGraph"].some((key) => event.getModifierState(key));
 
-    // "/" leads to the box, unless it is typed or the page has taken it.
+    // "/" leads to the box, unless it is typed text or the page uses it.
     function onPageKey(event) {
         const [target] = event.composedPath();
         const isTyped = target.isContentEditable || /^(input|textarea|select)$/.test(target.localName);
