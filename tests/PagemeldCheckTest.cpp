@@ -213,11 +213,11 @@ status 1
           {"b/Manual/docdata/toc.json", R"({"link":"a\q"})"},
           {"c/Manual/docdata/index.json", Index(R"(["p.html","P"])")},
           {"c/Manual/docdata/toc.json", ""}},
-         R"(@/a/Manual/docdata/index.json:2:11: error: no JSON: there is a comma before the closing bracket; refused at byte 23, at "]}"; "a" will be missing from the search of Manual [not-json]
-@/a/Manual/docdata/toc.json:1:1: error: no JSON: the file begins with a byte order mark: save it without; refused at byte 0, at "\uFEFF{}"; "a" will be missing from the contents of Manual [not-json]
-@/b/Manual/docdata/index.json:1:2: error: no JSON: strings need double quotes; refused at byte 1, at "'pages':[]}"; "b" will be missing from the search of Manual [not-json]
-@/b/Manual/docdata/toc.json:1:11: error: no JSON: a backslash in a string must be doubled; refused at byte 10, at "\\q\"}"; "b" will be missing from the contents of Manual [not-json]
-@/c/Manual/docdata/toc.json:1:1: error: no JSON: the file is empty; refused at byte 0, at the end of the text; "c" will be missing from the contents of Manual [not-json]
+         R"(@/a/Manual/docdata/index.json:2:11: error: not JSON: there is a comma before the closing bracket; refused at byte 23, at "]}"; "a" will be missing from the search of Manual [not-json]
+@/a/Manual/docdata/toc.json:1:1: error: not JSON: the file begins with a byte order mark: save it without; refused at byte 0, at "\uFEFF{}"; "a" will be missing from the contents of Manual [not-json]
+@/b/Manual/docdata/index.json:1:2: error: not JSON: strings need double quotes; refused at byte 1, at "'pages':[]}"; "b" will be missing from the search of Manual [not-json]
+@/b/Manual/docdata/toc.json:1:11: error: not JSON: a backslash in a string must be doubled; refused at byte 10, at "\\q\"}"; "b" will be missing from the contents of Manual [not-json]
+@/c/Manual/docdata/toc.json:1:1: error: not JSON: the file is empty; refused at byte 0, at the end of the text; "c" will be missing from the contents of Manual [not-json]
 Manual: error: no module has a sound toc.json: nothing will be written, and earlier outputs stay [nothing-to-combine]
 3 modules, 6 errors, 0 warnings; missing from the search of Manual: a, b; from its contents: a, b, c
 status 1
@@ -229,12 +229,12 @@ status 1
           {"b/Manual/docdata/toc.json", "\"a\nb\""},
           {"c/Manual/docdata/index.json", std::string("{\000\"\000", 4)},
           {"c/Manual/docdata/toc.json", Toc("")}},
-         R"(@/a/Manual/docdata/index.json:1:4: error: no JSON: there is a second root after the first; refused at byte 3, at "{}"; "a" will be missing from the search of Manual [not-json]
-@/a/Manual/docdata/toc.json:1:6: error: no JSON: a number is too large; refused at byte 5, at "1e999}"; "a" will be missing from the contents of Manual [not-json]
-@/b/Manual/docdata/index.json:1:3: error: no JSON: JSON has no comments; refused at byte 2, at "// none\n]"; "b" will be missing from the search of Manual [not-json]
-@/b/Manual/docdata/toc.json:1:3: error: no JSON: a line break in a string must be written as \n; refused at byte 2, at "\nb\""; "b" will be missing from the contents of Manual [not-json]
+         R"(@/a/Manual/docdata/index.json:1:4: error: not JSON: there is a second root after the first; refused at byte 3, at "{}"; "a" will be missing from the search of Manual [not-json]
+@/a/Manual/docdata/toc.json:1:6: error: not JSON: a number is too large; refused at byte 5, at "1e999}"; "a" will be missing from the contents of Manual [not-json]
+@/b/Manual/docdata/index.json:1:3: error: not JSON: JSON has no comments; refused at byte 2, at "// none\n]"; "b" will be missing from the search of Manual [not-json]
+@/b/Manual/docdata/toc.json:1:3: error: not JSON: a line break in a string must be written as \n; refused at byte 2, at "\nb\""; "b" will be missing from the contents of Manual [not-json]
 @/c/Manual/docdata/index.json:1:2: warning: a NUL byte ends the text; bytes after it that are not seen: 2 [text-after-nul]
-@/c/Manual/docdata/index.json:1:2: error: no JSON: the file is in UTF-16: save it as UTF-8; refused at byte 1, at the end of the text; "c" will be missing from the search of Manual [not-json]
+@/c/Manual/docdata/index.json:1:2: error: not JSON: the file is in UTF-16: save it as UTF-8; refused at byte 1, at the end of the text; "c" will be missing from the search of Manual [not-json]
 Manual: error: no module has a sound index.json: nothing will be written, and earlier outputs stay [nothing-to-combine]
 3 modules, 6 errors, 1 warning; missing from the search of Manual: a, b, c; from its contents: a, b
 status 1
@@ -352,7 +352,7 @@ status 0
           {"b/Manual/docdata/index.json", Index("[\"p.html\",\"\351\351\"]")},
           {"b/Manual/docdata/toc.json",
            std::string("{\"link\":\"toc\",\"title\":\"toc\",\"children\":[]}\000\351", 44)}},
-         R"(@/b/Manual/docdata/index.json:1:22: warning: byte \xE9 is no UTF-8: readers see a replacement character [invalid-utf8]
+         R"(@/b/Manual/docdata/index.json:1:22: warning: byte \xE9 is not UTF-8: readers see a replacement character [invalid-utf8]
 @/b/Manual/docdata/toc.json:1:43: warning: a NUL byte ends the text; bytes after it that are not seen: 1 [text-after-nul]
 2 modules, 0 errors, 2 warnings
 status 0
@@ -395,12 +395,12 @@ status 0
           {"b/Manual/docdata/global_toc.json", "{}"},
           {"b/Manual/docdata/global_toc.js.tmp", ""},
           {"b/Manual/docdata/global_index.js", kOld}},
-         R"(@/a/Manual/docdata/global_index.js: error: is cut short or broken: readers of the module go without [output-broken]
-@/a/Manual/docdata/global_index.json: error: is cut short or broken: readers of the module go without [output-broken]
-@/a/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module go without [output-missing]
+         R"(@/a/Manual/docdata/global_index.js: error: is cut short or broken: readers of the module can't use it [output-broken]
+@/a/Manual/docdata/global_index.json: error: is cut short or broken: readers of the module can't use it [output-broken]
+@/a/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module can't use it [output-missing]
 @/b/Manual/docdata/global_index.js: error: is older than an input of the set: readers see an earlier build [output-stale]
-@/b/Manual/docdata/global_toc.js: error: is cut short or broken: readers of the module go without [output-broken]
-@/b/Manual/docdata/global_toc.js.tmp: error: a temporary file stayed: a run was ended, and the output beside it may be old [leftover]
+@/b/Manual/docdata/global_toc.js: error: is cut short or broken: readers of the module can't use it [output-broken]
+@/b/Manual/docdata/global_toc.js.tmp: error: a temporary file was left behind: a run was ended, and the output beside it may be old [leftover]
 @/b/Manual/docdata/global_toc.json: error: has other content than in @/a: a run ended early, and readers find different things [output-differs]
 2 modules, 7 errors, 0 warnings
 status 1
@@ -443,7 +443,7 @@ status 1
                                                 "\"\351\\n\\\"xxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxx"
                                                 "xxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxx\\\\\"]")}},
          R"({"level":"error","rule":"script-broken","file":"@/b/Manual/docdata/index.json","line":1,"column":21,"offset":20,"pointer":"/pages/0/1","module":"@/b","set":"Manual","message":"title \"\\xE9\\n\\\"xxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxx\\\\\" of page \"p.html\" breaks global_index.js in every module"}
-{"level":"warning","rule":"invalid-utf8","file":"@/b/Manual/docdata/index.json","line":1,"column":22,"offset":21,"module":"@/b","set":"Manual","message":"byte \\xE9 is no UTF-8: readers see a replacement character"}
+{"level":"warning","rule":"invalid-utf8","file":"@/b/Manual/docdata/index.json","line":1,"column":22,"offset":21,"module":"@/b","set":"Manual","message":"byte \\xE9 is not UTF-8: readers see a replacement character"}
 {"summary":{"modules":2,"errors":1,"warnings":1,"notes":0,"missing":{"Manual":{"search":[],"contents":[]},"ScriptReference":{"search":[],"contents":[]}}}}
 status 1
 )"},
@@ -452,7 +452,7 @@ status 1
                                                 "\"\351\\n\\\"xxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxx"
                                                 "xxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxx\\\\\"]")}},
          R"(@/b/Manual/docdata/index.json:1:21: error: title "\xE9\n\"xxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxx"... of page "p.html" breaks global_index.js in every module [script-broken] /pages/0/1
-@/b/Manual/docdata/index.json:1:22: warning: byte \xE9 is no UTF-8: readers see a replacement character [invalid-utf8]
+@/b/Manual/docdata/index.json:1:22: warning: byte \xE9 is not UTF-8: readers see a replacement character [invalid-utf8]
 2 modules, 1 error, 1 warning
 status 1
 )"},
@@ -496,17 +496,17 @@ status 1
          {{"a/Manual/docdata/index.json", kLink + "a/Manual/docdata/index.json"},
           {"b/Manual/docdata/toc.json", kPipe},
           {"b/Manual/docdata/global_toc.js", kDirectory}},
-         R"(@/a/Manual/docdata/global_index.js: error: is not there, or can't be read: readers of the module go without [output-missing]
-@/a/Manual/docdata/global_index.json: error: is not there, or can't be read: readers of the module go without [output-missing]
-@/a/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module go without [output-missing]
-@/a/Manual/docdata/global_toc.json: error: is not there, or can't be read: readers of the module go without [output-missing]
+         R"(@/a/Manual/docdata/global_index.js: error: is not there, or can't be read: readers of the module can't use it [output-missing]
+@/a/Manual/docdata/global_index.json: error: is not there, or can't be read: readers of the module can't use it [output-missing]
+@/a/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module can't use it [output-missing]
+@/a/Manual/docdata/global_toc.json: error: is not there, or can't be read: readers of the module can't use it [output-missing]
 @/a/Manual/docdata/index.json: error: can't be read; "a" will be missing from the search of Manual [unreadable]
 @/a/Manual/docdata/toc.json:1:9: warning: link "toc" leads to no file: the link is dead [missing-target] /link
-@/b/Manual/docdata/global_index.js: error: is not there, or can't be read: readers of the module go without [output-missing]
-@/b/Manual/docdata/global_index.json: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/b/Manual/docdata/global_index.js: error: is not there, or can't be read: readers of the module can't use it [output-missing]
+@/b/Manual/docdata/global_index.json: error: is not there, or can't be read: readers of the module can't use it [output-missing]
 @/b/Manual/docdata/global_toc.js: error: a directory is in the place of the output: the new one stays as .tmp [output-blocked]
-@/b/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module go without [output-missing]
-@/b/Manual/docdata/global_toc.json: error: is not there, or can't be read: readers of the module go without [output-missing]
+@/b/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module can't use it [output-missing]
+@/b/Manual/docdata/global_toc.json: error: is not there, or can't be read: readers of the module can't use it [output-missing]
 @/b/Manual/docdata/toc.json: error: can't be read; "b" will be missing from the contents of Manual [unreadable]
 2 modules, 11 errors, 1 warning; missing from the search of Manual: a; from its contents: b
 status 1

@@ -41,7 +41,7 @@ public:
         {
             m_findings.AddAtOffset("invalid-utf8", invalid,
                                    "byte " + Visible(seen.substr(invalid, 1)) +
-                                       " is no UTF-8: readers see a replacement character");
+                                       " is not UTF-8: readers see a replacement character");
         }
         if (seen.size() + 1 < size)
         {

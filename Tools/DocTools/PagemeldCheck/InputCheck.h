@@ -6,14 +6,14 @@
 #include <set>
 #include <string>
 
-/// What became of an input file, and what the checks of a whole set need of it.
+/// The outcome of reading an input file, and what the checks of a whole set need from it.
 struct InputFacts
 {
     enum class State
     {
         Missing,
         Unreadable,
-        Refused, ///< no JSON, or of another structure: pagemeld skips the module for it
+        Refused, ///< not JSON, or of the wrong structure: pagemeld skips the module
         Sound,
     };
 
@@ -35,7 +35,7 @@ enum class InputKind
     Toc,
 };
 
-/// Reads the file of the scope, reports everything that is wrong inside it, and returns what became of it. A
+/// Reads the file of the scope, reports everything that is wrong in it, and returns the outcome. A
 /// file that is missing or can't be read is left to the caller to report. moduleName is what messages call
 /// the module.
 InputFacts CheckInput(InputKind kind, const FileScope& scope, const std::string& moduleName,

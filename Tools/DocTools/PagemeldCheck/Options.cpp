@@ -24,11 +24,11 @@ ROOT is a module as it would be given to pagemeld, as typed.
   -t, --targets        check that pages and contents lead to files that exist
   -o, --outputs        after a run: check that outputs are there, whole,
                        current and equal
-  -f, --format=FORMAT  "text" (default), or "json": one object a line
+  -f, --format=FORMAT  "text" (default), or "json": one object per line
   -W, --werror         warnings count as errors
   -n, --limit=N        findings shown per rule and file; 0 for all (default 10)
   -q, --quiet          show errors only
-  -e, --explain=RULE   explain a rule and how to mend what it finds
+  -e, --explain=RULE   explain a rule and how to fix what it finds
   -h, --help           show this help
   -V, --version        show the version
 
@@ -59,7 +59,7 @@ std::nullopt_t Refuse(const std::string& message)
     return std::nullopt;
 }
 
-/// Returns a number written in digits alone.
+/// Returns a number that consists only of digits.
 std::optional<std::size_t> ParseNumber(const char* text)
 {
     constexpr std::size_t kMaxDigits = 18;

@@ -64,12 +64,12 @@ std::string ProblemOf(const std::string& docdata)
     }
     if (!S_ISDIR(mode))
     {
-        return "is no directory";
+        return "is not a directory";
     }
     return ::faccessat(AT_FDCWD, docdata.c_str(), W_OK | X_OK, AT_EACCESS) == 0 ? "" : "can't be written to";
 }
 
-/// Whether a directory itself has the path. A link to one is no obstacle: the rename replaces it.
+/// Whether a directory itself has the path. A link to one is not an obstacle: the rename replaces it.
 bool IsDirectoryItself(const std::string& path)
 {
     struct stat status = {};
@@ -165,7 +165,7 @@ void CheckCopy(const OutputForm& output, std::size_t module, std::size_t set, co
     if (text.outcome != InputText::Outcome::Read)
     {
         report.Add({"output-missing", module, set, path,
-                    "is not there, or can't be read: readers of the module go without"});
+                    "is not there, or can't be read: readers of the module can't use it"});
         return;
     }
     if (IsOlder(path, newestInput))
@@ -176,8 +176,8 @@ void CheckCopy(const OutputForm& output, std::size_t module, std::size_t set, co
     const std::optional<std::string_view> body = BodyOf(output, text);
     if (!body)
     {
-        report.Add(
-            {"output-broken", module, set, path, "is cut short or broken: readers of the module go without"});
+        report.Add({"output-broken", module, set, path,
+                    "is cut short or broken: readers of the module can't use it"});
         return;
     }
     const std::size_t hash = std::hash<std::string_view>()(*body);
@@ -220,7 +220,7 @@ void CheckOutputs(std::size_t set, const std::vector<SetModule>& modules, Report
         FirstCopy first;
         for (std::size_t i = 0; i < modules.size(); ++i)
         {
-            if (modules[i].hasDocdata) // otherwise output-blocked tells
+            if (modules[i].hasDocdata) // otherwise output-blocked reports it
             {
                 CheckCopy(output, i, set, modules[i], newestInput, first, report);
             }
@@ -238,7 +238,8 @@ void CheckLeftovers(std::size_t set, const std::vector<SetModule>& modules, Repo
             if (S_ISREG(ModeOf(path)))
             {
                 report.Add({"leftover", i, set, path,
-                            "a temporary file stayed: a run was ended, and the output beside it may be old"});
+                            "a temporary file was left behind: a run was ended, and the output beside it may "
+                            "be old"});
             }
         }
     }

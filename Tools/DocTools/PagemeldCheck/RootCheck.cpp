@@ -64,7 +64,7 @@ struct WrongLinks
 {
     std::size_t first = 0; ///< the first root that is not reached
     std::size_t count = 0;
-    std::string reached; ///< instead of the first; empty if it is no directory at all
+    std::string reached; ///< instead of the first; empty if it is not a directory at all
 };
 
 WrongLinks FindWrongLinks(const std::vector<RootPath>& paths, std::size_t from)
@@ -88,7 +88,7 @@ WrongLinks FindWrongLinks(const std::vector<RootPath>& paths, std::size_t from)
 }
 
 /// Returns a web path as people write it: without "./" before it and "/" after it.
-std::string AsTyped(std::string_view webPath)
+std::string DisplayedWebPath(std::string_view webPath)
 {
     if (webPath.substr(0, 2) == "./")
     {
@@ -129,7 +129,7 @@ std::string DescribeWrongLinks(const std::vector<std::string>& roots, std::size_
     const std::string& to = roots[wrong.first];
     const std::string others = wrong.count > 1 ? " and " + std::to_string(wrong.count - 1) + " more" : "";
     const std::string lead =
-        wrong.reached.empty() ? " will lead elsewhere" : " will lead to " + AsTyped(wrong.reached);
+        wrong.reached.empty() ? " will lead elsewhere" : " will lead to " + DisplayedWebPath(wrong.reached);
     return "links to " + Visible(to) + others + lead + ": " + Remedy(roots[from], to);
 }
 

@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-/// What of a set is checked, and how much is shown.
+/// Which checks of a set run, and how much is shown.
 struct SetChecks
 {
     bool checksTargets = false;

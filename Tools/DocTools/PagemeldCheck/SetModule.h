@@ -5,7 +5,7 @@
 
 #include <string>
 
-/// One module of a set: where it is, and what became of its input files.
+/// One module of a set: where it is, and the outcome of reading its input files.
 struct SetModule
 {
     SetModule(const std::string& moduleRoot, const std::string& setName)

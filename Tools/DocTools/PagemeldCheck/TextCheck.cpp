@@ -26,27 +26,6 @@ bool IsFile(const std::string& path)
     return ::stat(path.c_str(), &status) == 0 && !S_ISDIR(status.st_mode);
 }
 
-int HexValue(char digit)
-{
-    const std::string_view digits = "0123456789abcdef";
-    const auto lower = static_cast<char>(digit >= 'A' && digit <= 'F' ? digit + ('a' - 'A') : digit);
-    const std::size_t value = digits.find(lower);
-    return value == std::string_view::npos ? -1 : static_cast<int>(value);
-}
-
-std::string PercentDecoded(std::string_view path)
-{
-    std::string decoded;
-    for (std::size_t i = 0; i < path.size(); ++i)
-    {
-        const int high = path[i] == '%' && i + 2 < path.size() ? HexValue(path[i + 1]) : -1;
-        const int low = high >= 0 ? HexValue(path[i + 2]) : -1;
-        decoded += low >= 0 ? static_cast<char>(high * 16 + low) : path[i];
-        i += low >= 0 ? 2 : 0;
-    }
-    return decoded;
-}
-
 /// Whether a link leads to a file below the directory, without what begins with "#" or "?": as it is, or
 /// percent-decoded.
 bool LeadsToFile(const std::string& directory, const std::string& link)

@@ -2,7 +2,7 @@
 
 #include "Tools/DocTools/PagemeldCheck/Report/FileFindings.h"
 
-/// What of the texts of a sound file is looked at beside the scripts.
+/// What is checked in a sound file's texts besides the scripts.
 struct TextChecks
 {
     bool checksTargets = false; ///< whether page paths and links lead to files

@@ -6,7 +6,7 @@
 #include <utility>
 
 // The renderer escapes the double quotes of titles and nothing else, so a backslash in a title or a link
-// means to a browser whatever the language makes of it. Only a walk by the rules of the language tells what
+// means to a browser whatever the language makes of it. Only a walk by the rules of the language shows what
 // readers get. Nearly all texts have nothing to walk over: one pre-check is all that they cost.
 
 namespace

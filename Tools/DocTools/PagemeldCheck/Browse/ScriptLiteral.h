@@ -12,5 +12,5 @@
 /// number would have; two halves in a row become their character. Every escape is longer than what it makes,
 /// so a title or link that holds a backslash never comes back unchanged.
 ///
-/// Bytes that are no UTF-8 are kept. A browser shows U+FFFD for them, but they end no literal.
+/// Bytes that are not UTF-8 are kept. A browser shows U+FFFD for them, but they end no literal.
 [[nodiscard]] std::optional<std::string> ValueOfScriptLiteral(std::string_view literal);

@@ -5,8 +5,8 @@
 #include <iterator>
 
 // Inside this file a path is a URL path: "%" introduces a byte, and a name may be empty. It begins with "/"
-// or
-// "./" and ends in a slash as long as names are added. Only the finished path is brought to names on disk.
+// or "./", and ends in a slash as long as names are added. Only the finished path is converted to names on
+// disk.
 
 namespace
 {
@@ -60,22 +60,6 @@ std::string Encoded(std::string_view path)
     return encoded;
 }
 
-/// A "%" that two hexadecimal digits don't follow is itself.
-std::string Decoded(std::string_view path)
-{
-    std::string decoded;
-    for (std::size_t i = 0; i < path.size(); ++i)
-    {
-        unsigned char byte = 0;
-        const std::string_view digits = path.substr(i + 1, 2);
-        const bool isEncoded = path[i] == '%' && digits.size() == 2 &&
-                               std::from_chars(digits.begin(), digits.end(), byte, 16).ptr == digits.end();
-        decoded += isEncoded ? static_cast<char>(byte) : path[i];
-        i += isEncoded ? 2 : 0;
-    }
-    return decoded;
-}
-
 void Climb(std::string& path)
 {
     if (path == "./" || EndsWith(path, "/../"))
@@ -96,7 +80,7 @@ std::string Resolve(std::string path, std::string_view steps)
     {
         const std::size_t slash = steps.find('/');
         const std::string_view step = steps.substr(0, slash);
-        const std::string name = Decoded(step);
+        const std::string name = PercentDecoded(step);
         isLast = slash == std::string_view::npos;
         if (name == "..")
         {
@@ -130,7 +114,7 @@ std::string AddressOf(std::string_view directory)
 
 std::string WebPathOf(std::string_view directory)
 {
-    return Decoded(AddressOf(directory));
+    return PercentDecoded(AddressOf(directory));
 }
 
 std::optional<std::string> FollowLink(std::string_view fromDirectory, std::string_view link)
@@ -146,7 +130,7 @@ std::optional<std::string> FollowLink(std::string_view fromDirectory, std::strin
     {
         return std::nullopt;
     }
-    return Decoded(WithoutDoubledSlashes(ResolvePath(AddressOf(fromDirectory), reference)));
+    return PercentDecoded(WithoutDoubledSlashes(ResolvePath(AddressOf(fromDirectory), reference)));
 }
 
 bool HasScheme(std::string_view link)
@@ -158,4 +142,19 @@ bool HasScheme(std::string_view link)
     const std::string cleaned = Cleaned(link);
     const auto end = std::find_if_not(cleaned.begin(), cleaned.end(), IsSchemeCharacter);
     return IsLetter(cleaned.front()) && *end == ':';
+}
+
+std::string PercentDecoded(std::string_view path)
+{
+    std::string decoded;
+    for (std::size_t i = 0; i < path.size(); ++i)
+    {
+        unsigned char byte = 0;
+        const std::string_view digits = path.substr(i + 1, 2);
+        const bool isEncoded = path[i] == '%' && digits.size() == 2 &&
+                               std::from_chars(digits.begin(), digits.end(), byte, 16).ptr == digits.end();
+        decoded += isEncoded ? static_cast<char>(byte) : path[i];
+        i += isEncoded ? 2 : 0;
+    }
+    return decoded;
 }

@@ -6,8 +6,8 @@
 
 // Where links between modules lead.
 //
-// Paths are compared by name, as a browser resolves them: "." and ".." are taken off before anybody looks at
-// a disk. Links on disk are not looked at. What a browser asks for does not depend on them, and the same
+// Paths are compared by name, as a browser resolves them: "." and ".." are taken off without looking at
+// the disk. Links on disk are not looked at. What a browser asks for does not depend on them, and the same
 // pages are often served from a copy in which they are gone. So two names of one directory are two web paths.
 
 /// Returns the web path of a directory: its names without ".", ".." and doubled slashes, and with a slash at
@@ -36,3 +36,7 @@
 /// Whether a browser takes the link for an absolute URL: it begins with a letter, then any letters, digits,
 /// "+", "-" and ".", and a colon. A file name such as "std::list.html" is one too.
 [[nodiscard]] bool HasScheme(std::string_view link);
+
+/// Returns the path with the bytes that "%41" and the like stand for. A "%" without two hexadecimal digits
+/// after it stays.
+[[nodiscard]] std::string PercentDecoded(std::string_view path);

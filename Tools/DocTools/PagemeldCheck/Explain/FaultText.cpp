@@ -18,12 +18,13 @@ std::string DescribeMember(const char* name, const char* kind, const Value& valu
                      : member + " is " + DescribeValue(value, quoteSize) + ", not " + kind;
 }
 
-/// Returns "3 pages" or "1 page" for the entries of an array of the document.
+/// Returns "but there are 3 pages" or "but there is 1 page" for the entries of an array of the document.
 std::string CountEntries(const Value& document, const char* member, const std::string& noun)
 {
     const Value* const list = FindMember(document, member);
     const std::size_t count = list != nullptr && list->IsArray() ? list->Size() : 0;
-    return std::to_string(count) + " " + noun + (count == 1 ? "" : "s");
+    return count == 1 ? "but there is 1 " + noun
+                      : "but there are " + std::to_string(count) + " " + noun + "s";
 }
 
 std::string DescribePair(const char* kind, const char* form, const Value& value, std::size_t quoteSize)
@@ -83,8 +84,7 @@ std::string DescribeIndexFault(const StructureFault& fault, const JsonPointer& p
     case 350:
         return "page number is " + DescribeValue(value[1], quoteSize) + ", not a 32-bit integer";
     case 356:
-        return "page number " + DescribeValue(value[1], quoteSize) + ", but there " +
-               (CountEntries(document, "pages", "page") == "1 page" ? "is " : "are ") +
+        return "page number " + DescribeValue(value[1], quoteSize) + ", " +
                CountEntries(document, "pages", "page");
     case 371:
         return "common word has the value " + DescribeValue(value, quoteSize) + ", not 1";
@@ -93,8 +93,7 @@ std::string DescribeIndexFault(const StructureFault& fault, const JsonPointer& p
     case 396:
         return "info number is " + DescribeValue(value, quoteSize) + ", not a 32-bit integer";
     case 401:
-        return "info number " + DescribeValue(value, quoteSize) + ", but there " +
-               (CountEntries(document, "info", "info") == "1 info" ? "is " : "are ") +
+        return "info number " + DescribeValue(value, quoteSize) + ", " +
                CountEntries(document, "info", "info");
     default:
         return "the document is " + DescribeValue(value, quoteSize) + ", not an object";

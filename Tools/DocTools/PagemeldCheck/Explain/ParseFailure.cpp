@@ -119,5 +119,5 @@ std::string DescribeParseFailure(std::string_view text, std::size_t size,
     }
     const std::string found =
         failure.Offset() < text.size() ? Quoted(text.substr(failure.Offset()), 12) : "the end of the text";
-    return "no JSON: " + cause + "; refused at byte " + std::to_string(failure.Offset()) + ", at " + found;
+    return "not JSON: " + cause + "; refused at byte " + std::to_string(failure.Offset()) + ", at " + found;
 }

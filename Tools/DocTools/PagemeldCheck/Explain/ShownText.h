@@ -10,12 +10,12 @@
 /// The length at which long texts are cut in the lines for people.
 constexpr std::size_t kLongText = 80;
 
-/// Returns the position of the first byte that is no UTF-8, or npos. Surrogates and forms that are too long
-/// are none.
+/// Returns the position of the first byte that is not UTF-8, or npos. Surrogates and
+/// overlong forms don't count as UTF-8.
 std::size_t FindInvalidUtf8(std::string_view text);
 
-/// Returns text with control characters, marks that reverse the direction of text and bytes that are no UTF-8
-/// as escapes: "\n", "\x1B", "\xE9", "\u202E". All else stays as it is.
+/// Returns text with control characters, marks that reverse the direction of text and bytes that are not
+/// UTF-8 as escapes: "\n", "\x1B", "\xE9", "\u202E". All else stays as it is.
 std::string Visible(std::string_view text);
 
 /// Returns text in double quotes, visible and with a backslash before quotes and backslashes. One of more

@@ -8,9 +8,9 @@
 #include <string_view>
 #include <unordered_map>
 
-// A document does not keep where its values stood, and a pointer such as "/a/0" does not tell either, since
-// an object may hold a name twice. A value's number in document order tells. So the document is walked for
-// the numbers of the values, and the text is read a second time until they have all come by. Neither
+// A document does not keep where its values stood, and a pointer such as "/a/0" does not say either, since
+// an object may hold a name twice. A value's number in document order does. So the document is walked for
+// the numbers of the values, and the text is read a second time until all have been found. Neither
 // recurses: documents may be nested deeper than a small stack holds.
 
 namespace

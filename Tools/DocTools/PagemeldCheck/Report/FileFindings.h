@@ -27,8 +27,8 @@ public:
 
     [[nodiscard]] const FileScope& Scope() const { return m_scope; }
 
-    /// Adds what is wrong with a value, in the words that wording() returns. The value must live, and stay in
-    /// place, until HandTo.
+    /// Adds what is wrong with a value, in the words that wording() returns. The value must stay
+    /// valid and in place until HandTo.
     template <typename Wording>
     void AddAtValue(const char* rule, const rapidjson::Value& value, const JsonPointer& pointer,
                     const Wording& wording)

@@ -14,7 +14,7 @@ namespace
 // In ASCII, so that no control character above it reaches a terminal.
 using JsonWriter = rapidjson::Writer<rapidjson::StringBuffer, rapidjson::UTF8<>, rapidjson::ASCII<>>;
 
-/// Writes a text that may hold bytes that are no UTF-8, which become escapes.
+/// Writes a text that may hold bytes that are not UTF-8, which become escapes.
 void WriteText(JsonWriter& writer, const std::string& text)
 {
     std::string valid;

@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-// The form of a report that programs read, an object a line, in ASCII. No line ends in a line feed.
+// The form of a report that programs read, one object per line, in ASCII. No line ends in a line feed.
 
 /// Returns a finding with what applies to it. roots are the modules as typed.
 std::string JsonLine(const Finding& finding, const std::vector<std::string>& roots);

@@ -18,8 +18,8 @@ struct Rule
     const char* id;
     Level level;
     const char* meaning;     ///< one line: when it holds
-    const char* consequence; ///< what readers or the run get to see
-    const char* remedy;      ///< how to mend it
+    const char* consequence; ///< what it does to readers or to the run
+    const char* remedy;      ///< how to fix it
 };
 
 /// All rules, in the order in which they are shown.
