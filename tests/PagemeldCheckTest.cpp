@@ -128,6 +128,12 @@ status 0
 0 modules, 1 error, 0 warnings
 status 1
 )"},
+        {{"@/a/Manual"},
+         {},
+         R"(@/a/Manual: error: has neither Manual/docdata nor ScriptReference/docdata: nothing will be combined [no-modules]
+1 module, 1 error, 0 warnings
+status 1
+)"},
         {{"@/a", "@/b", "@/b"},
          {},
          R"(@/b: error: is the same directory as @/b: its pages will be in the search twice [duplicate-root]
@@ -166,17 +172,19 @@ status 1
 )"},
         {{"docs/m1", "docs/m12", "docs/m2/", R"(docs/a\b)"},
          {},
-         R"(docs/m1: error: links to docs/a\b will lead to docs/a/b/Manual: rename the directory [wrong-link-path]
+         R"(docs/m1: error: has neither Manual/docdata nor ScriptReference/docdata, nor has any other root: nothing will be combined [no-modules]
+docs/m1: error: links to docs/a\b will lead to docs/a/b/Manual: rename the directory [wrong-link-path]
 docs/m12: error: links to docs/m1 and 1 more will lead to docs/m12/Manual: one name begins with the other: rename one [wrong-link-path]
 docs/m2/: error: links to docs/m1 and 2 more will lead to m1/Manual: give the roots without a slash at the end [wrong-link-path]
 docs/a\b: error: a quote, backslash or line break in the path breaks both scripts of docs/m1: rename the directory [wrong-link-path]
-4 modules, 4 errors, 0 warnings
+4 modules, 5 errors, 0 warnings
 status 1
 )"},
         {{"/m1", "/m2"},
          {},
-         R"(2 modules, 0 errors, 0 warnings
-status 0
+         R"(/m1: error: has neither Manual/docdata nor ScriptReference/docdata, nor has any other root: nothing will be combined [no-modules]
+2 modules, 1 error, 0 warnings
+status 1
 )"},
         {{"@/a", "@/b", "@/c"},
          {{"a/Manual/docdata/toc.json", kDirectory},
@@ -483,8 +491,11 @@ status 1
 {"summary":{"modules":1,"errors":3,"warnings":0,"notes":0,"missing":{"Manual":{"search":["@/c\n\u001B[1m\\xE9\u009B"],"contents":["@/c\n\u001B[1m\\xE9\u009B"]},"ScriptReference":{"search":[],"contents":[]}}}}
 status 1
 )"},
-        {{"@/a/Manual/docdata/toc.json", "@/nowhere", ""}, {}, R"(3 modules, 0 errors, 0 warnings
-status 0
+        {{"@/a/Manual/docdata/toc.json", "@/nowhere", ""},
+         {},
+         R"(@/a/Manual/docdata/toc.json: error: has neither Manual/docdata nor ScriptReference/docdata, nor has any other root: nothing will be combined [no-modules]
+3 modules, 1 error, 0 warnings
+status 1
 )"},
         {{"-d", "@/c"},
          {{"c/d/Manual", kLink + "c"}, {"c/d/e", kLink + "c/d"}, {"c/f", kLink + "c/f"}},

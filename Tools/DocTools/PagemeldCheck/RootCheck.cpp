@@ -7,6 +7,7 @@
 #include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"
 
 #include <algorithm>
+#include <filesystem>
 #include <map>
 
 #include <sys/stat.h>
@@ -25,6 +26,28 @@ const char* DescribePassedOver(PassedOver reason)
     default:
         return "has ScriptReference/docdata but no Manual/docdata, so it is not taken: its pages will be "
                "missing";
+    }
+}
+
+bool IsModule(const std::string& root)
+{
+    return std::any_of(std::begin(kSetNames), std::end(kSetNames),
+                       [&](const char* setName)
+                       {
+                           std::error_code error;
+                           return std::filesystem::is_directory(ModulePath(root, setName).File("docdata"),
+                                                                error);
+                       });
+}
+
+/// Reports the first root if none is a module. A single one that is not is reported when a set is written.
+void ReportIfNoneIsModule(const std::vector<std::string>& roots, Report& report)
+{
+    if (!roots.empty() && std::none_of(roots.begin(), roots.end(), IsModule))
+    {
+        report.Add({"no-modules", 0, std::nullopt, roots[0],
+                    std::string("has neither Manual/docdata nor ScriptReference/docdata") +
+                        (roots.size() > 1 ? ", nor has any other root" : "") + ": nothing will be combined"});
     }
 }
 
@@ -168,6 +191,7 @@ void DiscoverRoots(const std::string& directory, std::vector<std::string>& roots
 
 void CheckRoots(const std::vector<std::string>& roots, Report& report)
 {
+    ReportIfNoneIsModule(roots, report);
     ReportDuplicates(roots, report);
     const std::vector<RootPath> paths(roots.begin(), roots.end());
     for (std::size_t i = 0; i < roots.size(); ++i)

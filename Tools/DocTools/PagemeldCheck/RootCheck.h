@@ -9,5 +9,6 @@
 /// over, or that there are none.
 void DiscoverRoots(const std::string& directory, std::vector<std::string>& roots, Report& report);
 
-/// Reports roots that are the same directory, and roots whose links to others lead to the wrong place.
+/// Reports if none of the roots is a module, roots that are the same directory, and roots whose links to
+/// others lead to the wrong place.
 void CheckRoots(const std::vector<std::string>& roots, Report& report);

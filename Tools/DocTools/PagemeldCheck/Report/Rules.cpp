@@ -7,9 +7,10 @@ namespace
 {
 
 constexpr Rule kRules[] = {
-    {"no-modules", Level::Error, "--discover found no module",
+    {"no-modules", Level::Error, "--discover found no module, or none of the roots is one",
      "Nothing is combined; earlier outputs stay, and the run ends with status 0.",
-     "Give the directory above the modules: a module holds the directory Manual/docdata."},
+     "A module is the directory above Manual/docdata and ScriptReference/docdata. Give the modules, or with "
+     "--discover a directory above them."},
     {"duplicate-root", Level::Error, "two roots are the same directory",
      "The module's pages are in the search twice, and its links in the contents may be those of "
      "either name.",
