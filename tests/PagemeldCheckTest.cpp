@@ -160,11 +160,12 @@ status 0
           {"a/Manual/docdata/global_index.js.tmp", "x"},
           {"a/Manual/docdata/global_toc.js", kLink + "b"}, // the rename replaces it
           {"a/ScriptReference/docdata/index.json", Index(R"(["p.html","P"])")},
-          {"a/ScriptReference/docdata/toc.json", Toc("")}},
+          {"a/ScriptReference/docdata/toc.json", Toc("")},
+          {"b/ScriptReference/docdata", "a file"}},
          R"(@/b/Manual/docdata/global_index.js.tmp: error: a directory is in the place of the temporary file: the run ends here with status 255, and leaves 1 later module and ScriptReference unwritten [output-blocked]
 @/b/Manual/docdata/global_toc.js: error: a directory is in the place of the output: the new one stays as .tmp [output-blocked]
 @/b/Manual/docdata/global_toc.json.tmp: error: a pipe is in the place of the temporary file: the run keeps the old output [output-blocked]
-@/b/ScriptReference/docdata: error: is missing: the run ends here with status 255, and leaves 1 later module unwritten [output-blocked]
+@/b/ScriptReference/docdata: error: is not a directory: the run ends here with status 255, and leaves 1 later module unwritten [output-blocked]
 @/c/Manual/docdata: error: is missing: the run ends here with status 255, and leaves ScriptReference unwritten [output-blocked]
 @/c/ScriptReference/docdata: error: is missing: the run ends here with status 255 [output-blocked]
 3 modules, 6 errors, 0 warnings
@@ -230,21 +231,12 @@ Manual: error: no module has a sound toc.json: nothing will be written, and earl
 3 modules, 6 errors, 0 warnings; missing from the search of Manual: a, b; from its contents: a, b, c
 status 1
 )"},
-        {{"@/a", "@/b", "@/c"},
-         {{"a/Manual/docdata/index.json", "{} {}"},
-          {"a/Manual/docdata/toc.json", R"({"a":1e999})"},
-          {"b/Manual/docdata/index.json", "[ // none\n]"},
-          {"b/Manual/docdata/toc.json", "\"a\nb\""},
-          {"c/Manual/docdata/index.json", std::string("{\000\"\000", 4)},
-          {"c/Manual/docdata/toc.json", Toc("")}},
-         R"(@/a/Manual/docdata/index.json:1:4: error: not JSON: there is a second root after the first; refused at byte 3, at "{}"; "a" will be missing from the search of Manual [not-json]
-@/a/Manual/docdata/toc.json:1:6: error: not JSON: a number is too large; refused at byte 5, at "1e999}"; "a" will be missing from the contents of Manual [not-json]
-@/b/Manual/docdata/index.json:1:3: error: not JSON: JSON has no comments; refused at byte 2, at "// none\n]"; "b" will be missing from the search of Manual [not-json]
-@/b/Manual/docdata/toc.json:1:3: error: not JSON: a line break in a string must be written as \n; refused at byte 2, at "\nb\""; "b" will be missing from the contents of Manual [not-json]
-@/c/Manual/docdata/index.json:1:2: warning: a NUL byte ends the text; bytes after it that are not seen: 2 [text-after-nul]
-@/c/Manual/docdata/index.json:1:2: error: not JSON: the file is in UTF-16: save it as UTF-8; refused at byte 1, at the end of the text; "c" will be missing from the search of Manual [not-json]
+        {{"@/a"},
+         {{"a/Manual/docdata/index.json", std::string("{\000\"\000", 4)}},
+         R"(@/a/Manual/docdata/index.json:1:2: warning: a NUL byte ends the text; bytes after it that are not seen: 2 [text-after-nul]
+@/a/Manual/docdata/index.json:1:2: error: not JSON: the file is in UTF-16: save it as UTF-8; refused at byte 1, at the end of the text; "a" will be missing from the search of Manual [not-json]
 Manual: error: no module has a sound index.json: nothing will be written, and earlier outputs stay [nothing-to-combine]
-3 modules, 6 errors, 1 warning; missing from the search of Manual: a, b, c; from its contents: a, b
+1 module, 2 errors, 1 warning; missing from the search of Manual: a
 status 1
 )"},
         {{"@/a", "@/b"},
@@ -286,9 +278,9 @@ status 1
           {"a/Manual/docdata/toc.json", Toc(R"({"link":"module","title":"A","modules":1,"children":null})")},
           {"b/Manual/docdata/index.json", Index(R"(["p","P"],["p","P",0],["q","Q",1])")},
           {"b/Manual/docdata/toc.json",
-           Toc(R"({"link":"b","title":"B","module":1,"children":null},{"link":"c","title":"C","module":2,"children":null})")}},
+           Toc(R"({"link":"b","title":"B","children":[{"link":"d","title":"D","module":1,"children":null}]},{"link":"c","title":"C","module":2,"children":null})")}},
          R"(@/b/Manual/docdata/index.json:1:21: error: this is an output: the page entry names its module, 0; "b" will be missing from the search of Manual [merged-input] /pages/1
-@/b/Manual/docdata/toc.json:1:41: error: this is an output: the node names its module, 1; its links will lead to that module [merged-input] /children/0
+@/b/Manual/docdata/toc.json:1:77: error: this is an output: the node names its module, 1; its links will lead to that module [merged-input] /children/0/children/0
 2 modules, 2 errors, 0 warnings; missing from the search of Manual: b
 status 1
 )"},
@@ -375,10 +367,13 @@ status 0
 status 0
 )"},
         {{"--targets", "@/a", "@/b"},
-         {{"a/Manual/docdata/index.json", Index(R"(["p%20q.html?x#p","P"])")},
+         {{"a/Manual/docdata/index.json",
+           Index(R"(["p%20q%4Az.html?x#p","P"],["a%41","A"],["100%.html","H"])")},
+          {"a/Manual/a%41", ""},
+          {"a/Manual/100%.html", ""},
           {"a/Manual/docdata/toc.json",
            Toc(R"({"link":"null","title":"N","children":null})", R"("link":"null","title":"")")},
-          {"a/Manual/p q.html", ""},
+          {"a/Manual/p qJz.html", ""},
           {"b/Manual/docdata/index.json", Index(R"(["docdata","D"])")},
           {"b/Manual/docdata/toc.json",
            Toc(R"({"link":"#x","title":"X","children":null},{"link":"q.html#p","title":"Q","children":null})",
@@ -414,10 +409,11 @@ status 0
 status 1
 )"},
         {{"-n", "1", "@/a", "@/b"},
-         {{"b/Manual/docdata/index.json", Index("1,2,3")}},
+         {{"b/Manual/docdata/index.json", Index("1,2,\"\351\"")}},
          R"(@/b/Manual/docdata/index.json:1:11: error: page entry is 1, not [path, title]; "b" will be missing from the search of Manual [structure] /pages/0
+@/b/Manual/docdata/index.json:1:16: warning: byte \xE9 is not UTF-8: readers see a replacement character [invalid-utf8]
 @/b/Manual/docdata/index.json: error: 2 more of this rule; --limit=0 shows all [structure]
-2 modules, 3 errors, 0 warnings; missing from the search of Manual: b
+2 modules, 3 errors, 1 warning; missing from the search of Manual: b
 status 1
 )"},
         {{"--quiet", "@/a", "@/b"},

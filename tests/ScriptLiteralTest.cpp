@@ -50,6 +50,7 @@ TEST(ScriptLiteral, HasTheValueThatAScriptEngineGivesIt)
         {R"("\x41\xe9\u20aC\u{1F600}\u{00000041}")", "A\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80\x41"},
         {R"("\uD83D\uDE00\ud83d\u{de00}")", "\xF0\x9F\x98\x80\xF0\x9F\x98\x80"},
         {R"("\uD83D-\uDE00\uD83D")", "\xED\xA0\xBD-\xED\xB8\x80\xED\xA0\xBD"},
+        {R"("\u{10FFFF}\uDBFF\uDFFF\uD800\uDC00")", "\xF4\x8F\xBF\xBF\xF4\x8F\xBF\xBF\xF0\x90\x80\x80"},
         {R"("\7\18\377\400\60z")", "\7\1\x38\xC3\xBF\x20\x30\x30z"},
         {R"("\08")", std::string("\0\x38", 2)},
         {R"("\"\\" Operator")", kBroken},

@@ -9,10 +9,10 @@
 /// Which checks of a set run, and how much is shown.
 struct SetChecks
 {
-    bool checksTargets = false;
-    bool checksOutputs = false;
-    std::size_t limit = 10;    ///< findings shown per rule and file; 0 for all
-    std::size_t quoteSize = 0; ///< bytes of a text that a message shows
+    bool checksTargets;
+    bool checksOutputs;
+    std::size_t limit;     ///< findings shown per rule and file; 0 for all
+    std::size_t quoteSize; ///< bytes of a text that a message shows
 };
 
 /// Checks one documentation set of all modules: every input, then what a run would make of them together, and

@@ -18,11 +18,11 @@ std::string DescribeMember(const char* name, const char* kind, const Value& valu
                      : member + " is " + DescribeValue(value, quoteSize) + ", not " + kind;
 }
 
-/// Returns "but there are 3 pages" or "but there is 1 page" for the entries of an array of the document.
+/// Returns "but there are 3 pages" or "but there is 1 page" for the entries of an array of the document, which
+/// must be one: otherwise no number is out of its bounds.
 std::string CountEntries(const Value& document, const char* member, const std::string& noun)
 {
-    const Value* const list = FindMember(document, member);
-    const std::size_t count = list != nullptr && list->IsArray() ? list->Size() : 0;
+    const rapidjson::SizeType count = FindMember(document, member)->Size();
     return count == 1 ? "but there is 1 " + noun
                       : "but there are " + std::to_string(count) + " " + noun + "s";
 }

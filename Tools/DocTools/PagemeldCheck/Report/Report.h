@@ -9,10 +9,10 @@
 /// How findings are printed.
 struct ReportForm
 {
-    bool isJson = false;
-    bool showsErrorsOnly = false;
-    bool isColored = false;
-    bool countsWarningsAsErrors = false;
+    bool isJson;
+    bool showsErrorsOnly;
+    bool isColored;
+    bool countsWarningsAsErrors;
 };
 
 /// Collects findings, and prints them in order: by module, set, file and place.
