@@ -3,20 +3,18 @@
 
 The search index has every page below a set directory, with each heading and the first paragraph after it. The contents
 have an entry for the module, its start page, and below it the directories with their pages; or, with --toc, the links
-of a list that the documentation has: a page FILE in each set directory, such as Doxygen's annotated.html, Sphinx's
-contents.html or javadoc's overview-tree.html. Pages that the list leaves out are found only by the search.
+of lists that the documentation has: pages FILE in each set directory, such as Doxygen's pages.html and annotated.html,
+Sphinx's contents.html or javadoc's overview-tree.html. Pages that no list has are found only by the search.
 
 Groups without a page at the top stand beside the module's entry, so that all modules with such a group share it. All
 modules of a set need the same root; by default it has the name of the set directory and leads to index.html.
 
-Paths are as on disk, nothing is percent-encoded; a "#" in a link of the contents begins the fragment. If a page has a
-<main>, what comes before it is skipped. The same pages always give the same files.
+If a page has a <main>, what comes before it is skipped. The same pages always give the same files.
 """
 import argparse
 import collections
 import json
 import os
-import posixpath
 import re
 import sys
 import unicodedata
@@ -36,18 +34,19 @@ SCHEME = re.compile("[a-zA-Z][a-zA-Z0-9+.-]*:")
 HEADINGS = {"h1", "h2", "h3", "h4", "h5", "h6"}
 LISTS = {"ul", "ol"}
 BLOCKS = HEADINGS | LISTS | set("blockquote body dd div dl dt hr li main p pre section table td th title tr".split())
-UNREAD_TAGS = {"nav", "noscript", "script", "style", "template"}
+UNREAD_TAGS = {"nav", "noscript", "script", "style"}
 UNREAD_PARTS = {("a", "headerlink"),  # from Sphinx; the others from Doxygen
-                ("span", "permalink"), ("span", "arrow"), ("span", "icon"), ("ul", "tablist"), ("div", "navpath")}
+                ("span", "permalink"), ("span", "arrow"), ("span", "icon"), ("ul", "tablist"), ("div", "navpath"),
+                ("tr", "inherit")}
+# Doxygen lists members in table rows. A member without a section of its own has no heading: its anchor is in the row.
+READ_PARTS = {("div", "title"): "h1", ("div", "block"): "p", ("div", "textblock"): "p", ("dt", "sig"): "h6",
+              ("td", "fieldname"): "h6", ("td", "memItemRight"): "member", ("td", "memTemplItemRight"): "member",
+              ("td", "inherit_header"): "member", ("td", "mdescRight"): "p"}
 DIRECTORY_PAGES = ("index.html", "index.htm", "package-summary.html")
 
 
-def say(message):
-    print(f"make-docdata.py: {message}", file=sys.stderr)
-
-
 def warn(message):
-    say(f"warning: {message}")
+    print(f"make-docdata.py: warning: {message}", file=sys.stderr)
 
 
 def make_title(text, place):
@@ -57,24 +56,14 @@ def make_title(text, place):
     return title
 
 
-def make_link(path, fragment=""):
-    """Foo:Bar.html would be an address; ./Foo:Bar.html is a path. A fragment that can't be written is left out."""
-    return ("./" if SCHEME.match(path) else "") + path + (
-        "#" + fragment if fragment and not UNWRITABLE.search(fragment) else "")
-
-
-def decode(data, place):
-    if data[:2] in (b"\xff\xfe", b"\xfe\xff"):
-        return data.decode("utf-16", "replace")
+def decode(data):
     try:
         return data.decode()
     except UnicodeDecodeError:
         declared = re.search(rb"""(?:charset|encoding)\s*=\s*["']?\s*([\w.:-]+)""", data[:4096])
-    name = declared[1].decode("ascii", "replace").lower() if declared else "no encoding"
-    try:  # as browsers do, which read ISO 8859-1 as windows-1252
-        return data.decode("cp1252" if name == "iso-8859-1" else name, "replace")
-    except (LookupError, ValueError):
-        warn(f"{place}: is not UTF-8 and declares {name}: read as windows-1252")
+    try:
+        return data.decode(declared[1].decode() if declared else "cp1252", "replace")
+    except LookupError:
         return data.decode("cp1252", "replace")
 
 
@@ -86,21 +75,23 @@ class Page(HTMLParser):
     def __init__(self, html, place):
         super().__init__()
         self.place = place
-        self.title = self.heading = ""
-        self.texts, self.items = [["", ""]], []
+        self.title = ""
+        self.clear()
         self.unread = None  # the tag that is skipped, and how many of it are open
         self.block, self.data = None, ""
         self.item, self.list_depth = None, 0
-        try:
-            self.feed(html)
-            self.close()
-        except AssertionError as error:  # a declaration that the parser can't read
-            warn(f"{place}: read in part: {error}")
+        self.anchored = False  # whether there was an anchor after the last heading or member
+        self.feed(html)
+        self.close()
         self.end_block()
+
+    def clear(self):
+        self.heading, self.text, self.items = "", ["", ""], []
+        self.texts = [self.text]
 
     def handle_starttag(self, tag, attributes):
         attributes = {name: value or "" for name, value in attributes}
-        classes = set(attributes.get("class", "").split())
+        classes = attributes.get("class", "").split()
         if tag == "br":
             self.handle_data(" ")
         elif self.unread:
@@ -110,21 +101,21 @@ class Page(HTMLParser):
             self.unread = [tag, 1]
         else:
             if tag == "main" or attributes.get("role") == "main":
-                self.heading, self.texts, self.items = "", [["", ""]], []
+                self.clear()
             self.start_block(tag, attributes, classes)
             self.start_item(tag, attributes, classes)
 
     def start_block(self, tag, attributes, classes):
         if tag in BLOCKS:
             self.end_block()
-        if tag == "div" and "title" in classes:
-            self.block = "h1"
+        if tag in HEADINGS | {"p", "title"}:
+            self.block = tag
         elif tag == "dt" and "id" in attributes:
             self.block = "h6"
-        elif tag in HEADINGS | {"p", "title"}:
-            self.block = tag
-        elif tag == "div" and classes & {"block", "textblock"}:
-            self.block = "p"
+        elif tag == "a" and "id" in attributes:
+            self.anchored = True
+        for name in classes:
+            self.block = READ_PARTS.get((tag, name), self.block)
 
     def start_item(self, tag, attributes, classes):
         row = attributes.get("id", "") if tag == "tr" else ""
@@ -159,41 +150,62 @@ class Page(HTMLParser):
         self.block, self.data = None, ""
         if block == "title":
             self.title = self.title or text
-        elif block in HEADINGS and text:
-            self.texts.append([text, ""])
+        elif block == "member" or block in HEADINGS and text:
+            self.text = [text, ""]
+            if block != "member" or self.anchored:
+                self.texts.append(self.text)
             self.heading = self.heading or (text if block == "h1" else "")
+            self.anchored = False
         elif block == "p":
-            self.texts[-1][1] = self.texts[-1][1] or text
+            self.text[1] = self.text[1] or text.removesuffix(" More...")
 
 
 def read_pages(directory):
-    """Returns the pages by path, a directory's own first and its subdirectories last, and the paths of all files."""
-    pages, files = {}, set()
+    """Returns the pages by path, a directory's own first and its subdirectories last."""
+    pages = {}
     for place, directories, names in os.walk(directory):
         directories[:] = sorted(name for name in directories if (place, name) != (directory, "docdata"))
         for name in sorted(names, key=lambda name: (name not in DIRECTORY_PAGES, name)):
-            path = os.path.relpath(os.path.join(place, name), directory)
-            files.add(path)
+            file = os.path.join(place, name)
+            path = os.path.relpath(file, directory)
             if not name.lower().endswith((".html", ".htm", ".xhtml")):
                 continue
             if UNWRITABLE.search(path):
-                warn(f"{ascii(os.path.join(place, name))}: left out: the scripts can't hold its path")
+                warn(f"{ascii(file)}: left out: the scripts can't hold its path")
                 continue
             try:
-                with open(os.path.join(place, name), "rb") as file:
-                    pages[path] = Page(decode(file.read(), file.name), file.name)
-            except OSError as error:
-                warn(f"left out: {error}")
-    choose_titles(pages)
-    return pages, files
+                with open(file, "rb") as stream:
+                    pages[path] = Page(decode(stream.read()), file)
+            except (OSError, AssertionError) as error:  # the parser asserts what it can't read
+                warn(f"{file}: left out: {error}")
+    return pages
 
 
-def choose_titles(pages):
-    """A <title> that several pages share does not identify a page: then the main heading is better."""
-    uses = collections.Counter(page.title for page in pages.values())
+def find_frame(pages):
+    """Returns what most titles have before and after their subject, such as "Project: " by Doxygen or " \u2014 Project
+    documentation" by Sphinx. The titles that contain the main heading of their page show it."""
+    titles = {page.title for page in pages.values()}
+    frames = {page.title.partition(page.heading)[::2] for page in pages.values()
+              if page.heading and page.heading in page.title}
+    best, most = ("", ""), len(titles) / 2
+    for before, after in sorted(frames - {best}):
+        count = sum(title.startswith(before) and title.endswith(after) for title in titles)
+        if count > most:
+            best, most = (before, after), count
+    return best
+
+
+def choose_titles(pages, start):
+    """Shortens each <title> to its subject. That of the start page, such as "Main Page", does not say of which module,
+    and one that several pages share does not say which page: then the main heading is better."""
+    before, after = find_frame(pages)
+    subjects = {path: page.title.removeprefix(before).removesuffix(after) for path, page in pages.items()}
+    uses = collections.Counter(subjects.values())
     for path, page in pages.items():
-        title = page.title if page.title and uses[page.title] == 1 else page.heading or page.title
-        page.title = make_title(title or path, page.place)
+        subject = subjects[path]
+        if uses[subject] > 1 or path == start and subject != page.title:
+            subject = page.heading or subject
+        page.title = make_title(subject or page.heading or path, page.place)
 
 
 def make_index(pages):
@@ -202,13 +214,12 @@ def make_index(pages):
         texts = [" \u2013 ".join(part for part in text if part and part != page.title) for text in page.texts]
         extra = page.title
         for text in list(filter(None, texts)) or [page.title]:
-            # In an object literal, __proto__ sets the prototype and adds no member.
-            words = set(WORD.findall(f"{extra} {text}".lower())) - COMMON.keys() - {"__proto__"}
+            words = set(WORD.findall(f"{extra} {text}".lower())) - COMMON.keys()
             extra = ""
             for word in words:
                 terms.setdefault(word, []).append(len(info))
             info += [[text, number]] if words else []
-    return {"pages": [[make_link(path), page.title] for path, page in pages.items()],
+    return {"pages": [[path, page.title] for path, page in pages.items()],
             "info": info, "common": COMMON, "searchIndex": dict(sorted(terms.items()))}
 
 
@@ -220,38 +231,38 @@ def list_directories(pages, start):
         rows += [(depth, "null", parent) for depth, parent in enumerate(parents, 1)
                  if parents[:depth] != last_parents[:depth]]
         if parents != last_parents and name in DIRECTORY_PAGES:
-            rows[-1] = (len(parents), make_link(path), page.title)
+            rows[-1] = (len(parents), path, page.title)
         elif path != start:
-            rows.append((len(parents) + 1, make_link(path), page.title))
+            rows.append((len(parents) + 1, path, page.title))
         last_parents = parents
     return rows
 
 
-def resolve(address, base, files):
+def resolve(address, base, pages):
     """Returns path and fragment of an address in the page base; the path is empty if it leads out of the set."""
     place, _, fragment = address.strip().partition("#")
     place = unquote(place.partition("?")[0])
-    path = posixpath.normpath(posixpath.join(posixpath.dirname(base), place)) if place else base
+    path = os.path.normpath(os.path.join(os.path.dirname(base), place)) if place else base
     if SCHEME.match(address) or path.startswith(("..", "/")):
         return "", ""
-    own = posixpath.normpath(f"{path}/index.html")
-    return own if path not in files and own in files else path, unquote(fragment)
+    own = os.path.normpath(f"{path}/index.html")
+    return own if own in pages else path, unquote(fragment)
 
 
-def list_links(pages, files, base):
+def list_links(pages, base):
     """Returns the list items of the page base as rows; those that lead to no page of the set are "null"."""
     rows, missing = [], set()
     for depth, address, text, start in pages[base].items:
-        path, fragment = resolve(address or "//", base, files)
+        path, fragment = resolve(address or "//", base, pages)
         title = make_title(" ".join(text[start if path in pages else 0:].split()), pages[base].place)
         if path in pages:
-            rows.append((depth, make_link(path, fragment), title or pages[path].title))
+            link = f"{path}#{fragment}" if fragment and not UNWRITABLE.search(fragment) else path
+            rows.append((depth, link, title or pages[path].title))
         else:
             rows.append((depth, "null", title))
-        if path and path not in files:
             missing.add(path)
-    for path in sorted(missing):
-        warn(f"{pages[base].place}: links to {ascii(path)}, which does not exist, are left out")
+    for path in sorted(missing - {""}):
+        warn(f"{pages[base].place}: links to {ascii(path)}, which is not a page of the set, are left out")
     return rows
 
 
@@ -262,44 +273,50 @@ def take_nodes(rows, above):
         depth, link, title = rows.pop()
         children = take_nodes(rows, depth)
         if link != "null" or children:
-            nodes.append({"link": link, "title": title, "children": children})
-    return nodes or None
+            nodes.append({"link": link, "title": title, "children": children or None})
+    return nodes
 
 
-def make_contents(root, module, rows):
-    nodes = take_nodes(rows[::-1], 0) or []
+def list_contents(pages, lists, start, directory):
+    """Returns the rows of each list that there is, or those of the directories if there is none."""
+    instead = "" if pages.keys() & set(lists) else ": the contents are made from the directories"
+    for path in lists:
+        if path not in pages:
+            warn(f"{directory}: there is no page {path}{instead}")
+    return [list_links(pages, path) for path in lists if path in pages] or [list_directories(pages, start)]
+
+
+def make_contents(root, module, row_lists):
+    nodes = [node for rows in row_lists for node in take_nodes(rows[::-1], 0)]
     module["children"] = [node for node in nodes if node["link"] != "null"] or None
     return {**root, "children": [node for node in nodes if node["link"] == "null"] + [module]}
 
 
-def make_docdata(directory, root, list_page):
-    """Returns the values of both files. The root is its link and title."""
-    pages, files = read_pages(directory)
+def make_docdata(directory, root, lists):
+    """Returns the values of both files. The root is its link and title; lists are paths of pages."""
+    start = root["link"]
+    pages = read_pages(directory)
+    choose_titles(pages, start)
     module = {"link": "null", "title": make_title(os.path.basename(os.path.dirname(directory)), directory)}
-    if root["link"] in pages:
-        module = {"link": root["link"], "title": pages[root["link"]].title}
+    if start in pages:
+        module = {"link": start, "title": pages[start].title}
     else:
-        warn(f"{directory}: there is no page {root['link']}, where the root of the contents leads")
-    if list_page in pages:
-        rows = list_links(pages, files, list_page)
-    else:
-        rows = list_directories(pages, root["link"])
-        if list_page:
-            warn(f"{directory}: there is no page {list_page}: the contents are made from the directories")
+        warn(f"{directory}: there is no page {start}, where the root of the contents leads")
+    contents = make_contents(root, module, list_contents(pages, lists, start, directory))
     index = make_index(pages)
-    say(f"{directory}: {len(pages)} pages, {len(index['info'])} texts, {len(index['searchIndex'])} terms")
-    return {"index.json": index, "toc.json": make_contents(root, module, rows)}
+    print(f"make-docdata.py: {directory}: {len(pages)} pages, {len(index['info'])} texts, "
+          f"{len(index['searchIndex'])} terms", file=sys.stderr)
+    return {"index.json": index, "toc.json": contents}
 
 
 def main():
     parser = argparse.ArgumentParser(description="Makes index.json and toc.json from HTML pages.")
     parser.add_argument("--root-title", metavar="T", help="default: the name of the set directory")
     parser.add_argument("--root-link", metavar="L", default="index.html", help="default: %(default)s")
-    parser.add_argument("--toc", metavar="FILE", help="page in each set directory whose lists are the contents")
+    parser.add_argument("--toc", metavar="FILE", action="append", default=[],
+                        help="page in each set directory whose lists are contents; several are allowed")
     parser.add_argument("set_directories", metavar="SET_DIRECTORY", nargs="+")
     options = parser.parse_args()
-    if UNWRITABLE.search(options.root_link):
-        parser.error("the scripts can't hold this root link")
     for directory in options.set_directories:
         if not os.path.isdir(directory):
             parser.error(f"{directory} is not a directory")

@@ -8,30 +8,46 @@ import unittest
 
 SCRIPT = sys.argv.pop(1)
 PAGES = {
-    "index.html": """<title>Start</title><h1>Site</h1><main><nav><h2>Here</h2></nav><h1>Start</h1>
-        <p>The <b>first</b><br>paragraph.<p>No other.
-        <ul><li>Group<ul><li><a href="a%20b.html#caf%C3%A9">Café</a><li><a href="./Foo%3ABar.html">Path</a></ul>
+    "index.html": """<title>Lib: Main Page (1.0)</title><h1>Site</h1><main><nav><h2>Here</h2></nav><h1>Start</h1>
+        <p>The <b>first</b><br>paragraph. <a href="#details">More...</a><p>No other.
+        <ul><li>Group<ul><li><a href="a%20b.html#caf%C3%A9">Café</a><li><a href="./Foo.html">Path</a></ul>
         <li><a href="sub/#&quot;">C:\\new</a><li><a href="ftp://x/">Away</a>
-        <li><a href="gone.html">Gone</a><li><a href="gone.html#x">Gone</a></ul>
-        <tr id="row_0_"><td><span class="arrow">v</span>ns</td><tr id="row_0_0_"><td><a href="latin.htm">Class</a>""",
-    "Foo:Bar.html": "<title>Same</title><h1>By “heading”</h1><h2>__proto__</h2><dl><dt id=x>नमस्ते x_1</dt><dd><p>It.",
+        <li><a href="gone.html">Gone</a><li><a href="gone.html#x">Gone</a></ul>""",
+    "Foo.html": """<title>Lib: Same (1.0)</title><h1>By “heading”</h1><dt id=x>नमस्ते x_1</dt><dd><p>It.
+        <dt class="py sig">y()<tr id="row_0_"><td><span class="arrow">v</span>ns</td>
+        <tr id="row_0_0_"><td><a href="latin.htm">Class</a><tr id="row_1_"><td><a href="sub/">Again</a>""",
     "a b.html": b"<meta charset=koi8-r><p>\xcd\xc9\xd2",
-    "latin.htm": b"<title>\xe9t\xe9</title><![odd]><p>not read",
-    "sub/index.html": "<title>Same</title><h1>C:\\new\0</h1><p>İki \\o/",
-    "sub/w%41?.html": '\ufeff<title>Wide "quotes"</title>'.encode("utf-16-le"),
+    "latin.htm": b"<title>Lib: \xe9t\xe9 (1.0)</title>",
+    "members.html": """<title>Lib: Gauge Class (1.0)</title><div class="title">Gauge Class</div>
+        <tr><td class="memItemLeft"><a id="r"></a>void <td class="memItemRight"><b>read</b> (int n)</td></tr>
+        <tr><td class="mdescRight">Reads.<br></td></tr>
+        <tr><td class="memItemLeft"><a href="x">T</a> <td class="memItemRight"><a href="#s">link</a> ()
+        <tr><td class="mdescRight">Has a heading. <a href="#s">More...</a></td></tr>
+        <tr><td><h2><a id="all"></a>Gauge Class</h2></td></tr>
+        <tr><td class="inherit_header">From Base</td></tr><tr><td class="mdescRight">An enum of Base.</td></tr>
+        <tr class="memitem:p inherit"><td class="memItemLeft"><a id="p"></a><td class="memItemRight">parent ()</td></tr>
+        <tr><td class="memTemplParams"><a id="t"></a>template<tr><td class="memTemplItemRight">make ()</td></tr>
+        <tr><td class="fieldname"><a id="f"></a>red&#160;</td><td class="fielddoc"><p>Rouge.</p></td></tr>""",
+    "odd.html": "<![odd]>",
+    "sub/index.html": "<title>Lib: Same (1.0)</title><h1>C:\\new\0</h1><p>İki \\o/",
+    "plain.html": "<title>Plain</title><h1>Plain</h1>",
+    "sub/w%41?.html": '<title>Wide "quotes"</title><h1>"quotes"</h1>',
     'quote".html': "", "sharp#.html": "", "line\n.html": "", "back\\slash.html": "", b"bytes\xff.html": "",
     "docdata/old.html": "", "picture.png": "",
 }
 INDEX = {
-    "pages": [["index.html", "Start"], ["./Foo:Bar.html", "By “heading”"], ["a b.html", "a b.html"],
-              ["latin.htm", "été"], ["sub/index.html", "C:∖new␀"], ["sub/w%41?.html", 'Wide "quotes"']],
-    "info": [["The first paragraph.", 0], ["__proto__", 1], ["नमस्ते x_1 – It.", 1], ["мир", 2], ["été", 3],
-             ["C:\\new\0 – İki \\o/", 4], ['Wide "quotes"', 5]],
+    "pages": [["index.html", "Start"], ["Foo.html", "By “heading”"], ["a b.html", "a b.html"], ["latin.htm", "été"],
+              ["members.html", "Gauge Class"], ["plain.html", "Plain"],
+              ["sub/index.html", "C:∖new␀"], ["sub/w%41?.html", 'Wide "quotes"']],
+    "info": [["The first paragraph.", 0], ["नमस्ते x_1 – It.", 1], ["y()", 1], ["мир", 2], ["été", 3],
+             ["read (int n) – Reads.", 4], ["make ()", 4], ["red – Rouge.", 4], ["Plain", 5],
+             ["C:\\new\0 – İki \\o/", 6], ['"quotes"', 7]],
     "common": dict.fromkeys(
         "a an and are as at be by for from has in is it its of on one or that the to with".split(), 1),
-    "searchIndex": {"b": [3], "c": [5], "first": [0], "heading": [1], "html": [3], "i̇ki": [5], "new": [5], "o": [5],
-                    "paragraph": [0], "quotes": [6], "start": [0], "wide": [6], "x_1": [2], "été": [4], "мир": [3],
-                    "नमस्ते": [2]},
+    "searchIndex": {"b": [3], "c": [9], "class": [5], "first": [0], "gauge": [5], "heading": [1], "html": [3],
+                    "int": [5], "i̇ki": [9], "make": [6], "n": [5], "new": [9], "o": [9], "paragraph": [0],
+                    "plain": [8], "quotes": [10], "read": [5], "reads": [5], "red": [7], "rouge": [7], "start": [0],
+                    "wide": [10], "x_1": [1], "y": [2], "été": [4], "мир": [3], "नमस्ते": [1]},
 }
 
 
@@ -39,24 +55,25 @@ def node(link, title, *children):
     return {"link": link, "title": title, "children": list(children) or None}
 
 
-FROM_LIST = node("index.html", "All",
-                 node("null", "Group", node("a b.html#café", "Café"), node("./Foo:Bar.html", "Path")),
-                 node("null", "ns", node("latin.htm", "Class")),
-                 node("index.html", "Start", node("sub/index.html", "C:∖new")))
+FROM_LISTS = node("index.html", "All",
+                  node("null", "Group", node("a b.html#café", "Café"), node("Foo.html", "Path")),
+                  node("null", "ns", node("latin.htm", "Class")),
+                  node("index.html", "Start", node("sub/index.html", "C:∖new"), node("sub/index.html", "Again")))
 FROM_DIRECTORIES = node("index.html", "Set", node(
-    "index.html", "Start", node("./Foo:Bar.html", "By “heading”"), node("a b.html", "a b.html"),
-    node("latin.htm", "été"), node("sub/index.html", "C:∖new␀", node("sub/w%41?.html", 'Wide "quotes"'))))
+    "index.html", "Start", node("Foo.html", "By “heading”"), node("a b.html", "a b.html"), node("latin.htm", "été"),
+    node("members.html", "Gauge Class"), node("plain.html", "Plain"),
+    node("sub/index.html", "C:∖new␀", node("sub/w%41?.html", 'Wide "quotes"'))))
 # Of the files in the order in which they are read, then of titles and links.
 WARNINGS = """'back\\\\slash.html': left out: the scripts can't hold its path
 'bytes\\udcff.html': left out: the scripts can't hold its path
-latin.htm: is not UTF-8 and declares no encoding: read as windows-1252
-latin.htm: read in part: unknown status keyword 'odd' in marked section
 'line\\n.html': left out: the scripts can't hold its path
+odd.html: left out: unknown status keyword 'odd' in marked section
 'quote".html': left out: the scripts can't hold its path
 'sharp#.html': left out: the scripts can't hold its path
 sub/index.html: what would break the scripts is replaced in the title "C:∖new␀"
+Set: there is no page none.html
 index.html: what would break the scripts is replaced in the title "C:∖new"
-index.html: links to 'gone.html', which does not exist, are left out""".split("\n")
+index.html: links to 'gone.html', which is not a page of the set, are left out""".split("\n")
 
 
 class MakeDocdata(unittest.TestCase):
@@ -78,15 +95,16 @@ class MakeDocdata(unittest.TestCase):
         for name in ("index.json", "toc.json"):
             with open(os.path.join(self.directory, "docdata", name), encoding="utf-8") as file:
                 texts.append(file.read())
-        return texts, run.stderr.decode().replace(self.directory + "/", "").splitlines()
+        return texts, run.stderr.decode().replace(self.directory + "/", "").replace(self.directory, "Set").splitlines()
 
     def test_writes_index_and_contents_and_says_what_it_left_out_or_replaced(self):
-        (index, contents), said = self.make("--toc", "index.html", "--root-title", "All")
+        (index, contents), said = self.make("--toc", "index.html", "--toc", "none.html", "--toc", "Foo.html",
+                                            "--root-title", "All")
         self.assertEqual(INDEX, json.loads(index))
         self.assertEqual(list(INDEX["searchIndex"]), list(json.loads(index)["searchIndex"]))
-        self.assertEqual(FROM_LIST, json.loads(contents))
+        self.assertEqual(FROM_LISTS, json.loads(contents))
         self.assertEqual(["make-docdata.py: warning: " + warning for warning in WARNINGS], said[:-1])
-        self.assertEqual(f"make-docdata.py: {self.directory}: 6 pages, 7 texts, 16 terms", said[-1])
+        self.assertEqual("make-docdata.py: Set: 8 pages, 11 texts, 27 terms", said[-1])
 
     def test_same_pages_give_same_bytes(self):
         self.assertEqual(self.make()[0], self.make()[0])
