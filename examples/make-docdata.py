@@ -63,7 +63,7 @@ def decode(data):
         declared = re.search(rb"""(?:charset|encoding)\s*=\s*["']?\s*([\w.:-]+)""", data[:4096])
     try:
         return data.decode(declared[1].decode() if declared else "cp1252", "replace")
-    except LookupError:
+    except (LookupError, ValueError):  # of no such encoding, or not for texts
         return data.decode("cp1252", "replace")
 
 
@@ -185,14 +185,12 @@ def find_frame(pages):
     """Returns what most titles have before and after their subject, such as "Project: " by Doxygen or " \u2014 Project
     documentation" by Sphinx. The titles that contain the main heading of their page show it."""
     titles = {page.title for page in pages.values()}
-    frames = {page.title.partition(page.heading)[::2] for page in pages.values()
-              if page.heading and page.heading in page.title}
-    best, most = ("", ""), len(titles) / 2
-    for before, after in sorted(frames - {best}):
-        count = sum(title.startswith(before) and title.endswith(after) for title in titles)
-        if count > most:
-            best, most = (before, after), count
-    return best
+    frames = collections.Counter(page.title.partition(page.heading)[::2] for page in pages.values()
+                                 if page.heading and page.heading in page.title and page.heading != page.title)
+    for (before, after), _ in frames.most_common(1):
+        if 2 * sum(title.startswith(before) and title.endswith(after) for title in titles) > len(titles):
+            return before, after
+    return "", ""
 
 
 def choose_titles(pages, start):
