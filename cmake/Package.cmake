@@ -4,13 +4,13 @@ set(CPACK_GENERATOR DEB)
 set(CPACK_PACKAGE_NAME pagemeld)
 set(CPACK_PACKAGE_DESCRIPTION_SUMMARY "combines the search and contents of documentation modules")
 set(CPACK_PACKAGE_DESCRIPTION
-    "Pagemeld joins documentation modules that are built separately. It reads the
-search index and the table of contents of each, merges them, and writes the
-result into every module as JSON and as scripts, so that each page can search
-and browse all modules, from a web server or from a directory on disk.
+    "Pagemeld joins manuals that are built separately, by Doxygen, Sphinx, javadoc
+or anything else that makes HTML. It merges their search indexes and tables of
+contents: readers search and browse all of them from any page, on a web server
+or from a directory on disk.
 
-A checker reports beforehand what would go wrong and where. A CMake function runs
-both in a build.")
+A checker reports beforehand what would go wrong and where. A CMake function
+runs both in a build.")
 set(CPACK_STRIP_FILES ON)
 set(CPACK_PRE_BUILD_SCRIPTS ${PROJECT_SOURCE_DIR}/packaging/prepare.cmake)
 set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)

@@ -18,8 +18,8 @@ std::string DescribeMember(const char* name, const char* kind, const Value& valu
                      : member + " is " + DescribeValue(value, quoteSize) + ", not " + kind;
 }
 
-/// Returns "but there are 3 pages" or "but there is 1 page" for the entries of an array of the document, which
-/// must be one: otherwise no number is out of its bounds.
+/// Returns "but there are 3 pages" or "but there is 1 page" for the entries of an array of the document,
+/// which must be one: otherwise no number is out of its bounds.
 std::string CountEntries(const Value& document, const char* member, const std::string& noun)
 {
     const rapidjson::SizeType count = FindMember(document, member)->Size();
