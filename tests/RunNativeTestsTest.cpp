@@ -35,7 +35,9 @@ std::string RunWithPlaceholders(Arguments&&... arguments)
 void PrintAndLog()
 {
     EXPECT_NE(nullptr, Testing::g_TestReporter);
+    const int assertCount = Testing::g_AssertCountBeforeTests;
     EXPECT_FALSE(IsNativeTestExpectingAssertionFailure("any text"));
+    EXPECT_EQ(assertCount + 1, Testing::g_AssertCountBeforeTests);
     printf_console("swallowed\n");
     DebugStringToFile({"swallowed too", LogType::Error, "file", 1});
 }

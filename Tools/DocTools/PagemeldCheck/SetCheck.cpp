@@ -25,12 +25,6 @@ bool IsThere(const std::string& path)
     return ::lstat(path.c_str(), &status) == 0 || errno == EACCES;
 }
 
-bool IsRegularFile(const std::string& path)
-{
-    struct stat status = {};
-    return ::stat(path.c_str(), &status) == 0 && S_ISREG(status.st_mode);
-}
-
 /// Checks one set. Each step uses what the steps before it found out.
 class SetCheck
 {
@@ -98,14 +92,14 @@ private:
     {
         const SetModule& module = m_modules[i];
         const std::string path = PathOf(module, kind);
-        if (!IsRegularFile(path))
+        InputFacts facts =
+            CheckInput(kind, {i, m_set, path, m_checks.limit, m_checks.quoteSize}, NameOfRoot(module.root),
+                       {m_checks.checksTargets, module.path.Text()}, m_report);
+        if (facts.state == InputFacts::State::Unreadable && !IsThere(path))
         {
-            InputFacts facts;
-            facts.state = IsThere(path) ? InputFacts::State::Unreadable : InputFacts::State::Missing;
-            return facts;
+            facts.state = InputFacts::State::Missing;
         }
-        return CheckInput(kind, {i, m_set, path, m_checks.limit, m_checks.quoteSize}, NameOfRoot(module.root),
-                          {m_checks.checksTargets, module.path.Text()}, m_report);
+        return facts;
     }
 
     void ReportUnreadable(std::size_t i, InputKind kind)
