@@ -48,7 +48,7 @@ std::string RootOf(const Value& toc)
     return std::string(toc["link"].GetString()) + '\0' + toc["title"].GetString();
 }
 
-/// Returns the roots whose texts the tool refuses, or whose contents it drops for another root.
+/// Returns the roots whose texts the tool refuses, or whose contents it drops because their root differs.
 MissingModules Refused(const std::vector<std::string>& files, const std::vector<std::string>& roots)
 {
     MissingModules refused;

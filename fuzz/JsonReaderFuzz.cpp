@@ -5,8 +5,8 @@
 #include <algorithm>
 #include <cmath>
 
-// What the reader accepts is what the library accepts, within our limits, and reads back equal from what the
-// writers make of it.
+// The reader accepts exactly what the library accepts within our limits; what is written and read again is
+// equal.
 
 namespace
 {

@@ -139,8 +139,7 @@ private:
     std::vector<rapidjson::Document> m_findings;
 };
 
-/// The modules whose names begin or end a page path of the combined index, or a link of the combined
-/// contents.
+/// Returns the modules whose names occur in the file.
 Names NamesIn(const std::string& path)
 {
     const std::string text = ReadFile(path);

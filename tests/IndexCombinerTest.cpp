@@ -75,8 +75,8 @@ TEST(IndexCombiner, MergesAsALinearSearchWould)
 
 TEST(IndexCombiner, ManyTermsKeepTheirOrderAndNumbers)
 {
-    constexpr int kTerms =
-        100'000; // of each module, half of them in both; the object changes its memory between
+    // For each module, half of them in both. On the way the object moves to a pool of its own.
+    constexpr int kTerms = 100'000;
     std::vector<std::string> modules;
     for (const int first : {0, kTerms / 2})
     {

@@ -130,7 +130,7 @@ status 1
 )"},
         {{"@/a/Manual"},
          {},
-         R"(@/a/Manual: error: has neither Manual/docdata nor ScriptReference/docdata: nothing will be combined [no-modules]
+         R"(@/a/Manual: error: neither Manual/docdata nor ScriptReference/docdata is found in it: nothing will be combined [no-modules]
 1 module, 1 error, 0 warnings
 status 1
 )"},
@@ -173,7 +173,7 @@ status 1
 )"},
         {{"docs/m1", "docs/m12", "docs/m2/", R"(docs/a\b)"},
          {},
-         R"(docs/m1: error: has neither Manual/docdata nor ScriptReference/docdata, nor has any other root: nothing will be combined [no-modules]
+         R"(docs/m1: error: neither Manual/docdata nor ScriptReference/docdata is found in it, nor in any other root: nothing will be combined [no-modules]
 docs/m1: error: links to docs/a\b will lead to docs/a/b/Manual: rename the directory [wrong-link-path]
 docs/m12: error: links to docs/m1 and 1 more will lead to docs/m12/Manual: one name begins with the other: rename one [wrong-link-path]
 docs/m2/: error: links to docs/m1 and 2 more will lead to m1/Manual: give the roots without a slash at the end [wrong-link-path]
@@ -183,7 +183,7 @@ status 1
 )"},
         {{"/m1", "/m2"},
          {},
-         R"(/m1: error: has neither Manual/docdata nor ScriptReference/docdata, nor has any other root: nothing will be combined [no-modules]
+         R"(/m1: error: neither Manual/docdata nor ScriptReference/docdata is found in it, nor in any other root: nothing will be combined [no-modules]
 2 modules, 1 error, 0 warnings
 status 1
 )"},
@@ -489,7 +489,7 @@ status 1
 )"},
         {{"@/a/Manual/docdata/toc.json", "@/nowhere", ""},
          {},
-         R"(@/a/Manual/docdata/toc.json: error: has neither Manual/docdata nor ScriptReference/docdata, nor has any other root: nothing will be combined [no-modules]
+         R"(@/a/Manual/docdata/toc.json: error: neither Manual/docdata nor ScriptReference/docdata is found in it, nor in any other root: nothing will be combined [no-modules]
 3 modules, 1 error, 0 warnings
 status 1
 )"},

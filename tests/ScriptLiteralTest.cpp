@@ -12,7 +12,7 @@ namespace
 
 const std::string kBroken = "\xFE"; // no value holds this byte
 
-/// The value of a literal, which is whole if it can be the name of a property as well.
+/// The value of a literal. Evaluates it as the name of a property too, which fails if it ends early.
 constexpr const char* kValueInNode = R"(
     const vm = require('vm');
     const surrogate = c => Buffer.of(0xE0 | c >> 12, 0x80 | c >> 6 & 0x3F, 0x80 | c & 0x3F);

@@ -5,8 +5,8 @@
 #include <numeric>
 #include <string>
 
-/// The expected values come from an implementation in another language, which gives the published example of
-/// SipHash-2-4 when it runs the rounds of that function.
+/// The expected values come from an independent implementation in another language, which gives the published
+/// example of SipHash-2-4 with two and four rounds.
 TEST(SipHash, ReturnsTheReferenceValues)
 {
     const struct

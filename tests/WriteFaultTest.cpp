@@ -16,7 +16,7 @@ namespace
 
 namespace fs = std::filesystem;
 
-/// Runs pagemeld as a user who may not write where nobody may.
+/// Runs pagemeld without root's right to ignore permissions.
 ProgramResult RunAsOrdinaryUser(const ExampleDocs& docs)
 {
     return ::geteuid() == 0 ? docs.Run({"setpriv", "--bounding-set=-dac_override"}) : docs.Run();

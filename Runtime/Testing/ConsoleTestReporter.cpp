@@ -88,7 +88,7 @@ core::string DescribeReason(const DisabledTestInfo& info)
     return text.empty() ? "No reason given" : text;
 }
 
-core::string DescribeGroup(const DisabledTestInfo& first, std::size_t otherCount)
+core::string DescribeIgnoredGroup(const DisabledTestInfo& first, std::size_t otherCount)
 {
     core::string line =
         Format("[%s] %s", first.details.suiteName, GetDisplayedTestName(first.details).c_str());
@@ -107,7 +107,7 @@ core::string DescribeGroups(const std::vector<DisabledTestInfo>& sortedTests)
         const auto end =
             std::find_if_not(first + 1, sortedTests.end(),
                              [&](const DisabledTestInfo& info) { return ShareLine(*first, info); });
-        lines += DescribeGroup(*first, static_cast<std::size_t>(end - first) - 1);
+        lines += DescribeIgnoredGroup(*first, static_cast<std::size_t>(end - first) - 1);
         first = end;
     }
     return lines;

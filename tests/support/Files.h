@@ -6,7 +6,7 @@
 #include <map>
 #include <string>
 
-/// Returns all bytes of a file; a text that says so if it can't be opened, so that a comparison shows it.
+/// Returns all bytes of a file, or a text that says that it can't be opened.
 inline std::string ReadFile(const std::string& path)
 {
     std::ifstream file(path, std::ios::binary);

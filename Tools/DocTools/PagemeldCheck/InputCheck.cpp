@@ -203,7 +203,7 @@ InputFacts CheckText(InputKind kind, const InputText& text, const FileScope& sco
         facts.rootTitle = CStringOf(*FindMember(document, "title"));
         CheckTocTexts(document, checks, check.Findings());
     }
-    check.Findings().HandTo(report, text.bytes.get(), &document);
+    check.Findings().HandTo(report, text.bytes.get(), document);
     return facts;
 }
 

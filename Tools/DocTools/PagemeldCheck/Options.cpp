@@ -2,6 +2,7 @@
 
 #include "Tools/DocTools/PagemeldCheck/Report/Rules.h"
 
+#include <algorithm>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -16,11 +17,11 @@ constexpr const char* kUsage = R"(Usage: pagemeld-check [OPTION]... ROOT...
 )";
 
 constexpr const char* kOptionsHelp =
-    R"(Tells before a run of pagemeld which input breaks its result, where, and what readers will see.
+    R"(Reports before a run of pagemeld which input breaks its result, where, and what readers will see.
 ROOT is a module as it would be given to pagemeld, as typed.
 
   -d, --discover=DIR   check what "pagemeld -autopaths DIR" would take; also
-                       tell what is passed over
+                       report what is passed over
   -t, --targets        check that pages and contents lead to files that exist
   -o, --outputs        after a run: check that outputs are there, whole,
                        current and equal

@@ -40,14 +40,15 @@ bool IsModule(const std::string& root)
                        });
 }
 
-/// Reports the first root if none is a module. A single one that is not is reported when a set is written.
+/// Reports the first root if none is a module. If only some are not, output-blocked reports each of them in
+/// every set that is written.
 void ReportIfNoneIsModule(const std::vector<std::string>& roots, Report& report)
 {
     if (!roots.empty() && std::none_of(roots.begin(), roots.end(), IsModule))
     {
         report.Add({"no-modules", 0, std::nullopt, roots[0],
-                    std::string("has neither Manual/docdata nor ScriptReference/docdata") +
-                        (roots.size() > 1 ? ", nor has any other root" : "") + ": nothing will be combined"});
+                    std::string("neither Manual/docdata nor ScriptReference/docdata is found in it") +
+                        (roots.size() > 1 ? ", nor in any other root" : "") + ": nothing will be combined"});
     }
 }
 

@@ -34,7 +34,7 @@ bool LeadsToFile(const std::string& directory, const std::string& link)
     return IsFile(directory + "/" + path) || IsFile(directory + "/" + PercentDecoded(path));
 }
 
-/// Whether the link is an address of its own. "std::list.html" is a file.
+/// Whether the link is an absolute URL. "std::list.html" is a file.
 bool IsAddress(std::string_view link)
 {
     return HasScheme(link) && link.substr(link.find(':'), 2) != "::";

@@ -37,8 +37,8 @@ int RunVerification(const char* rootDocPath)
     return kSuccess;
 }
 
-/// Combines both documentation sets. What one of them reports does not keep the other from being combined,
-/// nor does it change the exit status.
+/// Combines both documentation sets. A set that can't be combined does not keep the other from being
+/// combined, nor does it change the exit status.
 int RunCombining(const std::list<std::string>& moduleRoots)
 {
     (void)CombineAllTocAndIndex(moduleRoots, "Manual");

@@ -44,16 +44,30 @@ std::string DescribeEncoding(std::string_view text, std::size_t size)
     return "";
 }
 
+/// Returns how many arrays and objects are open at the end of a text.
+std::size_t CountOpenBrackets(std::string_view text)
+{
+    std::size_t count = 0;
+    bool isInString = false;
+    for (std::size_t i = 0; i < text.size(); ++i)
+    {
+        const char c = text[i];
+        i += isInString && c == '\\' ? 1 : 0;
+        isInString = isInString != (c == '"');
+        count += !isInString && (c == '[' || c == '{') ? 1 : 0;
+        count -= !isInString && (c == ']' || c == '}') ? 1 : 0;
+    }
+    return count;
+}
+
 /// Returns which of the reader's limits the text exceeds at the offset.
 std::string DescribeLimit(std::string_view text, std::size_t offset)
 {
-    const char last = offset > 0 ? text[offset - 1] : '\0';
-    if (offset > 0 && (last == '[' || last == '{') && offset <= text.size())
+    if (CountOpenBrackets(text.substr(0, offset)) > kMaxNestingDepth)
     {
         return "nested deeper than " + std::to_string(kMaxNestingDepth) + " levels";
     }
-    const char first = offset < text.size() ? text[offset] : '\0';
-    return std::strchr("-0123456789", first) != nullptr && first != '\0'
+    return text.substr(offset, 1).find_first_of("-0123456789") == 0
                ? "a number is too large"
                : "a string is longer than " + std::to_string(kMaxStringBytes) + " bytes";
 }

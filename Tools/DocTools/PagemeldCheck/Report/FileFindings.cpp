@@ -9,7 +9,7 @@ void FileFindings::AddAtOffset(const char* rule, std::size_t offset, std::string
     }
 }
 
-void FileFindings::HandTo(Report& report, const char* text, const rapidjson::Value* document)
+void FileFindings::HandTo(Report& report, const char* text, const rapidjson::Value& document)
 {
     Locate(text, document);
     for (Item& item : m_items)
@@ -30,7 +30,7 @@ FileFindings::Item* FileFindings::AddItem(const char* rule)
     return &m_items.emplace_back(Item{{rule, m_scope.module, m_scope.set, m_scope.path, ""}});
 }
 
-void FileFindings::Locate(const char* text, const rapidjson::Value* document)
+void FileFindings::Locate(const char* text, const rapidjson::Value& document)
 {
     std::vector<const rapidjson::Value*> values;
     for (const Item& item : m_items)
@@ -43,7 +43,7 @@ void FileFindings::Locate(const char* text, const rapidjson::Value* document)
     std::vector<ValuePlace> places;
     if (!values.empty())
     {
-        places = LocateValues(text, *document, values);
+        places = LocateValues(text, document, values);
     }
     auto place = places.begin();
     for (Item& item : m_items)

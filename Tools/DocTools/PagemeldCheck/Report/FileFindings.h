@@ -45,8 +45,8 @@ public:
     void AddAtOffset(const char* rule, std::size_t offset, std::string message);
 
     /// Hands all findings to the report, after looking up the lines of those that have a place. document is
-    /// what text holds; null where no finding has a value.
-    void HandTo(Report& report, const char* text, const rapidjson::Value* document);
+    /// what ParseJson made of text.
+    void HandTo(Report& report, const char* text, const rapidjson::Value& document);
 
 private:
     struct Item
@@ -57,7 +57,7 @@ private:
     };
 
     [[nodiscard]] Item* AddItem(const char* rule);
-    void Locate(const char* text, const rapidjson::Value* document);
+    void Locate(const char* text, const rapidjson::Value& document);
     void AddCounts(Report& report) const;
 
     FileScope m_scope;

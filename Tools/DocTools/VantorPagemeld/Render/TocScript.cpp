@@ -102,7 +102,8 @@ void AppendNode(TextBuffer& script, const rapidjson::Value& node, int indent, co
     AppendLineBreak(script, layout);
 }
 
-void AppendList(TextBuffer& script, const rapidjson::Value& list, int indent, const TocScriptLayout& layout)
+void AppendTocNodes(TextBuffer& script, const rapidjson::Value& list, int indent,
+                    const TocScriptLayout& layout)
 {
     for (rapidjson::SizeType i = 0; i < list.Size(); ++i)
     {
@@ -144,7 +145,7 @@ void AppendTocValue(TextBuffer& script, const rapidjson::Value& value, int inden
     }
     else if (value.IsArray())
     {
-        AppendList(script, value, indent, layout);
+        AppendTocNodes(script, value, indent, layout);
     }
 }
 
