@@ -606,6 +606,7 @@ TEST(PagemeldCheck, RefusesUnusableCommandLines)
 TEST(PagemeldCheck, ExplainsEveryRuleInHelpAndOnItsPage)
 {
     const std::string help = RunProgram(PAGEMELD_CHECK_PROGRAM, {"--help"}).standardOutput;
+    EXPECT_EQ(0, RunProgram(PAGEMELD_CHECK_PROGRAM, {"--version"}).status);
     const std::string page = ReadFile(RULES_PAGE);
     std::string expected = page.substr(0, page.find("\n## ") + 1);
     for (const Rule& rule : AllRules())
