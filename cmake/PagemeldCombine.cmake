@@ -34,8 +34,8 @@ also define the targets ``Pagemeld::pagemeld`` and ``Pagemeld::pagemeld-check``.
 
 With ``ROOTS`` or ``DEPENDS`` the target does its work only if something changed: the ``index.json`` or ``toc.json`` of
 a module, what ``DEPENDS`` names, the arguments, the programs, or the page script. With Ninja also if an output of
-``ROOTS`` was removed, for those of ``Manual`` and ``ScriptReference`` whose input files were there, or named in
-``DEPENDS``, when CMake last ran. With ``DISCOVER`` a new module is noticed only by what ``DEPENDS`` names.
+``ROOTS`` was removed, of those documentation sets whose ``index.json`` was there, or named in ``DEPENDS``, when
+CMake last ran. With ``DISCOVER`` a new module is noticed only by what ``DEPENDS`` names.
 
 ``DISCOVER`` alone has nothing to depend on, so the target does its work each time.
 
@@ -78,19 +78,14 @@ function(_pagemeld_list_outputs)
     endif()
     set(outputs)
     foreach(set IN ITEMS Manual ScriptReference)
-        set(is_used FALSE)
-        set(of_set)
         foreach(root IN LISTS roots)
+            # Ninja makes the directories of outputs before the check runs: none may appear in a misspelled root.
             set(input "${root}/${set}/docdata/index.json")
             if(EXISTS "${input}" OR input IN_LIST arg_DEPENDS)
-                set(is_used TRUE)
+                list(TRANSFORM names PREPEND "${root}/${set}/docdata/" OUTPUT_VARIABLE of_module)
+                list(APPEND outputs ${of_module})
             endif()
-            list(TRANSFORM names PREPEND "${root}/${set}/docdata/" OUTPUT_VARIABLE of_module)
-            list(APPEND of_set ${of_module})
         endforeach()
-        if(is_used)
-            list(APPEND outputs ${of_set})
-        endif()
     endforeach()
 
     # Ninja takes only one rule for a file. The target that is chained to it runs after that rule.

@@ -294,6 +294,8 @@ def make_docdata(directory, root, lists):
     """Returns the values of both files. The root is its link and title; lists are paths of pages."""
     start = root["link"]
     pages = read_pages(directory)
+    if not pages:
+        sys.exit(f"make-docdata.py: {directory} has no pages")
     choose_titles(pages, start)
     module = {"link": "null", "title": make_title(os.path.basename(os.path.dirname(directory)), directory)}
     if start in pages:

@@ -106,6 +106,11 @@ class MakeDocdata(unittest.TestCase):
         self.assertEqual(["make-docdata.py: warning: " + warning for warning in WARNINGS], said[:-1])
         self.assertEqual("make-docdata.py: Set: 8 pages, 11 texts, 27 terms", said[-1])
 
+    def test_writes_nothing_without_pages(self):
+        with tempfile.TemporaryDirectory() as empty:
+            self.assertEqual(1, subprocess.run([sys.executable, SCRIPT, empty], stderr=subprocess.PIPE).returncode)
+            self.assertEqual([], os.listdir(empty))
+
     def test_same_pages_give_same_bytes(self):
         self.assertEqual(self.make()[0], self.make()[0])
 

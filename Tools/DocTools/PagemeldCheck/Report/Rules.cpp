@@ -17,8 +17,8 @@ constexpr Rule kRules[] = {
      "Give each module once."},
     {"passed-over", Level::Warning, "a directory looks like a module, but --discover does not take it",
      "The module is missing from search and contents, and receives no outputs.",
-     "Move it out of a hidden directory, replace a link by the directory, add Manual/docdata, or give "
-     "the roots by name."},
+     "Rename it if its name begins with a dot, replace a link by the directory, add Manual/docdata, or "
+     "give the roots by name."},
     {"output-blocked", Level::Error, "an output can't be written",
      "For global_index.js the run ends there with status 255, and later modules stay unwritten; any "
      "other output stays as it was.",
