@@ -172,8 +172,8 @@ std::set<std::string> NamesOf(const Value& object)
 }
 
 /// Checks what was read, and returns what it holds.
-InputFacts CheckText(InputKind kind, const InputText& text, const FileScope& scope,
-                     const std::string& moduleName, const TextChecks& checks, Report& report)
+InputFacts CheckInputText(InputKind kind, const InputText& text, const FileScope& scope,
+                          const std::string& moduleName, const TextChecks& checks, Report& report)
 {
     DocumentPool pool;
     rapidjson::Document document(&pool.allocator);
@@ -219,7 +219,7 @@ InputFacts CheckInput(InputKind kind, const FileScope& scope, const std::string&
         facts.state = InputFacts::State::Unreadable;
         return facts;
     }
-    return CheckText(kind, text, scope, moduleName, checks, report);
+    return CheckInputText(kind, text, scope, moduleName, checks, report);
 }
 
 std::vector<ValuePlace> LocateRoot(const std::string& path)

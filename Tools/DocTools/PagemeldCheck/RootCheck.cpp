@@ -91,7 +91,7 @@ struct WrongLinks
     std::string reached; ///< instead of the first; empty if it is not a directory at all
 };
 
-WrongLinks FindWrongLinks(const std::vector<RootPath>& paths, std::size_t from)
+WrongLinks FindWrongLinksFromRoot(const std::vector<RootPath>& paths, std::size_t from)
 {
     WrongLinks wrong;
     for (std::size_t to = 0; to < paths.size(); ++to)
@@ -204,7 +204,7 @@ void CheckRoots(const std::vector<std::string>& roots, Report& report)
                             Visible(roots[*from]) + ": rename the directory"});
             continue;
         }
-        const WrongLinks wrong = FindWrongLinks(paths, i);
+        const WrongLinks wrong = FindWrongLinksFromRoot(paths, i);
         if (wrong.count > 0)
         {
             report.Add({"wrong-link-path", i, std::nullopt, roots[i], DescribeWrongLinks(roots, i, wrong)});

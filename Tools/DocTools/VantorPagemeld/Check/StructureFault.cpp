@@ -6,7 +6,7 @@
 namespace
 {
 
-std::string EscapedName(std::string_view name)
+std::string EscapedPointerName(std::string_view name)
 {
     std::string escaped;
     for (const char c : name)
@@ -44,5 +44,6 @@ std::string JsonPointer::Text() const
 std::string JsonPointer::StepText() const
 {
     const auto* const element = std::get_if<rapidjson::SizeType>(&m_step);
-    return element != nullptr ? std::to_string(*element) : EscapedName(std::get<std::string_view>(m_step));
+    return element != nullptr ? std::to_string(*element)
+                              : EscapedPointerName(std::get<std::string_view>(m_step));
 }
