@@ -403,7 +403,7 @@ status 0
 @/a/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module can't use it [output-missing]
 @/b/Manual/docdata/global_index.js: error: is older than an input of the set: readers see an earlier build [output-stale]
 @/b/Manual/docdata/global_toc.js: error: is cut short or broken: readers of the module can't use it [output-broken]
-@/b/Manual/docdata/global_toc.js.tmp: error: a temporary file was left behind: a run was ended, and the output beside it may be old [leftover]
+@/b/Manual/docdata/global_toc.js.tmp: error: a temporary file is left over: a run was ended, and the output beside it may be old [leftover]
 @/b/Manual/docdata/global_toc.json: error: has other content than in @/a: a run ended early, and readers find different things [output-differs]
 2 modules, 7 errors, 0 warnings
 status 1

@@ -5,7 +5,7 @@
 #include <string_view>
 
 // Conversions of text, and comparisons that ignore case. Only the ASCII letters have a case here; all
-// other bytes stand for themselves.
+// other bytes are kept.
 
 /// Returns what printf would print.
 core::string Format(const char* format, ...) __attribute__((format(printf, 1, 2)));

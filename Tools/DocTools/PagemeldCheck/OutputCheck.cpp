@@ -238,7 +238,7 @@ void CheckLeftovers(std::size_t set, const std::vector<SetModule>& modules, Repo
             if (S_ISREG(ModeOf(path)))
             {
                 report.Add({"leftover", i, set, path,
-                            "a temporary file was left behind: a run was ended, and the output beside it may "
+                            "a temporary file is left over: a run was ended, and the output beside it may "
                             "be old"});
             }
         }

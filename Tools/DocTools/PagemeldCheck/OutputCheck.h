@@ -12,5 +12,5 @@ void CheckWritable(std::size_t set, const std::vector<SetModule>& modules, Repor
 /// Reports outputs of a set that are missing, cut, older than an input or different from the first whole one.
 void CheckOutputs(std::size_t set, const std::vector<SetModule>& modules, Report& report);
 
-/// Reports temporary files that were left behind.
+/// Reports temporary files that are left over.
 void CheckLeftovers(std::size_t set, const std::vector<SetModule>& modules, Report& report);

@@ -83,7 +83,7 @@ constexpr Rule kRules[] = {
      "Run pagemeld again, and look at its exit status."},
     {"output-stale", Level::Error, "--outputs: an output is older than an input of the set",
      "Readers see the result of an earlier build.", "Run pagemeld again."},
-    {"leftover", Level::Error, "--outputs: a temporary file was left behind",
+    {"leftover", Level::Error, "--outputs: a temporary file is left over",
      "A run was ended, or could not rename the file: the output beside it may be old.",
      "Run pagemeld again; remove a directory that has the output's name."},
 };
