@@ -15,7 +15,7 @@ set(CPACK_STRIP_FILES ON)
 set(CPACK_PRE_BUILD_SCRIPTS ${PROJECT_SOURCE_DIR}/packaging/prepare.cmake)
 set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
-set(CPACK_DEBIAN_PACKAGE_RECOMMENDS python3) # examples/make-docdata.py
+set(CPACK_DEBIAN_PACKAGE_DEPENDS python3) # pagemeld-docdata
 set(CPACK_DEBIAN_PACKAGE_SECTION devel)
 set(CPACK_DEBIAN_PACKAGE_MAINTAINER "Seed b8a2a2a6 maintainers <maintainers@users.noreply.c-seed-b8a2a2a6.example>")
 include(CPack)

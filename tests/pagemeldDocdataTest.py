@@ -1,4 +1,4 @@
-"""Tests examples/make-docdata.py by whole outputs: makeDocdataTest.py SCRIPT"""
+"""Tests pagemeld-docdata by whole outputs: pagemeldDocdataTest.py PROGRAM"""
 import json
 import os
 import subprocess
@@ -6,7 +6,7 @@ import sys
 import tempfile
 import unittest
 
-SCRIPT = sys.argv.pop(1)
+PROGRAM = sys.argv.pop(1)
 PAGES = {
     "index.html": """<title>Lib: Main Page (1.0)</title><h1>Site</h1><main><nav><h2>Here</h2></nav><h1>Start</h1>
         <p>The <b>first</b><br>paragraph. <a href="#details">More...</a><p>No other.
@@ -28,7 +28,6 @@ PAGES = {
         <tr class="memitem:p inherit"><td class="memItemLeft"><a id="p"></a><td class="memItemRight">parent ()</td></tr>
         <tr><td class="memTemplParams"><a id="t"></a>template<tr><td class="memTemplItemRight">make ()</td></tr>
         <tr><td class="fieldname"><a id="f"></a>red&#160;</td><td class="fielddoc"><p>Rouge.</p></td></tr>""",
-    "odd.html": "<![odd]>",
     "sub/index.html": "<title>Lib: Same (1.0)</title><h1>C:\\new\0</h1><p>İki \\o/",
     "plain.html": "<title>Plain</title><h1>Plain</h1>",
     "sub/w%41?.html": '<title>Wide "quotes"</title><h1>"quotes"</h1>',
@@ -67,7 +66,6 @@ FROM_DIRECTORIES = node("index.html", "Set", node(
 WARNINGS = """'back\\\\slash.html': left out: the scripts can't hold its path
 'bytes\\udcff.html': left out: the scripts can't hold its path
 'line\\n.html': left out: the scripts can't hold its path
-odd.html: left out: unknown status keyword 'odd' in marked section
 'quote".html': left out: the scripts can't hold its path
 'sharp#.html': left out: the scripts can't hold its path
 sub/index.html: what would break the scripts is replaced in the title "C:∖new␀"
@@ -76,7 +74,7 @@ index.html: what would break the scripts is replaced in the title "C:∖new"
 index.html: links to 'gone.html', which is not a page of the set, are left out""".split("\n")
 
 
-class MakeDocdata(unittest.TestCase):
+class PagemeldDocdata(unittest.TestCase):
     def setUp(self):
         self.maxDiff = None
         parent = tempfile.TemporaryDirectory()
@@ -89,7 +87,7 @@ class MakeDocdata(unittest.TestCase):
                 file.write(page if isinstance(page, bytes) else page.encode())
 
     def make(self, *options):
-        run = subprocess.run([sys.executable, SCRIPT, *options, self.directory], stderr=subprocess.PIPE, check=True,
+        run = subprocess.run([sys.executable, PROGRAM, *options, self.directory], stderr=subprocess.PIPE, check=True,
                              env={**os.environ, "PYTHONIOENCODING": "utf-8", "PYTHONHASHSEED": "random"})
         texts = []
         for name in ("index.json", "toc.json"):
@@ -103,12 +101,12 @@ class MakeDocdata(unittest.TestCase):
         self.assertEqual(INDEX, json.loads(index))
         self.assertEqual(list(INDEX["searchIndex"]), list(json.loads(index)["searchIndex"]))
         self.assertEqual(FROM_LISTS, json.loads(contents))
-        self.assertEqual(["make-docdata.py: warning: " + warning for warning in WARNINGS], said[:-1])
-        self.assertEqual("make-docdata.py: Set: 8 pages, 11 texts, 27 terms", said[-1])
+        self.assertEqual(["pagemeld-docdata: warning: " + warning for warning in WARNINGS], said[:-1])
+        self.assertEqual("pagemeld-docdata: Set: 8 pages, 11 texts, 27 terms", said[-1])
 
     def test_writes_nothing_without_pages(self):
         with tempfile.TemporaryDirectory() as empty:
-            self.assertEqual(1, subprocess.run([sys.executable, SCRIPT, empty], stderr=subprocess.PIPE).returncode)
+            self.assertEqual(1, subprocess.run([sys.executable, PROGRAM, empty], stderr=subprocess.PIPE).returncode)
             self.assertEqual([], os.listdir(empty))
 
     def test_same_pages_give_same_bytes(self):
