@@ -1,0 +1,106 @@
+#!/usr/bin/env python3
+"""Makes the pages of our guides and manual pages: site-pages.py MAN_DIRECTORY SITE
+
+The manual pages are taken from man1 and man5 below MAN_DIRECTORY. Each module of SITE gets the set directory Manual. Ends
+with an error if a page links to a file that is neither a page of the site nor a picture.
+"""
+import html
+import os
+import re
+import shutil
+import subprocess
+import sys
+from pathlib import Path
+
+# What becomes a page of each module. The first is its start page.
+SOURCES = {
+    "pagemeld": ["README.md", "docs/INTEGRATION.md", "docs/READER.md", "docs/FORMATS.md", "docs/MESSAGES.md",
+                 "docs/ROBUSTNESS.md", "SECURITY.md", "docs/PERFORMANCE.md", "docs/ARCHITECTURE.md", "CONTRIBUTING.md",
+                 "docs/RELEASING.md", "CHANGELOG.md", "man/pagemeld.1", "man/pagemeld.5"],
+    "checker": ["docs/CHECKING.md", "docs/RULES.md", "man/pagemeld-check.1"],
+    "runtime": ["docs/SELF-TESTS.md"],
+}
+PAGE = """<!DOCTYPE html>
+<html lang="en">
+<head>
+<meta charset="utf-8">
+<meta name="viewport" content="width=device-width, initial-scale=1">
+<title>{title}</title>
+<link rel="stylesheet" href="site.css">
+</head>
+<body>
+<main>
+{content}</main>
+</body>
+</html>
+"""
+
+
+def place_pages():
+    """Returns the page of each source, relative to the site: README.md is pagemeld/Manual/index.html."""
+    return {source: f"{module}/Manual/{Path(source).name.removesuffix('.md') if number else 'index'}.html"
+            for module, sources in SOURCES.items() for number, source in enumerate(sources)}
+
+
+def run(*command):
+    return subprocess.run(command, check=True, stdout=subprocess.PIPE, encoding="utf-8").stdout
+
+
+def text_of(markup):
+    return html.unescape(re.sub("<[^>]*>", "", markup))
+
+
+def add_anchor(heading):
+    """Gives a heading the anchor that code hosts give it, which links between guides rely on."""
+    level, markup = heading.groups()
+    anchor = re.sub(r"[^\w\- ]", "", text_of(markup).lower()).replace(" ", "-")
+    return f'<h{level} id="{anchor}">{markup}</h{level}>'
+
+
+def convert_guide(source):
+    return re.sub("<h([1-6])>(.*?)</h[1-6]>", add_anchor, run("cmark-gfm", "--extension", "table", source))
+
+
+def convert_manual_page(source, man_directory):
+    name, section = Path(source).stem, Path(source).suffix[1:]
+    content = run("mandoc", "-Thtml", "-O", "fragment,man=%N.%S", f"{man_directory}/man{section}/{name}.{section}")
+    _, _, body = content.partition("</table>\n")  # a table with the name comes first, one with the date last
+    body, _, _ = body.rpartition('<table class="foot">')
+    sections = re.sub("<(/?)h1", r"<\1h2", body)
+    return f"<h1>{name}({section})</h1>\n{sections}"
+
+
+def mend_links(content, source, pages, site):
+    """Lets the links of a page lead to the pages of other sources, and puts pictures beside it."""
+    directory = Path(pages[source]).parent
+
+    def mend(link):
+        attribute, address, fragment = link.groups("")
+        target = os.path.normpath(Path(source).parent / address)
+        if target in pages:
+            return f'{attribute}="{os.path.relpath(pages[target], directory)}{fragment}"'
+        if Path(target).suffix not in (".png", ".svg"):
+            sys.exit(f"{source}: links to {target}, which is not in the site")
+        shutil.copy(target, site / directory)
+        return f'{attribute}="{Path(target).name}"'
+    return re.sub('(href|src)="(?!https?:)([^"#]+)(#[^"]*)?"', mend, content)
+
+
+def write_page(file, content):
+    title = text_of(re.search("<h1.*?>(.*?)</h1>", content)[1])
+    file.write_text(PAGE.format(title=html.escape(title), content=content), encoding="utf-8")
+
+
+def main():
+    man_directory, site = sys.argv[1], Path(sys.argv[2])
+    for module in SOURCES:
+        (site / module / "Manual").mkdir(parents=True)
+        shutil.copy("docs/site.css", site / module / "Manual")
+    pages = place_pages()
+    for source, page in pages.items():
+        is_guide = source.endswith(".md")
+        content = convert_guide(source) if is_guide else convert_manual_page(source, man_directory)
+        write_page(site / page, mend_links(content, source, pages, site))
+
+
+main()
