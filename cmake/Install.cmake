@@ -22,10 +22,10 @@ install(FILES ${PROJECT_BINARY_DIR}/PagemeldConfig.cmake ${PROJECT_BINARY_DIR}/P
         DESTINATION ${package_directory})
 
 install(DIRECTORY web/ DESTINATION ${PAGEMELD_WEB_DIRECTORY})
-install(FILES README.md LICENSE CHANGELOG.md CONTRIBUTING.md SECURITY.md DESTINATION ${CMAKE_INSTALL_DOCDIR})
-install(DIRECTORY docs DESTINATION ${CMAKE_INSTALL_DOCDIR})
+install(FILES LICENSE DESTINATION ${CMAKE_INSTALL_DOCDIR})
 install(DIRECTORY examples DESTINATION ${CMAKE_INSTALL_DOCDIR} PATTERN __pycache__ EXCLUDE)
 install(PROGRAMS Tools/DocTools/PagemeldDocdata/pagemeld-docdata TYPE BIN)
 
 install(DIRECTORY schema DESTINATION ${CMAKE_INSTALL_DATADIR}/pagemeld)
 add_subdirectory(man)
+include(cmake/Site.cmake)
