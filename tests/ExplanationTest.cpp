@@ -26,6 +26,17 @@ TEST(Explanation, NamesWhatUsuallyCausesAParseFailure)
         {"\xFE\xFF", R"(the file is in UTF-16: save it as UTF-8; refused at byte 0, at "\xFE\xFF")"},
         {std::string("[\0]\0", 4),
          R"(the file is in UTF-16: save it as UTF-8; refused at byte 1, at the end of the text)"},
+        {std::string("\0[\0]", 4),
+         R"(the file begins with a NUL byte: it is in UTF-16, or was never written; refused at byte 0, at the end of the text)"},
+        {std::string(" \n\0", 3),
+         R"(the file holds nothing but white space before its first NUL byte; refused at byte 2, at the end of the text)"},
+        {"[1.\n]", R"(miss fraction part in number; refused at byte 3, at "\n]")"},
+        {"{\"a\":tru\t}", R"(invalid value; refused at byte 8, at "\t}")"},
+        {R"({\"a":1})", R"(missing a name for object member; refused at byte 1, at "\\\"a\":1}")"},
+        {R"("\ud83d")",
+         R"(half of a surrogate pair, as cutting a text leaves it: write both halves or neither; refused at byte 1, at "\\ud83d\"")"},
+        {R"("\uZZ12")",
+         R"(\u needs four hexadecimal digits; a backslash that begins no escape must be doubled; refused at byte 1, at "\\uZZ12\"")"},
         {"[", R"(invalid value; refused at byte 1, at the end of the text)"},
         {"[1,\n]", R"(there is a comma before the closing bracket; refused at byte 4, at "]")"},
         {"{,}", R"(missing a name for object member; refused at byte 1, at ",}")"},
@@ -51,11 +62,13 @@ TEST(Explanation, NamesWhatUsuallyCausesAParseFailure)
 
 TEST(Explanation, ShowsNoCharacterThatDeceivesAReader)
 {
-    const std::string harmless = " ~\xC2\xA0\u200D\u2010\u2027\u202F\u2065\u206A\uFEFE\uFF00\U0001F600";
+    const std::string harmless =
+        " ~\xC2\xA0\u061B\u061D\u200D\u2010\u2027\u202F\u2065\u206A\uFEFE\uFF00\U0001F600";
     EXPECT_EQ(harmless, Visible(harmless));
     EXPECT_EQ(R"(\x00\x1F\x7F\u0080\u009F)", Visible({"\0\x1F\x7F\xC2\x80\xC2\x9F", 7}));
-    const char* marks = "\u200E\u200F\u2028\u202E\u2066\u2069\uFEFF"; // NOLINT(misc-misleading-bidirectional)
-    EXPECT_EQ(R"(\u200E\u200F\u2028\u202E\u2066\u2069\uFEFF)", Visible(marks));
+    const char* marks =
+        "\u061C\u200E\u200F\u2028\u202E\u2066\u2069\uFEFF"; // NOLINT(misc-misleading-bidirectional)
+    EXPECT_EQ(R"(\u061C\u200E\u200F\u2028\u202E\u2066\u2069\uFEFF)", Visible(marks));
     for (const char* sound : {"\xC2\x80", "\xDF\xBF", "\xE0\xA0\x80", "\xED\x9F\xBF", "\xEE\x80\x80",
                               "\xEF\xBF\xBF", "\xF0\x90\x80\x80", "\xF4\x8F\xBF\xBF", "eight letters"})
     {

@@ -37,9 +37,15 @@ std::string DescribeEncoding(std::string_view text, std::size_t size)
     {
         return "the file begins with a byte order mark: save it without";
     }
+    if (text.empty())
+    {
+        return size == 0 ? "the file is empty"
+                         : "the file begins with a NUL byte: it is in UTF-16, or was never written";
+    }
     if (text.find_first_not_of(kWhiteSpace) == std::string_view::npos)
     {
-        return size == 0 ? "the file is empty" : "the file holds nothing but white space";
+        return std::string("the file holds nothing but white space") +
+               (text.size() < size ? " before its first NUL byte" : "");
     }
     return "";
 }
@@ -72,7 +78,7 @@ std::string DescribeLimit(std::string_view text, std::size_t offset)
                : "a string is longer than " + std::to_string(kMaxStringBytes) + " bytes";
 }
 
-/// Returns what the character at the offset tells of the cause, or an empty text.
+/// Returns what the character at the offset, outside of strings, tells of the cause, or an empty text.
 std::string DescribeCharacter(std::string_view text, std::size_t offset)
 {
     const char c = offset < text.size() ? text[offset] : '\0';
@@ -86,6 +92,16 @@ std::string DescribeCharacter(std::string_view text, std::size_t offset)
         return "JSON has no comments";
     case '\'':
         return "strings need double quotes";
+    default:
+        return "";
+    }
+}
+
+/// Returns what is wrong with an escape or with a control character in a string, or an empty text.
+std::string DescribeStringCharacter(char c)
+{
+    switch (c)
+    {
     case '\\':
         return "a backslash in a string must be doubled";
     case '\n':
@@ -114,6 +130,12 @@ std::string DescribeCause(std::string_view text, std::size_t size, const rapidjs
     case rapidjson::kParseErrorDocumentRootNotSingular:
         cause = DescribeCharacter(text, failure.Offset());
         return cause.empty() ? "there is a second root after the first" : cause;
+    case rapidjson::kParseErrorStringEscapeInvalid:
+        return DescribeStringCharacter(text[failure.Offset()]);
+    case rapidjson::kParseErrorStringUnicodeEscapeInvalidHex:
+        return "\\u needs four hexadecimal digits; a backslash that begins no escape must be doubled";
+    case rapidjson::kParseErrorStringUnicodeSurrogateInvalid:
+        return "half of a surrogate pair, as cutting a text leaves it: write both halves or neither";
     default:
         return DescribeCharacter(text, failure.Offset());
     }

@@ -62,8 +62,9 @@ Character ReadCharacter(std::string_view text)
 
 bool IsUnsafe(std::uint32_t code)
 {
-    return code < 0x20 || (code >= 0x7F && code <= 0x9F) || (code >= 0x200E && code <= 0x200F) ||
-           (code >= 0x2028 && code <= 0x202E) || (code >= 0x2066 && code <= 0x2069) || code == 0xFEFF;
+    return code < 0x20 || (code >= 0x7F && code <= 0x9F) || code == 0x061C ||
+           (code >= 0x200E && code <= 0x200F) || (code >= 0x2028 && code <= 0x202E) ||
+           (code >= 0x2066 && code <= 0x2069) || code == 0xFEFF;
 }
 
 /// Returns an escape: the prefix, then the code in as many upper-case hexadecimal digits.
