@@ -37,7 +37,7 @@ a module, what ``DEPENDS`` names, the arguments, the programs, or the page scrip
 ``ROOTS`` was removed, of those documentation sets whose ``index.json`` was there, or named in ``DEPENDS``, when
 CMake last ran. With ``DISCOVER`` a new module is noticed only by what ``DEPENDS`` names.
 
-``DISCOVER`` alone has nothing to depend on, so the target does its work each time.
+``DISCOVER`` without ``DEPENDS`` runs in every build, since CMake knows no file that could have changed.
 
 Two targets over the same modules must be chained, the second with ``DEPENDS <first>``: they write the same files.
 #]=======================================================================]
