@@ -18,10 +18,11 @@ quietly()
     return "$status"
 }
 
+# Installs what is missing of groups of packages.
 set_up()
 {
-    heading "Set-up"
-    script/setup
+    heading "Set-up: $*"
+    script/setup "$@"
 }
 
 # Builds a preset.
@@ -30,4 +31,12 @@ build()
     heading "Build: $1"
     quietly cmake --preset "$1"
     quietly cmake --build --preset "$1"
+}
+
+# Builds the two programs by themselves, without the tools that the tests need.
+build_programs()
+{
+    heading "Build: the programs"
+    quietly cmake --preset release -D PAGEMELD_TESTS=AUTO
+    quietly cmake --build --preset release --target pagemeld pagemeld-check
 }
