@@ -17,5 +17,5 @@ set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
 set(CPACK_DEBIAN_PACKAGE_DEPENDS python3) # pagemeld-docdata
 set(CPACK_DEBIAN_PACKAGE_SECTION devel)
-set(CPACK_DEBIAN_PACKAGE_MAINTAINER "Seed b8a2a2a6 maintainers <maintainers@users.noreply.c-seed-b8a2a2a6.example>")
+set(CPACK_DEBIAN_PACKAGE_MAINTAINER "Pagemeld maintainers <maintainers@pagemeld.example>")
 include(CPack)

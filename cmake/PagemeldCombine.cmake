@@ -25,7 +25,7 @@ also define the targets ``Pagemeld::pagemeld`` and ``Pagemeld::pagemeld-check``.
 ``WERROR``
   Stops the build at the checker's warnings as well.
 ``WEB``
-  Copies the page script, ``pagemeld.js`` and ``pagemeld.css``, into each ``docdata`` before combining.
+  Copies the files of the page script into each ``docdata`` before combining.
 ``DEPENDS``
   What makes the modules: files, or targets that are defined before this call. Modules that the build itself makes must
   be named here. Files are the better choice, because a custom target with a command counts as changed each time.
@@ -38,6 +38,8 @@ a module, what ``DEPENDS`` names, the arguments, the programs, or the page scrip
 CMake last ran. With ``DISCOVER`` a new module is noticed only by what ``DEPENDS`` names.
 
 ``DISCOVER`` without ``DEPENDS`` runs in every build, since CMake knows no file that could have changed.
+
+The build names each documentation set that no module has: warnings about its ``index.json`` are harmless.
 
 Two targets over the same modules must be chained, the second with ``DEPENDS <first>``: they write the same files.
 #]=======================================================================]
@@ -72,10 +74,8 @@ endfunction()
 # Sets outputs to the files that will be written into the roots, as far as can be told before the build: those of each
 # set that has an input.
 function(_pagemeld_list_outputs)
-    set(names global_index.json global_index.js global_toc.json global_toc.js)
-    if(arg_WEB)
-        list(APPEND names pagemeld.js pagemeld.css)
-    endif()
+    list(TRANSFORM web_files REPLACE ".*/" "" OUTPUT_VARIABLE web_names)
+    set(names global_index.json global_index.js global_toc.json global_toc.js ${web_names})
     set(outputs)
     foreach(set IN ITEMS Manual ScriptReference)
         foreach(root IN LISTS roots)
@@ -156,7 +156,8 @@ function(pagemeld_combine target)
     set(web_files)
     if(arg_WEB)
         get_target_property(web Pagemeld::pagemeld PAGEMELD_WEB_DIRECTORY)
-        set(web_files "${web}/pagemeld.js" "${web}/pagemeld.css")
+        string(REGEX REPLACE "([[*?])" "[\\1]" pattern "${web}")
+        file(GLOB web_files "${pattern}/*")
     endif()
     _pagemeld_write_arguments()
 

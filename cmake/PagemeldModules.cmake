@@ -1,5 +1,5 @@
-# The part of pagemeld_combine that must wait until the modules are made: copies the page script into them, and lists
-# their input files for the build, in a dependency file.
+# The part of pagemeld_combine that must wait until the modules are made: copies the page script into them, lists their
+# input files for the build, in a dependency file, and names the sets that no module has.
 #
 #     cmake -D arguments=FILE -P PagemeldModules.cmake
 
@@ -31,10 +31,15 @@ if(NOT discover STREQUAL "")
 endif()
 
 set(dependencies "${stamp}:")
-foreach(module IN LISTS modules)
-    foreach(set IN ITEMS Manual ScriptReference)
+foreach(set IN ITEMS Manual ScriptReference)
+    set(is_somewhere OFF)
+    foreach(module IN LISTS modules)
         set(docdata "${module}/${set}/docdata")
-        if(web_files AND IS_DIRECTORY "${docdata}")
+        if(NOT IS_DIRECTORY "${docdata}")
+            continue()
+        endif()
+        set(is_somewhere ON)
+        if(web_files)
             file(COPY ${web_files} DESTINATION "${docdata}")
         endif()
         foreach(input IN ITEMS "${docdata}/index.json" "${docdata}/toc.json")
@@ -43,6 +48,9 @@ foreach(module IN LISTS modules)
             endif()
         endforeach()
     endforeach()
+    if(modules AND NOT is_somewhere)
+        message(STATUS "No module has ${set}: warnings about its index.json are harmless")
+    endif()
 endforeach()
 
 # The form that compilers write: escaped spaces, and a backslash at the end of each line but the last.
