@@ -2,7 +2,7 @@
 """Makes the pages of our guides and manual pages: site-pages.py MAN_DIRECTORY SITE
 
 The manual pages are taken from man1 and man5 below MAN_DIRECTORY. Each module of SITE gets the set directory Manual. Ends
-with an error if a page links to a file that is neither a page of the site nor a picture.
+with an error if a page links to a heading that is not there, or to a file that is neither in the site nor a picture.
 """
 import html
 import os
@@ -70,20 +70,21 @@ def convert_manual_page(source, man_directory):
     return f"<h1>{name}({section})</h1>\n{sections}"
 
 
-def mend_links(content, source, pages, site):
-    """Lets the links of a page lead to the pages of other sources, and puts pictures beside it."""
+def mend_links(contents, source, pages, site):
+    """Returns the content of a page with links to the pages of other sources, and puts its pictures beside it."""
     directory = Path(pages[source]).parent
 
     def mend(link):
         attribute, address, fragment = link.groups("")
-        target = os.path.normpath(Path(source).parent / address)
-        if target in pages:
-            return f'{attribute}="{os.path.relpath(pages[target], directory)}{fragment}"'
-        if Path(target).suffix not in (".png", ".svg"):
-            sys.exit(f"{source}: links to {target}, which is not in the site")
+        target = os.path.normpath(Path(source).parent / address) if address else source
+        if target in pages and (not fragment or f'id="{fragment}"' in contents[target]):
+            path = os.path.relpath(pages[target], directory) if address else ""
+            return f'{attribute}="{path}{fragment and "#" + fragment}"'
+        if fragment or Path(target).suffix not in (".png", ".svg"):
+            sys.exit(f"{source}: links to {address}#{fragment}, which is not in the site")
         shutil.copy(target, site / directory)
         return f'{attribute}="{Path(target).name}"'
-    return re.sub('(href|src)="(?!https?:)([^"#]+)(#[^"]*)?"', mend, content)
+    return re.sub('(href|src)="(?!https?:)([^"#]*)(?:#([^"]*))?"', mend, contents[source])
 
 
 def write_page(file, content):
@@ -97,10 +98,10 @@ def main():
         (site / module / "Manual").mkdir(parents=True)
         shutil.copy("docs/site.css", site / module / "Manual")
     pages = place_pages()
+    contents = {source: convert_guide(source) if source.endswith(".md") else convert_manual_page(source, man_directory)
+                for source in pages}
     for source, page in pages.items():
-        is_guide = source.endswith(".md")
-        content = convert_guide(source) if is_guide else convert_manual_page(source, man_directory)
-        write_page(site / page, mend_links(content, source, pages, site))
+        write_page(site / page, mend_links(contents, source, pages, site))
 
 
 main()
