@@ -24,7 +24,11 @@ install(FILES ${PROJECT_BINARY_DIR}/PagemeldConfig.cmake ${PROJECT_BINARY_DIR}/P
 install(DIRECTORY web/ DESTINATION ${PAGEMELD_WEB_DIRECTORY})
 install(FILES LICENSE DESTINATION ${CMAKE_INSTALL_DOCDIR})
 install(DIRECTORY examples DESTINATION ${CMAKE_INSTALL_DOCDIR} PATTERN __pycache__ EXCLUDE)
-install(PROGRAMS Tools/DocTools/PagemeldDocdata/pagemeld-docdata TYPE BIN)
+
+# The program looks for its modules, and for web, below the share beside its bin.
+set(docdata_sources Tools/DocTools/PagemeldDocdata)
+install(PROGRAMS ${docdata_sources}/pagemeld-docdata TYPE BIN)
+install(DIRECTORY ${docdata_sources}/ DESTINATION ${CMAKE_INSTALL_DATADIR}/pagemeld/docdata FILES_MATCHING PATTERN *.py)
 
 install(DIRECTORY schema DESTINATION ${CMAKE_INSTALL_DATADIR}/pagemeld)
 add_subdirectory(man)

@@ -35,18 +35,22 @@ PAGES = {
     "docdata/old.html": "", "picture.png": "",
 }
 INDEX = {
-    "pages": [["index.html", "Start"], ["Foo.html", "By “heading”"], ["a b.html", "a b.html"], ["latin.htm", "été"],
-              ["members.html", "Gauge Class"], ["plain.html", "Plain"],
-              ["sub/index.html", "C:∖new␀"], ["sub/w%41?.html", 'Wide "quotes"']],
-    "info": [["The first paragraph.", 0], ["नमस्ते x_1 – It.", 1], ["y()", 1], ["мир", 2], ["été", 3],
-             ["read (int n) – Reads.", 4], ["make ()", 4], ["red – Rouge.", 4], ["Plain", 5],
-             ["C:\\new\0 – İki \\o/", 6], ['"quotes"', 7]],
+    "pages": [["index.html", "Start"], ["Foo.html", "By “heading”"], ["Foo.html#x", "नमस्ते x_1"],
+              ["a b.html", "a b.html"], ["latin.htm", "été"], ["members.html", "Gauge Class"],
+              ["members.html#r", "read"], ["members.html#all", "Gauge Class"], ["members.html#t", "make"],
+              ["members.html#f", "red"], ["plain.html", "Plain"], ["sub/index.html", "C:∖new␀"],
+              ["sub/w%41?.html", 'Wide "quotes"']],
+    "info": [["The first paragraph.", 0], ["By “heading”", 1], ["It.", 2], ["y() – ns", 1], ["мир", 3], ["été", 4],
+             ["Gauge Class", 5], ["read (int n) – Reads.", 6], ["Gauge Class", 7], ["make ()", 8], ["Rouge.", 9],
+             ["Plain", 10], ["C:\\new\0 – İki \\o/", 11], ['"quotes"', 12]],
     "common": dict.fromkeys(
         "a an and are as at be by for from has in is it its of on one or that the to with".split(), 1),
-    "searchIndex": {"b": [3], "c": [9], "class": [5], "first": [0], "gauge": [5], "heading": [1], "html": [3],
-                    "int": [5], "i̇ki": [9], "make": [6], "n": [5], "new": [9], "o": [9], "paragraph": [0],
-                    "plain": [8], "quotes": [10], "read": [5], "reads": [5], "red": [7], "rouge": [7], "start": [0],
-                    "wide": [10], "x_1": [1], "y": [2], "été": [4], "мир": [3], "नमस्ते": [1]},
+    "searchIndex": {"again": [3], "away": [0], "b": [4], "c": [0, 12], "café": [0], "class": [3, 6, 8], "first": [0],
+                    "gauge": [6, 8], "gone": [0], "group": [0], "heading": [1], "html": [4], "int": [7], "i̇ki": [12],
+                    "make": [9], "n": [7], "new": [0, 12], "no": [0], "ns": [3], "o": [12], "other": [0],
+                    "paragraph": [0], "path": [0], "plain": [11], "quotes": [13], "read": [7], "reads": [7],
+                    "red": [10], "rouge": [10], "start": [0], "wide": [13], "x_1": [2], "y": [3], "été": [5],
+                    "мир": [4], "नमस्ते": [2]},
 }
 
 
@@ -55,11 +59,12 @@ def node(link, title, *children):
 
 
 FROM_LISTS = node("index.html", "All",
-                  node("null", "Group", node("a b.html#café", "Café"), node("Foo.html", "Path")),
                   node("null", "ns", node("latin.htm", "Class")),
-                  node("index.html", "Start", node("sub/index.html", "C:∖new"), node("sub/index.html", "Again")))
+                  node("index.html", "lib",
+                       node("null", "Group", node("a b.html#café", "Café"), node("Foo.html", "Path")),
+                       node("sub/index.html", "C:∖new"), node("sub/index.html", "Again")))
 FROM_DIRECTORIES = node("index.html", "Set", node(
-    "index.html", "Start", node("Foo.html", "By “heading”"), node("a b.html", "a b.html"), node("latin.htm", "été"),
+    "index.html", "lib", node("Foo.html", "By “heading”"), node("a b.html", "a b.html"), node("latin.htm", "été"),
     node("members.html", "Gauge Class"), node("plain.html", "Plain"),
     node("sub/index.html", "C:∖new␀", node("sub/w%41?.html", 'Wide "quotes"'))))
 # Of the files in the order in which they are read, then of titles and links.
@@ -69,9 +74,9 @@ WARNINGS = """'back\\\\slash.html': left out: the scripts can't hold its path
 'quote".html': left out: the scripts can't hold its path
 'sharp#.html': left out: the scripts can't hold its path
 sub/index.html: what would break the scripts is replaced in the title "C:∖new␀"
-Set: there is no page none.html
 index.html: what would break the scripts is replaced in the title "C:∖new"
-index.html: links to 'gone.html', which is not a page of the set, are left out""".split("\n")
+index.html: links to 'gone.html', which is not a page of the set, are left out
+Set: there is no page none.html""".split("\n")
 
 
 class PagemeldDocdata(unittest.TestCase):
@@ -79,7 +84,7 @@ class PagemeldDocdata(unittest.TestCase):
         self.maxDiff = None
         parent = tempfile.TemporaryDirectory()
         self.addCleanup(parent.cleanup)
-        self.directory = os.path.join(parent.name, "Set")
+        self.directory = os.path.join(parent.name, "lib", "Set")
         for path, page in PAGES.items():
             path = os.path.join(os.fsencode(self.directory), os.fsencode(path))
             os.makedirs(os.path.dirname(path), exist_ok=True)
@@ -97,12 +102,12 @@ class PagemeldDocdata(unittest.TestCase):
 
     def test_writes_index_and_contents_and_says_what_it_left_out_or_replaced(self):
         (index, contents), said = self.make("--toc", "index.html", "--toc", "none.html", "--toc", "Foo.html",
-                                            "--root-title", "All")
+                                            "--root-title", "All", "--share", "ns")
         self.assertEqual(INDEX, json.loads(index))
         self.assertEqual(list(INDEX["searchIndex"]), list(json.loads(index)["searchIndex"]))
         self.assertEqual(FROM_LISTS, json.loads(contents))
         self.assertEqual(["pagemeld-docdata: warning: " + warning for warning in WARNINGS], said[:-1])
-        self.assertEqual("pagemeld-docdata: Set: 8 pages, 11 texts, 27 terms", said[-1])
+        self.assertEqual("pagemeld-docdata: Set: 8 pages, 5 places, 14 texts, 36 terms", said[-1])
 
     def test_writes_nothing_without_pages(self):
         with tempfile.TemporaryDirectory() as empty:
@@ -116,7 +121,7 @@ class PagemeldDocdata(unittest.TestCase):
         self.assertEqual(FROM_DIRECTORIES, json.loads(self.make()[0][1]))
         texts, said = self.make("--toc", "list.html")
         self.assertEqual(FROM_DIRECTORIES, json.loads(texts[1]))
-        self.assertIn("there is no page list.html: the contents are made from the directories", "\n".join(said))
+        self.assertIn("Set: the contents are made from the directories", "\n".join(said))
 
 
 if __name__ == "__main__":

@@ -1,0 +1,224 @@
+"""Reads a page: its title, and its sections. A section begins at a heading or at the name of a member, and has an
+anchor if one leads there."""
+import re
+import unicodedata
+from typing import NamedTuple
+
+from generators import LISTING, MEMBER, NAME, PARTS, SKIP, SKIPPED_ROLES, SKIPPED_TAGS, TEXT, UNUSED
+from markup import TOKEN, first_line, read_attributes, squeeze
+
+COMMON = dict.fromkeys("a an and are as at be by for from has in is it its of on one or that the to with".split(), 1)
+# Queries are split into runs of letters, marks, digits and "_". \w matches all of these except the marks.
+MARKS = "".join(c for c in map(chr, range(0x300, 0xE0200)) if unicodedata.category(c)[0] == "M")
+WORD = re.compile(f"[\\w{MARKS}]+")
+ASCII_WORD = re.compile(r"\w+", re.A)
+LONG_NUMBER = re.compile(r"\d{5,}")
+NUMBER = re.compile(r"^[\dA-Z]+(\.\d+)*\.?\s+")
+MARKED = re.compile(r"\b(?:id|class|name|role)\s*=", re.I)
+LONGEST_WORD = 40
+SHOWN_LENGTH = 300
+
+LEVELS = {"h1": 1, "h2": 2, "h3": 3, "h4": 4, "h5": 5, "h6": 6, "dt": 7, MEMBER: 7}
+KINDS = {**{name: name for name in ("h1", "h2", "h3", "h4", "h5", "h6", "dt", "title")}, "p": TEXT}
+BLOCKS = KINDS.keys() | set(
+    "article aside blockquote body caption center dd details div dl figure form header hr li main ol section summary "
+    "table tbody td th thead tr ul".split())
+
+
+class Section(NamedTuple):
+    level: int  # of its heading, 0 for the beginning of the page
+    anchor: str  # "" if nothing leads there
+    heading: str
+    name: str  # the heading, of a member without its parameters
+    lead: str  # the beginning of its first paragraph
+    words: str  # those of heading and first paragraph, with a space between them
+    more_words: str  # the others
+
+
+class Page(NamedTuple):
+    title: str
+    heading: str  # the main one
+    sections: list  # the first is the beginning of the page
+
+
+def find_words(text):
+    """Returns the set of terms of a text."""
+    text = text.lower()
+    return set((ASCII_WORD if text.isascii() else WORD).findall(text)) - COMMON.keys()
+
+
+def find_plain_words(text):
+    """Returns the terms of a text that readers may ask for."""
+    return {word for word in find_words(text) if len(word) <= LONGEST_WORD and not LONG_NUMBER.fullmatch(word)}
+
+
+def shorten(text):
+    """Returns text with at most SHOWN_LENGTH letters, cut between words."""
+    if len(text) <= SHOWN_LENGTH:
+        return text
+    return text[:SHOWN_LENGTH - 1].rpartition(" ")[0] + " \u2026"
+
+
+class OpenSection:
+    """A section while it is read."""
+
+    def __init__(self, level, anchor="", heading="", name=""):
+        self.level, self.anchor, self.heading, self.name = level, anchor, heading, name
+        self.lead, self.texts = "", []
+
+    def add(self, text, is_paragraph=False):
+        if is_paragraph and not self.lead:
+            self.lead = text.removesuffix(" More...")
+        elif text:
+            self.texts.append(text)
+
+    def close(self):
+        lead = self.lead or (self.texts.pop(0) if self.texts else "")
+        words = find_words(self.heading) | find_plain_words(lead)
+        more_words = find_plain_words(" ".join(self.texts)) - words
+        return Section(self.level, self.anchor, self.heading, self.name, shorten(lead), " ".join(sorted(words)),
+                       " ".join(sorted(more_words)))
+
+
+class PageReader:
+    """Goes through the tokens of a page and collects the texts between the boundaries of blocks."""
+
+    def __init__(self):
+        self.title = ""
+        self.block = ""  # what the block being read is
+        self.data = []  # the pieces of its text
+        self.part, self.part_tag, self.part_depth, self.part_start = "", "", 0, 0
+        self.start_over()
+
+    def start_over(self):
+        """Forgets what came before <main>."""
+        self.section = OpenSection(0)
+        self.sections = [self.section]
+        self.anchor, self.anchor_at = "", 0  # the last one, and how much of the block's text was there
+        self.row_anchor = ""  # the last one since the last heading
+        self.names = []
+        self.outer = []  # the sections around lists, to which what follows a list belongs
+
+    def read(self, html):
+        position = 0
+        for token in TOKEN.finditer(html):
+            if token.start() > position:
+                self.data.append(html[position:token.start()])
+            position = token.end()
+            listing, name, attributes = token.groups()
+            if name is None:
+                self.add_listing(listing)  # None of a comment
+            elif name[0] != "/":
+                self.start(name.lower(), attributes)
+            elif name == "/main":
+                break
+            else:
+                self.end(name[1:].lower())
+        else:
+            self.data.append(html[position:])
+        self.end_block()
+        return Page(self.title, self.sections[0].heading, [section.close() for section in self.sections])
+
+    def start(self, name, attributes):
+        if self.part:
+            self.part_depth += name == self.part_tag
+            return
+        part, anchor = self.read_traits(name, attributes)
+        if part in (SKIP, LISTING, NAME):
+            self.part, self.part_tag, self.part_depth, self.part_start = part, name, 1, len(self.data)
+        elif part or name in BLOCKS:
+            self.end_block()
+            self.block = part or KINDS.get(name, "")
+            self.start_block(name)
+        elif name == "br":
+            self.data.append(" ")
+        if anchor:
+            self.anchor, self.anchor_at = anchor, len(self.data)
+            self.row_anchor = anchor if name == "a" else self.row_anchor
+
+    def start_block(self, name):
+        if self.block in LEVELS:
+            self.names = []
+        if name == "dt":  # an anchor before it leads to the list
+            self.anchor = ""
+        elif name == "dl":
+            self.outer.append(self.section)
+
+    def read_traits(self, name, attributes):
+        """Returns what the tables say of an element, "" if nothing, and its anchor, "" if it has none."""
+        values = read_attributes(attributes) if MARKED.search(attributes) else {}
+        role = values.get("role")
+        if name in SKIPPED_TAGS or role in SKIPPED_ROLES:
+            return SKIP, ""
+        if name == "main" or role == "main":
+            self.start_over()
+        part = next((PARTS[name, one] for one in values.get("class", "").split() if (name, one) in PARTS), "")
+        return part, values.get("id") or name == "a" and values.get("name") or ""
+
+    def end(self, name):
+        if self.part:
+            self.part_depth -= name == self.part_tag
+            if self.part_depth == 0:
+                self.end_part()
+        elif name in BLOCKS:
+            self.end_block()
+            if name == "dl" and self.outer:
+                self.section = self.outer.pop()
+
+    def end_part(self):
+        part, text = self.part, "".join(self.data[self.part_start:])
+        self.part = ""
+        if part == NAME:
+            self.names.append(text)
+            return
+        del self.data[self.part_start:]
+        if part == LISTING:
+            self.add_listing(text)
+
+    def add_listing(self, listing):
+        if listing and not self.part:
+            self.end_block()
+            self.section.add(first_line(listing))
+
+    def end_block(self):
+        """Puts the text since the last boundary where it belongs. An anchor before text does not lead to what follows."""
+        block, self.block = self.block, ""
+        if not self.data:
+            return
+        text = squeeze("".join(self.data))
+        if block in LEVELS:
+            self.end_heading(block, text)
+        elif self.anchor and "".join(self.data[self.anchor_at:]).strip():
+            self.anchor = ""
+        if block == "title":
+            self.title = self.title or text
+        elif block not in LEVELS and block != UNUSED:
+            self.section.add(text, block == TEXT)
+        self.data, self.anchor_at = [], 0
+
+    def end_heading(self, block, text):
+        """Begins a section, unless the heading is that of the page, has no text, or is a term that nothing leads to."""
+        anchor = self.row_anchor if block == MEMBER else self.anchor
+        if not text or block == "dt" and not anchor:
+            self.section.add(text)
+        elif len(self.sections) == 1 and not self.section.heading and self.is_of_page(block, text):
+            self.section = self.sections[0] = OpenSection(0, "", text, text)
+        else:
+            self.section = OpenSection(LEVELS[block], anchor, text, find_name(text, squeeze("".join(self.names)), block))
+            if block != MEMBER or anchor:  # a row that links to a section of its own is not read
+                self.sections.append(self.section)
+        self.anchor = self.row_anchor = ""
+
+    def is_of_page(self, block, text):
+        return block == "h1" or NUMBER.sub("", text) in self.title
+
+
+def find_name(heading, name, block):
+    """Returns the title of a place: of a member its name."""
+    if name:
+        return name
+    return heading.partition("(")[0].rstrip() or heading if LEVELS[block] > 5 else heading
+
+
+def read_page(html):
+    return PageReader().read(html)
