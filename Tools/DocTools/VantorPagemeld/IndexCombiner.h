@@ -1,11 +1,10 @@
 #pragma once
 
 #include "Tools/DocTools/VantorPagemeld/JsonCombiner.h"
-#include "Tools/DocTools/VantorPagemeld/Merge/ArrayRecycler.h"
-#include "Tools/DocTools/VantorPagemeld/Merge/TermIndex.h"
+#include "Tools/DocTools/VantorPagemeld/Merge/IndexMerge.h"
 #include "Tools/DocTools/VantorPagemeld/Write/OutputFile.h"
 
-#include <memory>
+#include <optional>
 
 /// Merges the search indexes of all modules. Pages and infos are appended, the numbers that point to them
 /// re-based; a term that several modules use holds the numbers of the first, then those of the second, and so
@@ -40,18 +39,6 @@ public:
     void CombineSearchIndexJson(rapidjson::Value& combined, rapidjson::Value& input, int infoOffset);
 
 private:
-    /// What one merge keeps for the next: where the terms are, and arrays to reuse.
-    struct Merge
-    {
-        Merge(rapidjson::Value& searchIndex, LargeObjectPool& pool) : terms(searchIndex, pool) {}
-
-        TermIndex terms;
-        ArrayRecycler arrays;
-    };
-
-    void MoveInfo(ArrayRecycler& arrays, rapidjson::Value& combined, rapidjson::Value& input, int pageOffset);
-    void MoveTerms(Merge& merge, rapidjson::Value& input, int infoOffset);
-
     LargeObjectPool m_largeObjects;
-    std::unique_ptr<Merge> m_merge;
+    std::optional<IndexMerge> m_merge; ///< of the documents that CombineJson merges one after the other
 };

@@ -4,23 +4,23 @@
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"
 
-JsonCombiner::JsonCombiner() : defaultJson("{}") {}
+#include <utility>
+
+JsonCombiner::JsonCombiner() : defaultJson("{}")
+{
+    // An allocator of the library that has no memory yet crashes when it is asked to grow what another one
+    // allocated. Tagging and merging ask for that: lists of the module documents grow in the combined one.
+    (void)combinedDocument.GetAllocator().Malloc(1);
+}
 
 JsonCombiner::~JsonCombiner()
 {
     moduleDocuments.clear(); // before their pools and before combinedDocument, which is declared after them
 }
 
-bool JsonCombiner::InitializeCombinedDocument()
-{
-    // The library's allocator crashes when it is asked to grow what another one allocated while it has no
-    // memory of its own yet; tagging and merging do just that.
-    (void)combinedDocument.GetAllocator().Malloc(1);
-    return RapidJsonIoUtil::TryGetJsonDocFromString(defaultJson.c_str(), combinedDocument);
-}
-
 bool JsonCombiner::CombineJson(const std::list<std::string>& modulePaths, const std::string& fileName)
 {
+    ++m_callCount;
     int nextModuleIndex = 0;
     for (const std::string& path : modulePaths)
     {
@@ -36,10 +36,16 @@ bool JsonCombiner::CombineJson(const std::list<std::string>& modulePaths, const 
         AddModuleIndexToEachEntry(document, nextModuleIndex);
         AppendJsonDocument(document);
         ++nextModuleIndex;
-        m_continuesMerging = true;
     }
-    m_continuesMerging = false;
     return nextModuleIndex > 0;
+}
+
+bool JsonCombiner::ContinuesMerging(const rapidjson::Document& document)
+{
+    // Other callers of AppendJsonDocument bring documents of their own.
+    const bool isModule = !moduleDocuments.empty() && moduleDocuments.back().get() == &document;
+    const int call = isModule ? m_callCount : 0;
+    return std::exchange(m_mergedCall, call) == call && isModule;
 }
 
 void JsonCombiner::SetModulePathAtIndex(int moduleIndex, const std::string& path)

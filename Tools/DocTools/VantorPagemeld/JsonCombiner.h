@@ -60,14 +60,14 @@ public:
     bool OutputPrefixVars(const char* modulePath, std::FILE* stream) const;
 
 protected:
+    /// Sets defaultJson to an empty object. A derived class parses it, or its own, into combinedDocument.
     JsonCombiner();
 
-    /// Parses defaultJson into combinedDocument. Returns whether that succeeded.
-    bool InitializeCombinedDocument();
-
-    /// Returns whether CombineJson has merged another document before the one that it merges now. Nothing has
-    /// changed combinedDocument since, so look-up tables of the last merge are still valid.
-    [[nodiscard]] bool ContinuesMerging() const { return m_continuesMerging; }
+    /// Returns whether document follows, in the same call of CombineJson, the one that was passed here last.
+    ///
+    /// Look-up tables can be kept only then: in between, nobody but overrides had a chance to change
+    /// combinedDocument. Before and after CombineJson its caller may change anything.
+    [[nodiscard]] bool ContinuesMerging(const rapidjson::Document& document);
 
     std::map<int, std::string> modulePathTable;
     std::string defaultJson;
@@ -79,9 +79,11 @@ protected:
     std::vector<std::unique_ptr<rapidjson::Document>> moduleDocuments;
 
 public:
-    /// The merged result, to be read only. Its values lie in the module documents' pools too.
+    /// The merged result. Its values lie in the module documents' pools too. While CombineJson runs,
+    /// overrides may add to it, as the operations of the derived classes do, but not change what it holds.
     rapidjson::Document combinedDocument;
 
 private:
-    bool m_continuesMerging = false;
+    int m_callCount = 0;  ///< of CombineJson
+    int m_mergedCall = 0; ///< the one whose document was last passed to ContinuesMerging; 0 if it was of none
 };

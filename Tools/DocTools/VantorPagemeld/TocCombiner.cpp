@@ -1,10 +1,9 @@
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
 
 #include "Tools/DocTools/VantorPagemeld/Check/TocStructure.h"
+#include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 #include "Tools/DocTools/VantorPagemeld/System/Messages.h"
-
-#include <cstring>
 
 namespace
 {
@@ -29,7 +28,7 @@ const OutputKind TocCombiner::kScriptFile = {ReportUnopened, false};
 
 TocCombiner::TocCombiner()
 {
-    if (!InitializeCombinedDocument())
+    if (!RapidJsonIoUtil::TryGetJsonDocFromString(defaultJson.c_str(), combinedDocument))
     {
         kDiagnostics.CriticalAndExit(17, "Failed to initialize the base JSON object\n");
     }
@@ -44,11 +43,11 @@ bool TocCombiner::VerifyJSONStructure(const rapidjson::Value& node)
 
 void TocCombiner::AppendJsonDocument(rapidjson::Document& document)
 {
-    if (!ContinuesMerging())
+    if (!ContinuesMerging(document))
     {
-        m_siblings.clear();
+        m_merge.emplace(combinedDocument);
     }
-    AppendValue(m_siblings, combinedDocument, document);
+    m_merge->Append(document);
 }
 
 void TocCombiner::AddModuleIndexToEachEntry(rapidjson::Document& document, int moduleIndex)
@@ -69,57 +68,13 @@ bool TocCombiner::OutputJsonValueAsJs(const char* modulePath, const rapidjson::D
 
 bool TocCombiner::SameLinkAndTitle(rapidjson::Value& a, rapidjson::Value& b)
 {
-    return std::strcmp(CStringOf(a["link"]), CStringOf(b["link"])) == 0 &&
-           std::strcmp(CStringOf(a["title"]), CStringOf(b["title"])) == 0;
+    return HasSameLinkAndTitle(a, b);
 }
 
 void TocCombiner::AppendJsonValue(rapidjson::Value& destination, rapidjson::Value& source)
 {
-    SiblingIndexes indexes;
-    AppendValue(indexes, destination, source);
-}
-
-void TocCombiner::AppendValue(SiblingIndexes& indexes, rapidjson::Value& destination,
-                              rapidjson::Value& source)
-{
-    if (source.IsArray())
-    {
-        AppendList(indexes, destination, source);
-    }
-    else if (source.IsObject())
-    {
-        AppendNode(indexes, destination, source);
-    }
-}
-
-void TocCombiner::AppendList(SiblingIndexes& indexes, rapidjson::Value& destination, rapidjson::Value& source)
-{
-    if (!destination.IsArray())
-    {
-        destination.CopyFrom(source, combinedDocument.GetAllocator());
-        return;
-    }
-    SiblingIndex& siblings = indexes.try_emplace(&destination, destination).first->second;
-    for (rapidjson::Value& entry : source.GetArray())
-    {
-        if (rapidjson::Value* children =
-                siblings.FindChildrenOrAppend(entry, combinedDocument.GetAllocator()))
-        {
-            AppendValue(indexes, *children, entry["children"]);
-        }
-    }
-}
-
-void TocCombiner::AppendNode(SiblingIndexes& indexes, rapidjson::Value& destination, rapidjson::Value& source)
-{
-    if (FindMember(destination, "link") == nullptr || FindMember(destination, "title") == nullptr)
-    {
-        destination = source;
-    }
-    else if (SameLinkAndTitle(destination, source))
-    {
-        AppendValue(indexes, destination["children"], source["children"]);
-    }
+    // By a merge of its own: these may be any values, which change between calls.
+    TocMerge(combinedDocument).AppendValue(destination, source);
 }
 
 void TocCombiner::AddPlatformPrefixToLinks(rapidjson::Value& value, int moduleIndex)

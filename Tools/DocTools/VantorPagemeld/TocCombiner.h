@@ -1,11 +1,11 @@
 #pragma once
 
 #include "Tools/DocTools/VantorPagemeld/JsonCombiner.h"
-#include "Tools/DocTools/VantorPagemeld/Merge/SiblingIndex.h"
+#include "Tools/DocTools/VantorPagemeld/Merge/TocMerge.h"
 #include "Tools/DocTools/VantorPagemeld/Render/TocScript.h"
 #include "Tools/DocTools/VantorPagemeld/Write/OutputFile.h"
 
-#include <unordered_map>
+#include <optional>
 
 /// Merges the tables of contents of all modules. Entries of one list that have the same link and title become
 /// one; new ones go to the end of the list in the order of the modules.
@@ -54,14 +54,6 @@ public:
     bool OutputValueAsJs(std::FILE* file, const rapidjson::Value& value, int indent);
 
 private:
-    /// The entries of every list that another was merged into, by the address of its "children" value. That
-    /// stays where it is as long as the node is not given further members.
-    using SiblingIndexes = std::unordered_map<const rapidjson::Value*, SiblingIndex>;
-
-    void AppendValue(SiblingIndexes& indexes, rapidjson::Value& destination, rapidjson::Value& source);
-    void AppendList(SiblingIndexes& indexes, rapidjson::Value& destination, rapidjson::Value& source);
-    void AppendNode(SiblingIndexes& indexes, rapidjson::Value& destination, rapidjson::Value& source);
-
     TocScriptLayout m_layout;
-    SiblingIndexes m_siblings; ///< what one merge keeps for the next
+    std::optional<TocMerge> m_merge; ///< of the documents that CombineJson merges one after the other
 };

@@ -2,14 +2,18 @@
 
 #include <utility>
 
-void PositionTable::Add(std::uint64_t hash, std::uint32_t position)
+void PositionTable::Add(Hash hash)
 {
-    if (2 * (m_taken + 1) > m_slots.size())
+    if (hash)
     {
-        Grow();
+        if (2 * (m_taken + 1) > m_slots.size())
+        {
+            Grow();
+        }
+        Place({static_cast<std::uint32_t>(*hash), m_size});
+        ++m_taken;
     }
-    Place({static_cast<std::uint32_t>(hash), position});
-    ++m_taken;
+    ++m_size;
 }
 
 void PositionTable::Grow()

@@ -2,27 +2,31 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <optional>
 #include <vector>
 
-/// Finds the position of a key in a list that is kept elsewhere, in expected constant time.
+/// Finds the position of a key in a list that is kept elsewhere and grows at its end, in expected constant
+/// time. Like a linear search, it finds the first position of a key.
 ///
 /// An open-addressing table with linear probing that holds 32 bits of each hash and the position: eight bytes
-/// a slot, at least half of the slots free. Only the owner of the list knows the keys: its
-/// `isEqual(position)` returns whether the key looked for is the one at that position.
+/// a slot, at least half of the slots free. Only the owner of the list knows the keys, and compares them. An
+/// element without a hash is never found.
 class PositionTable
 {
 public:
+    using Hash = std::optional<std::uint64_t>;
+
     static constexpr std::uint32_t kNotFound = UINT32_MAX;
 
-    /// Returns the position of the key with that hash, or kNotFound.
+    /// Returns the position of the key with that hash for which `isEqual(position)`, or kNotFound.
     template <class IsEqual>
-    [[nodiscard]] std::uint32_t Find(std::uint64_t hash, IsEqual isEqual) const
+    [[nodiscard]] std::uint32_t Find(Hash hash, IsEqual isEqual) const
     {
-        if (m_slots.empty())
+        if (m_slots.empty() || !hash)
         {
             return kNotFound;
         }
-        const auto shortHash = static_cast<std::uint32_t>(hash);
+        const auto shortHash = static_cast<std::uint32_t>(*hash);
         for (std::size_t i = shortHash & Mask(); m_slots[i].position != kNotFound; i = (i + 1) & Mask())
         {
             if (m_slots[i].hash == shortHash && isEqual(m_slots[i].position))
@@ -33,8 +37,25 @@ public:
         return kNotFound;
     }
 
-    /// Adds a key that Find does not find yet. position is below kNotFound.
-    void Add(std::uint64_t hash, std::uint32_t position);
+    /// Adds the next position, whose key Find does not find yet.
+    void Add(Hash hash);
+
+    /// Adds the positions that are missing below size, whoever appended them to the list. If the list has
+    /// become shorter, starts anew. Takes `hashAt(position)` and `areEqual(position, position)`.
+    template <class HashAt, class AreEqual>
+    void CatchUp(std::uint32_t size, HashAt hashAt, AreEqual areEqual)
+    {
+        if (size < m_size)
+        {
+            *this = PositionTable();
+        }
+        while (m_size < size)
+        {
+            const Hash hash = hashAt(m_size);
+            const std::uint32_t same = Find(hash, [&](std::uint32_t i) { return areEqual(i, m_size); });
+            Add(same == kNotFound ? hash : std::nullopt);
+        }
+    }
 
 private:
     struct Slot
@@ -49,4 +70,5 @@ private:
 
     std::vector<Slot> m_slots; // a power of two or none; at most half of them are taken
     std::size_t m_taken = 0;
+    std::uint32_t m_size = 0;
 };

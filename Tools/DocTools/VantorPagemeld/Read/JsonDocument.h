@@ -5,9 +5,10 @@
 #include <array>
 #include <cstddef>
 #include <string_view>
+#include <utility>
 
-// The memory of a JSON document, and access to its values that never triggers an assertion of the JSON
-// library, whatever the value is.
+// The memory of a JSON document, copies of its values, and access to them that never triggers an assertion of
+// the JSON library, whatever the value is.
 //
 // References into an array or object become invalid when that array or object grows. The text of a string
 // lives as long as the value that holds it, since short texts lie inside the value itself.
@@ -48,4 +49,28 @@ inline std::string_view BytesOf(const rapidjson::Value& string)
 inline const char* CStringOf(const rapidjson::Value& string)
 {
     return string.GetString();
+}
+
+/// A document that is built of parse events, and copies every string. The library's own copy of a value
+/// shares constant strings with the original.
+class CopyBuilder : public rapidjson::Document
+{
+public:
+    explicit CopyBuilder(AllocatorType& allocator) : GenericDocument(&allocator) {}
+
+    bool String(const char* text, rapidjson::SizeType length, bool /*copy*/)
+    {
+        return GenericDocument::String(text, length, true);
+    }
+
+    bool Key(const char* text, rapidjson::SizeType length, bool copy) { return String(text, length, copy); }
+};
+
+/// Returns a copy of the value that shares nothing with it, made with the allocator.
+inline rapidjson::Value DeepCopy(const rapidjson::Value& value, rapidjson::Document::AllocatorType& allocator)
+{
+    CopyBuilder builder(allocator);
+    const auto replay = [&](rapidjson::Document& /*builder*/) { return value.Accept(builder); };
+    builder.Populate(replay);
+    return std::move(static_cast<rapidjson::Value&>(builder));
 }
