@@ -16,8 +16,16 @@ if(PAGEMELD_SITE)
     endforeach()
 endif()
 
+# The README that is installed begins where the sources are no longer needed.
+file(READ README.md readme)
+string(REGEX REPLACE "## Try it.*\n## From HTML" "## From HTML" readme "${readme}")
+if(readme MATCHES "script/|cmake ")
+    message(FATAL_ERROR "The README to install names what only the sources have")
+endif()
+file(WRITE ${PROJECT_BINARY_DIR}/README.md "${readme}")
+
 if(NOT makes_site)
-    install(FILES README.md CHANGELOG.md CONTRIBUTING.md SECURITY.md DESTINATION ${CMAKE_INSTALL_DOCDIR})
+    install(FILES ${PROJECT_BINARY_DIR}/README.md CHANGELOG.md CONTRIBUTING.md SECURITY.md DESTINATION ${CMAKE_INSTALL_DOCDIR})
     install(DIRECTORY docs DESTINATION ${CMAKE_INSTALL_DOCDIR} PATTERN site.css EXCLUDE)
     return()
 endif()

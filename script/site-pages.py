@@ -1,8 +1,8 @@
 #!/usr/bin/env python3
-"""Makes the pages of our guides and manual pages: site-pages.py MAN_DIRECTORY SITE
+"""Makes the pages of our guides and manual pages: site-pages.py BUILD SITE
 
-The manual pages are taken from man1 and man5 below MAN_DIRECTORY. Each module of SITE gets the set directory Manual. Ends
-with an error if a page links to a heading that is not there, or to a file that is neither in the site nor a picture.
+The manual pages and the README to install are taken from the build directory BUILD. Each module of SITE gets the set
+directory Manual. Ends with an error if a page links to a heading that is not there, or to a file that is neither in the site nor a picture.
 """
 import html
 import os
@@ -57,17 +57,23 @@ def add_anchor(heading):
     return f'<h{level} id="{anchor}">{markup}</h{level}>'
 
 
-def convert_guide(source):
-    return re.sub("<h([1-6])>(.*?)</h[1-6]>", add_anchor, run("cmark-gfm", "--extension", "table", source))
+def convert_guide(file):
+    return re.sub("<h([1-6])>(.*?)</h[1-6]>", add_anchor, run("cmark-gfm", "--extension", "table", file))
 
 
-def convert_manual_page(source, man_directory):
+def convert_manual_page(source, build):
     name, section = Path(source).stem, Path(source).suffix[1:]
-    content = run("mandoc", "-Thtml", "-O", "fragment,man=%N.%S", f"{man_directory}/man{section}/{name}.{section}")
+    content = run("mandoc", "-Thtml", "-O", "fragment,man=%N.%S", build / f"man/man{section}/{name}.{section}")
     _, _, body = content.partition("</table>\n")  # a table with the name comes first, one with the date last
     body, _, _ = body.rpartition('<table class="foot">')
     sections = re.sub("<(/?)h1", r"<\1h2", body)
     return f"<h1>{name}({section})</h1>\n{sections}"
+
+
+def convert(source, build):
+    if source.endswith(".md"):
+        return convert_guide(build / source if source == "README.md" else source)
+    return convert_manual_page(source, build)
 
 
 def mend_links(contents, source, pages, site):
@@ -93,13 +99,12 @@ def write_page(file, content):
 
 
 def main():
-    man_directory, site = sys.argv[1], Path(sys.argv[2])
+    build, site = map(Path, sys.argv[1:])
     for module in SOURCES:
         (site / module / "Manual").mkdir(parents=True)
         shutil.copy("docs/site.css", site / module / "Manual")
     pages = place_pages()
-    contents = {source: convert_guide(source) if source.endswith(".md") else convert_manual_page(source, man_directory)
-                for source in pages}
+    contents = {source: convert(source, build) for source in pages}
     for source, page in pages.items():
         write_page(site / page, mend_links(contents, source, pages, site))
 
