@@ -42,9 +42,9 @@ class Page(NamedTuple):
 
 
 def find_words(text):
-    """Returns the set of terms of a text."""
+    """Returns the set of terms of a text. One is left out, because in a script it sets a prototype instead of a member."""
     text = text.lower()
-    return set((ASCII_WORD if text.isascii() else WORD).findall(text)) - COMMON.keys()
+    return set((ASCII_WORD if text.isascii() else WORD).findall(text)) - COMMON.keys() - {"__proto__"}
 
 
 def find_plain_words(text):
