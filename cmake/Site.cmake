@@ -18,7 +18,7 @@ endif()
 
 # The README that is installed begins where the sources are no longer needed.
 file(READ README.md readme)
-string(REGEX REPLACE "## Try it.*\n## From HTML" "## From HTML" readme "${readme}")
+string(REGEX REPLACE "## Try it.*\n## Install" "## Install" readme "${readme}")
 if(readme MATCHES "script/|cmake ")
     message(FATAL_ERROR "The README to install names what only the sources have")
 endif()
@@ -31,7 +31,7 @@ if(NOT makes_site)
 endif()
 
 set(site ${PROJECT_BINARY_DIR}/site)
-file(GLOB site_sources CONFIGURE_DEPENDS *.md docs/* man/* packaging/Doxyfile script/site* web/*)
+file(GLOB site_sources CONFIGURE_DEPENDS *.md Tools/DocTools/PagemeldDocdata/* docs/* man/* packaging/Doxyfile script/site* web/*)
 file(GLOB_RECURSE headers CONFIGURE_DEPENDS Modules/*.h Runtime/*.h Tools/*.h)
 add_custom_command(
     OUTPUT site.stamp

@@ -57,8 +57,10 @@ def add_anchor(heading):
     return f'<h{level} id="{anchor}">{markup}</h{level}>'
 
 
-def convert_guide(file):
-    return re.sub("<h([1-6])>(.*?)</h[1-6]>", add_anchor, run("cmark-gfm", "--extension", "table", file))
+def convert_guide(source, file):
+    content = re.sub("<h([1-6])>(.*?)</h[1-6]>", add_anchor, run("cmark-gfm", "--extension", "table", file))
+    manual_pages = os.path.relpath("man", Path(source).parent)
+    return re.sub(r"(<code>(pagemeld[\w-]*)\((\d)\)</code>)", rf'<a href="{manual_pages}/\2.\3">\1</a>', content)
 
 
 def convert_manual_page(source, build):
@@ -72,7 +74,7 @@ def convert_manual_page(source, build):
 
 def convert(source, build):
     if source.endswith(".md"):
-        return convert_guide(build / source if source == "README.md" else source)
+        return convert_guide(source, build / source if source == "README.md" else source)
     return convert_manual_page(source, build)
 
 
