@@ -28,10 +28,5 @@ def main():
     options = SetOptions(arguments.root_link, arguments.root_title, arguments.title, arguments.toc, arguments.share,
                          arguments.exclude, arguments.jobs)
     for directory in map(os.path.abspath, arguments.set_directories):
-        files = make_docdata(directory, options)
-        if not files:
+        if not make_docdata(directory, options):
             parser.exit(1, f"pagemeld-docdata: {directory} has no pages\n")
-        os.makedirs(os.path.join(directory, "docdata"), exist_ok=True)
-        for name, text in files.items():
-            with open(os.path.join(directory, "docdata", name), "w", encoding="utf-8", newline="\n") as file:
-                file.write(text)

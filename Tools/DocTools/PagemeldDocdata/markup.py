@@ -1,6 +1,5 @@
 """Takes HTML apart. One regular expression finds the tags as browsers do, also in broken pages, and passes over what is
 no text; html.parser does the same with a Python call for every step, and takes five times as long."""
-import functools
 import re
 from html import unescape
 
@@ -42,9 +41,8 @@ def decode(data):
     return data.decode(find_encoding(data), "replace").removeprefix("\ufeff")
 
 
-@functools.lru_cache(maxsize=4096)
 def read_attributes(text):
-    """Returns the attributes of a tag as a dictionary that nobody may change; names are in lower case."""
+    """Returns the attributes of a tag as a dictionary; names are in lower case."""
     values = {}
     for name, *quoted in ATTRIBUTE.findall(text):
         values.setdefault(name.lower(), unescape("".join(quoted)))

@@ -1,11 +1,12 @@
 """Reads a page: its title, and its sections. A section begins at a heading or at the name of a member, and has an
 anchor if one leads there."""
+import functools
 import re
 import unicodedata
 from typing import NamedTuple
 
 from generators import LISTING, MEMBER, NAME, PARTS, SKIP, SKIPPED_ROLES, SKIPPED_TAGS, TEXT, UNUSED
-from markup import TOKEN, first_line, read_attributes, squeeze
+from markup import TAG, TOKEN, first_line, read_attributes, squeeze
 
 COMMON = dict.fromkeys("a an and are as at be by for from has in is it its of on one or that the to with".split(), 1)
 # Queries are split into runs of letters, marks, digits and "_". \w matches all of these except the marks.
@@ -14,9 +15,13 @@ WORD = re.compile(f"[\\w{MARKS}]+")
 ASCII_WORD = re.compile(r"\w+", re.A)
 LONG_NUMBER = re.compile(r"\d{5,}")
 NUMBER = re.compile(r"^[\dA-Z]+(\.\d+)*\.?\s+")
+MAIN = "main"
 MARKED = re.compile(r"\b(?:id|class|name|role)\s*=", re.I)
 LONGEST_WORD = 40
 SHOWN_LENGTH = 300
+
+TITLE = re.compile(r"<title[^>]*>(.*?)</title", re.S | re.I)
+HEADING = re.compile(r"<h([1-6])\b[^>]*>(.*?)</h\1", re.S | re.I)
 
 LEVELS = {"h1": 1, "h2": 2, "h3": 3, "h4": 4, "h5": 5, "h6": 6, "dt": 7, MEMBER: 7}
 KINDS = {**{name: name for name in ("h1", "h2", "h3", "h4", "h5", "h6", "dt", "title")}, "p": TEXT}
@@ -59,6 +64,19 @@ def shorten(text):
     return text[:SHOWN_LENGTH - 1].rpartition(" ")[0] + " \u2026"
 
 
+@functools.lru_cache(maxsize=4096)
+def read_traits(name, attributes):
+    """Returns what the tables say of an element, "" if nothing, and its anchor, "" if it has none."""
+    values = read_attributes(attributes) if MARKED.search(attributes) else {}
+    role = values.get("role")
+    if name in SKIPPED_TAGS or role in SKIPPED_ROLES:
+        return SKIP, ""
+    part = next((PARTS[name, one] for one in values.get("class", "").split() if (name, one) in PARTS), "")
+    if name == "main" or role == "main":
+        part = MAIN
+    return part, values.get("id") or name == "a" and values.get("name") or ""
+
+
 class OpenSection:
     """A section while it is read."""
 
@@ -76,8 +94,7 @@ class OpenSection:
         lead = self.lead or (self.texts.pop(0) if self.texts else "")
         words = find_words(self.heading) | find_plain_words(lead)
         more_words = find_plain_words(" ".join(self.texts)) - words
-        return Section(self.level, self.anchor, self.heading, self.name, shorten(lead), " ".join(sorted(words)),
-                       " ".join(sorted(more_words)))
+        return Section(self.level, self.anchor, self.heading, self.name, shorten(lead), " ".join(words), " ".join(more_words))
 
 
 class PageReader:
@@ -108,12 +125,14 @@ class PageReader:
             listing, name, attributes = token.groups()
             if name is None:
                 self.add_listing(listing)  # None of a comment
-            elif name[0] != "/":
-                self.start(name.lower(), attributes)
-            elif name == "/main":
+                continue
+            name = name.lower()
+            if name == "/main":
                 break
-            else:
-                self.end(name[1:].lower())
+            if name[0] == "/":
+                self.end(name[1:])
+            elif self.part or attributes or name in BLOCKS or name in SKIPPED_TAGS or name == "br":
+                self.start(name, attributes)
         else:
             self.data.append(html[position:])
         self.end_block()
@@ -123,7 +142,9 @@ class PageReader:
         if self.part:
             self.part_depth += name == self.part_tag
             return
-        part, anchor = self.read_traits(name, attributes)
+        part, anchor = read_traits(name, attributes)
+        if part == MAIN:
+            self.start_over()
         if part in (SKIP, LISTING, NAME):
             self.part, self.part_tag, self.part_depth, self.part_start = part, name, 1, len(self.data)
         elif part or name in BLOCKS:
@@ -143,17 +164,6 @@ class PageReader:
             self.anchor = ""
         elif name == "dl":
             self.outer.append(self.section)
-
-    def read_traits(self, name, attributes):
-        """Returns what the tables say of an element, "" if nothing, and its anchor, "" if it has none."""
-        values = read_attributes(attributes) if MARKED.search(attributes) else {}
-        role = values.get("role")
-        if name in SKIPPED_TAGS or role in SKIPPED_ROLES:
-            return SKIP, ""
-        if name == "main" or role == "main":
-            self.start_over()
-        part = next((PARTS[name, one] for one in values.get("class", "").split() if (name, one) in PARTS), "")
-        return part, values.get("id") or name == "a" and values.get("name") or ""
 
     def end(self, name):
         if self.part:
@@ -194,7 +204,8 @@ class PageReader:
             self.title = self.title or text
         elif block not in LEVELS and block != UNUSED:
             self.section.add(text, block == TEXT)
-        self.data, self.anchor_at = [], 0
+        self.data.clear()
+        self.anchor_at = 0
 
     def end_heading(self, block, text):
         """Begins a section, unless the heading is that of the page, has no text, or is a term that nothing leads to."""
@@ -221,4 +232,14 @@ def find_name(heading, name, block):
 
 
 def read_page(html):
+    """Returns the page that a text describes."""
     return PageReader().read(html)
+
+
+def read_headings(html):
+    """Returns the page with its title and headings only; where headings stand makes no difference."""
+    titles = [squeeze(TAG.sub(" ", text)) for text in TITLE.findall(html)]
+    headings = [squeeze(TAG.sub(" ", text)) for _, text in HEADING.findall(html)]
+    title = titles[0] if titles else ""
+    heading = headings[0] if headings else ""
+    return Page(title, heading, [Section(0, "", heading, heading, "", " ".join(find_words(" ".join(headings))), "")])

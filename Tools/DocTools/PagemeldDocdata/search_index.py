@@ -1,31 +1,25 @@
 """Makes the search index of a set from its pages: entries for pages and for the places in them, the texts that are
 shown, and for each word the texts that have it."""
 import collections
+import json
 import re
-from typing import NamedTuple
+from array import array
 
 from page import COMMON, find_words
 from titles import replace_unwritable
 
-# The scripts escape nothing in paths, and "#" ends one.
+# The scripts escape nothing in paths.
 UNWRITABLE = re.compile('["\\\\\0-\x1f\x7f\ud800-\udfff]')
 REPEATED_SHARE = 0.25  # of the pages: a heading on more of them, such as "Examples", names no place
 REPEATED_LEAST = 10
 FREQUENT_SHARE = 0.05  # of the texts: a word in more of them is left out beyond headings and first paragraphs
 FREQUENT_LEAST = 20
 
-
-class Text(NamedTuple):
-    """A text with the words that it is found by, those shown and the others, in the entry that it belongs to."""
-    entry: int
-    shown: str
-    words: str
-    more_words: str
+encode = json.JSONEncoder(ensure_ascii=False).encode
 
 
 def find_repeated_headings(pages):
-    uses = collections.Counter(heading for page in pages.values()
-                               for heading in {section.heading for section in page.sections})
+    uses = collections.Counter(heading for page in pages for heading in page.headings)
     least = max(REPEATED_LEAST, REPEATED_SHARE * len(pages))
     return {heading for heading, count in uses.items() if count > least}
 
@@ -35,65 +29,82 @@ def join_shown(section, title):
 
 
 class IndexMaker:
-    """Collects the entries and texts of all pages, then orders the words."""
+    """Collects the entries, texts and words of the pages, in the order in which they are added. Entries and texts are
+    kept as lines of the file, which takes the least memory."""
 
     def __init__(self, repeated_headings):
         self.repeated_headings = repeated_headings
         self.entries, self.texts = [], []
+        self.words = collections.defaultdict(lambda: array("I"))  # in headings and first paragraphs, with their texts
+        self.more_words = collections.defaultdict(lambda: array("I"))  # elsewhere
+        self.last_entry = -1  # that has a text
+        self.term_count = 0  # once they are written
 
-    def add_page(self, path, title, page, is_generated):
-        self.entries.append([path, title])
-        if is_generated:
-            self.add_headings(page)
-            return
-        around = [(0, len(self.entries) - 1)]  # the places that hold the section, with the levels of their headings
-        for section in page.sections:
+    def add_page(self, path, title, sections):
+        """Adds the entry of a page, then those of its places. A section that is no place belongs to the place before it
+        that has a larger heading, or to the page."""
+        around = [(0, self.add_entry(path, title), title)]
+        for section in sections:
             while around[-1][0] >= section.level > 0:
                 around.pop()
             if self.is_place(section):
-                around.append((section.level, len(self.entries)))
-                self.entries.append([f"{path}#{section.anchor}", replace_unwritable(section.name)])
-            self.add_text(around[-1][1], section)
+                name = replace_unwritable(section.name)
+                around.append((section.level, self.add_entry(f"{path}#{section.anchor}", name), name))
+            _, entry, title = around[-1]
+            self.add_section(entry, title, section)
+
+    def add_entry(self, path, title):
+        self.entries.append(encode([path, title]))
+        return len(self.entries) - 1
 
     def is_place(self, section):
         return section.anchor and section.heading not in self.repeated_headings and not UNWRITABLE.search(section.anchor)
 
-    def add_headings(self, page):
-        """Adds only what a generated page is called."""
-        path, title = self.entries[-1]
-        words = find_words(" ".join([title, *(section.heading for section in page.sections)]))
-        self.texts.append(Text(len(self.entries) - 1, title, words, ()))
+    def add_section(self, entry, title, section):
+        """Adds the text of a section. A heading without text, such as "Member Function Documentation", is left out, but
+        each entry gets a text, by which its title is found."""
+        is_first = entry > self.last_entry
+        if is_first or section.lead or section.more_words:
+            words = set(section.words.split())
+            self.add_text(entry, join_shown(section, title), words | find_words(title) if is_first else words,
+                          section.more_words.split())
 
-    def add_text(self, entry, section):
-        title = self.entries[entry][1]
-        is_first = not self.texts or self.texts[-1].entry < entry
-        if not (is_first or section.lead or section.more_words):
-            return  # a heading without text, such as Doxygen's "Member Function Documentation"
-        words = set(section.words.split())
-        if is_first:
-            words |= find_words(title)
-        if words or section.more_words:
-            self.texts.append(Text(entry, join_shown(section, title), words, section.more_words.split()))
+    def add_text(self, entry, shown, words, more_words):
+        number = len(self.texts)
+        for word in words:
+            self.words[word].append(number)
+        for word in more_words:
+            self.more_words[word].append(number)
+        if words or more_words:
+            self.texts.append(encode([shown, entry]))
+            self.last_entry = max(entry, self.last_entry)
 
-    def order_words(self):
-        """Returns the numbers of the texts that have a word, by word."""
-        found, more = collections.defaultdict(list), collections.defaultdict(list)
-        for number, text in enumerate(self.texts):
-            for word in text.words:
-                found[word].append(number)
-            for word in text.more_words:
-                more[word].append(number)
+    def list_terms(self):
+        """Returns the words with the numbers of their texts, in order, as lines of the file."""
         most = max(FREQUENT_LEAST, FREQUENT_SHARE * len(self.texts))
-        for word, numbers in more.items():
-            if len(numbers) + len(found.get(word, ())) <= most:
-                found[word] = sorted(found[word] + numbers) if word in found else numbers
-        return dict(sorted(found.items()))
+        for word in sorted(self.words.keys() | self.more_words.keys()):
+            numbers, more = self.words.get(word, array("I")), self.more_words.get(word, array("I"))
+            if len(numbers) + len(more) <= most:
+                numbers = sorted(numbers + more)
+            if numbers:
+                yield f"{encode(word)}: {list(numbers)}"
+
+    def write(self, file):
+        """Writes index.json, with a line for each page, text and term, and counts the terms."""
+        file.write('{"pages": [\n' + ",\n".join(self.entries))
+        file.write('\n],\n"info": [\n' + ",\n".join(self.texts))
+        file.write(f'\n],\n"common": {encode(COMMON)},\n"searchIndex": {{')
+        self.term_count = 0
+        for line in self.list_terms():
+            file.write(("," if self.term_count else "") + "\n" + line)
+            self.term_count += 1
+        file.write("\n}}\n")
 
 
-def make_index(pages, titles, is_generated):
-    """Returns the value of index.json."""
-    maker = IndexMaker(find_repeated_headings(pages))
-    for path, page in pages.items():
-        maker.add_page(path, titles[path], page, is_generated(path))
-    return {"pages": maker.entries, "info": [[text.shown, text.entry] for text in maker.texts], "common": COMMON,
-            "searchIndex": maker.order_words()}
+def make_index(pages, titles):
+    """Returns the maker of the index of pages, which are packed, by path. Takes them out of the dictionary, since texts
+    and pages together would need twice the memory."""
+    maker = IndexMaker(find_repeated_headings(pages.values()))
+    for path, title in titles.items():
+        maker.add_page(path, title, pages.pop(path).unpack())
+    return maker
