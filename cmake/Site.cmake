@@ -31,7 +31,8 @@ if(NOT makes_site)
 endif()
 
 set(site ${PROJECT_BINARY_DIR}/site)
-file(GLOB site_sources CONFIGURE_DEPENDS *.md Tools/DocTools/PagemeldDocdata/* docs/* man/* packaging/Doxyfile script/site* web/*)
+file(GLOB site_sources CONFIGURE_DEPENDS
+     *.md Tools/DocTools/PagemeldDocdata/* docs/* man/* packaging/Doxyfile script/site* web/*)
 file(GLOB_RECURSE headers CONFIGURE_DEPENDS Modules/*.h Runtime/*.h Tools/*.h)
 add_custom_command(
     OUTPUT site.stamp
