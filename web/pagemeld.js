@@ -7,11 +7,9 @@
 (function () {
     "use strict";
 
-    const RESULTS_AT_ONCE = 30;
-    const [EXCERPT_LENGTH, LEAD_LENGTH] = [300, 80]; // the lead comes before the first word found
-    const HELD = 1 << 12; // more than all words of a query add otherwise
-    const LETTER = "[\\p{L}\\p{M}\\p{N}_]";
-    const WORDS = new RegExp(`${LETTER}+`, "gu");
+    const RESULTS_AT_ONCE = 10;
+    const SLICE = 30; // ms of work without a pause
+    const SETS = ["Manual", "ScriptReference"];
 
     const fresh = document.documentElement.appendChild(create("iframe", {}));
     const { Map, Set, URL } = fresh.contentWindow; // a page may redefine these
@@ -22,6 +20,7 @@
     const shared = tag.dataset.docdata;
     const docdata = shared ? new URL(shared.replace(/\/?$/, "/"), document.URL) : new URL(".", ownAddress);
     const setFolder = new URL("..", docdata).href;
+    const docdataName = docdata.href.slice(setFolder.length);
 
     const box = create("input", { type: "search", autocomplete: "off", spellcheck: "false" });
     const filter = create("select", {}, create("option", { value: "" }, "All"));
@@ -35,7 +34,7 @@
     const view = create("div", { class: "pagemeld-view", hidden: "" },
         finder, create("nav", { "aria-label": "Contents" }, contentsButton, contents));
 
-    let index = null; // until it is loaded
+    const indexes = []; // of the sets that are loaded, the own one first
     let found = { pages: [] };
 
     function create(name, attributes, ...children) {
@@ -45,27 +44,30 @@
         return element;
     }
 
-    // The named globals, and p0, p1, ... as prefixes, longest first; null if a name is missing.
-    function takeGlobals(source, names) {
-        const values = Object.fromEntries(names.map((name) => [name, source[name]]));
-        const prefixes = Object.keys(source).filter((key) => /^p\d+$/.test(key)).map((key) => source[key]);
-        prefixes.sort((a, b) => b.length - a.length);
-        return names.every((name) => values[name] instanceof source.Object) ? { ...values, prefixes } : null;
-    }
-
     const loaded = (element, parent) =>
         new Promise((done) => { element.onload = element.onerror = done; parent.append(element); });
 
-    // A script that throws has a load event too: what it assigned tells whether it ran. The frame is UTF-8.
-    async function runOutput(name, globals, subject, complaint) {
+    // A hidden document in UTF-8.
+    async function openFrame() {
         const frame = create("iframe", {});
         frame.style.display = "none";
         await loaded(frame, view);
-        await loaded(create("script", { src: new URL(name, docdata) }), frame.contentDocument.head);
-        const values = takeGlobals(frame.contentWindow, globals);
-        frame.remove();
-        complaint.textContent = values ? "" : `${subject} not available: ${name} did not run`;
-        return values;
+        return frame;
+    }
+
+    // Runs an output in a frame. Returns the named globals, null if one is missing, and p0, p1, ... as prefixes, longest
+    // first. A script that throws has a load event too: what it assigned tells whether it ran.
+    async function runOutput(frame, address, names, subject, complaint) {
+        await loaded(create("script", { src: address }), frame.contentDocument.head);
+        const source = frame.contentWindow;
+        const prefixes = Object.keys(source).filter((key) => /^p\d+$/.test(key)).map((key) => source[key]);
+        const isThere = names.every((name) => source[name] instanceof source.Object);
+        const file = address.split("/").at(-1);
+        complaint.textContent = isThere ? "" : `${subject} not available: ${file} did not run`;
+        return {
+            values: isThere ? Object.fromEntries(names.map((name) => [name, source[name]])) : null,
+            prefixes: prefixes.sort((a, b) => b.length - a.length),
+        };
     }
 
     const decode = (text) => { try { return decodeURIComponent(text); } catch { return text; } }; // not UTF-8
@@ -74,7 +76,7 @@
 
     // A link is a path on disk, in which only "#" has a meaning. The outputs put the prefix before whole addresses
     // too. "std::list.html" is not one, and "javascript:" must not run.
-    function addressOf(link, prefixes) {
+    function addressOf(link, prefixes, folder = setFolder) {
         const prefix = prefixOf(link, prefixes);
         const rest = link.slice(prefix.length);
         if (/^(?!javascript:)[a-z][a-z\d+.-]+:(?!:)/i.test(rest)) {
@@ -82,96 +84,59 @@
         }
         const end = `${rest}#`.indexOf("#");
         const path = encode(prefix, /[\0- %?#\\]/g) + encode(rest.slice(0, end), /[\0- %?\\]/g);
-        return setFolder + path + rest.slice(end);
+        return folder + path + rest.slice(end);
     }
 
-    const createLink = (link, title, prefixes) =>
-        create("a", { href: addressOf(link, prefixes), target: "_self" }, title.trim() || link);
-
-    const wordsOf = (text) => text.toLowerCase().match(WORDS) || [];
+    const createLink = (link, title, prefixes, folder) =>
+        create("a", { href: addressOf(link, prefixes, folder), target: "_self" }, title.trim() || link);
 
     // The module directory: "charts" for ".../charts/Manual/".
-    const moduleName = (prefix) => decode(new URL(addressOf(prefix, [prefix])).pathname.split("/").at(-3) ?? "");
-    const moduleOf = (page) => index.modules.get(prefixOf(index.pages[page][0], index.prefixes));
+    const nameOf = (address, level) => decode(new URL(address).pathname.split("/").at(level) ?? "");
 
-    // What a search needs beside the lists themselves.
-    function orderIndex(lists) {
-        const titles = new Map();
-        lists.pages.forEach(([, title], page) => wordsOf(title).forEach((word) => {
-            titles.has(word) ? titles.get(word).push(page) : titles.set(word, [page]);
-        }));
-        return {
-            ...lists,
-            titles,
-            words: [...Object.keys(lists.searchIndex), ...titles.keys()],
-            pageOfText: new Int32Array(lists.info.map(([, page]) => page)),
-            modules: new Map(["", ...lists.prefixes].map((prefix) => [prefix, moduleName(prefix)])),
-        };
-    }
-
-    // Marks texts and pages that hold a word. A page has HELD, also 2 if in its title, and 1 if whole.
-    function lookUp(word, isPrefix) {
-        const { searchIndex, titles, words, pageOfText } = index;
-        const texts = new Uint8Array(pageOfText.length);
-        const pages = new Uint16Array(index.pages.length);
-        for (const term of isPrefix ? words.filter((other) => other.startsWith(word)) : [word]) {
-            const whole = term === word ? 1 : 0;
-            for (const text of Object.hasOwn(searchIndex, term) ? searchIndex[term] : []) {
-                texts[text] = 1;
-                pages[pageOfText[text]] |= HELD | whole;
+    // Runs the index of a set and the search in a frame that stays: its functions are used. Null if the index did not
+    // run. Makes way for the reader's events now and then.
+    async function openIndex(folder, complaint) {
+        const frame = await openFrame();
+        const { values, prefixes } = await runOutput(frame, `${folder}${docdataName}global_index.js`,
+            ["pages", "info", "common", "searchIndex"], "Search is", complaint);
+        await loaded(create("script", { src: new URL("pagemeld-search.js", ownAddress) }), frame.contentDocument.head);
+        const { prepareIndex } = frame.contentWindow;
+        if (!values || !prepareIndex) {
+            frame.remove();
+            return null;
+        }
+        const names = new Map(["", ...prefixes].map((prefix) => [prefix, nameOf(addressOf(prefix, [prefix], folder), -3)]));
+        const set = nameOf(folder, -2);
+        const steps = prepareIndex({ ...values, prefixes });
+        for (let end = performance.now() + SLICE, step; ;) {
+            step = steps.next();
+            if (step.done) {
+                return { search: frame.contentWindow, lookup: step.value, folder, prefixes, names, set };
             }
-            titles.get(term)?.forEach((page) => { pages[page] |= HELD | 2 | whole; });
+            if (performance.now() > end) {
+                await new Promise((done) => setTimeout(done));
+                end = performance.now() + SLICE;
+            }
         }
-        return { texts, pages };
     }
 
-    const addTo = (sums, marks) => { for (let i = 0; i < marks.length; i++) { sums[i] += marks[i]; } };
-
-    // The pages that hold every word, those with the larger sum of marks first, then in their own order, and of
-    // each page the text that holds most words.
-    function search(words) {
-        const { pages: { length }, pageOfText } = index;
-        const scores = new Float64Array(length);
-        const bestTexts = new Int32Array(length).fill(-1);
-        const counts = new Uint16Array(pageOfText.length);
-        words.forEach((word, i) => {
-            const { texts, pages } = lookUp(word, i === words.length - 1);
-            addTo(counts, texts);
-            addTo(scores, pages);
-        });
-        for (let text = 0; text < counts.length; text++) {
-            const page = pageOfText[text];
-            bestTexts[page] = counts[text] <= counts[bestTexts[page]] ? bestTexts[page] : text;
-        }
-        const [ranks, least] = [[], HELD * words.length];
-        scores.forEach((score, page) => score >= least && (ranks[score - least] ??= []).push(page));
-        return { words, pages: ranks.reverse().flat(), bestTexts };
-    }
-
-    // Common words are left out, but for a last one that may become another: "the" finds "theory" while typed.
-    function searchFor(query) {
-        const words = [...new Set(wordsOf(query))];
-        const rare = words.filter((word) => !Object.hasOwn(index.common, word));
-        const isGrowing = rare.at(-1) !== words.at(-1) && query.toLowerCase().endsWith(words.at(-1));
-        const grown = isGrowing ? search([...rare, words.at(-1)]) : null;
-        return grown?.pages.length > 0 ? grown
-            : rare.length > 0 ? search(rare) : { pages: [], isCommonOnly: words.length > 0 };
-    }
-
-    // Some lines around the first of the words, all of which are marked. The last one is a prefix.
-    function excerpt(text, words) {
-        const word = new RegExp(`(?<!${LETTER})(${words.join("|")}${LETTER}*)(?!${LETTER})`, "giu");
-        const first = text.search(word);
-        const end = first > LEAD_LENGTH ? text.slice(first - LEAD_LENGTH).replace(/^\S{0,40}\s/, "\u2026 ") : text;
-        const cut = end.length > EXCERPT_LENGTH ? end.slice(0, EXCERPT_LENGTH).replace(/\s\S{0,40}$/, " \u2026") : end;
-        return cut.split(word).map((piece, i) => (i % 2 === 1 ? create("mark", {}, piece) : piece));
-    }
+    const sourceOf = (lookup) => indexes.find((index) => index.lookup === lookup);
+    const moduleOf = (lookup, page) => sourceOf(lookup).names.get(lookup.prefixes[page]);
 
     function createResult(page) {
-        const [path, title] = index.pages[page];
-        const [text] = index.info[found.bestTexts[page]] ?? [""];
-        return create("li", {}, createLink(path, title, index.prefixes), " ",
-            create("span", {}, moduleOf(page)), create("p", {}, ...excerpt(text, found.words)));
+        const { lookup } = page.weighed;
+        const { folder, prefixes, set } = sourceOf(lookup);
+        const shown = indexes[0].search.describePage(page, found.details);
+        const linkTo = ({ link, title }) => createLink(link, title, prefixes, folder);
+        const source = indexes.length > 1 ? `${moduleOf(lookup, page.page)}, ${set}` : moduleOf(lookup, page.page);
+        const places = shown.places.map((place) => create("li", {}, linkTo(place)));
+        const result = create("li", {}, linkTo(shown), " ", create("span", {}, source),
+            create("p", {}, ...shown.pieces.map((piece, i) => (i % 2 === 1 ? create("mark", {}, piece) : piece))),
+            places.length > 0 ? create("ul", {}, ...places) : "");
+        if (shown.isAsked) {
+            result.querySelector("ul a").dataset.asked = "";
+        }
+        return result;
     }
 
     // Returns the first result that it adds.
@@ -182,31 +147,61 @@
         return results.children[shown];
     }
 
-    function describeFound({ isCommonOnly, words, pages: { length: count } }) {
-        return isCommonOnly ? "Only common words, which are not searched for" : !words ? ""
-            : count === 0 ? "Nothing found" : count === 1 ? "1 page found" : `${count} pages found`;
+    function describeFound({ isCommonOnly, pages }) {
+        const count = pages.length;
+        const whole = pages.filter(({ isWhole }) => isWhole).length;
+        const rest = whole === count ? "" : `, ${whole || "none"} with all words`;
+        return isCommonOnly ? "Only common words, which are not searched for" : box.value.trim() === "" ? ""
+            : count === 0 ? "Nothing found" : (count === 1 ? "1 page found" : `${count} pages found`) + rest;
+    }
+
+    function accepts(lookup, page) {
+        const { set } = sourceOf(lookup);
+        return ["", set, `${set}/${moduleOf(lookup, page)}`].includes(filter.value);
+    }
+
+    function findAll() {
+        found = indexes[0].search.findPages(indexes.map(({ lookup }) => lookup), box.value, accepts);
+        status.textContent = describeFound(found);
     }
 
     function update() {
-        if (index) {
-            found = searchFor(box.value);
-            found.pages = found.pages.filter((page) => !filter.value || moduleOf(page) === filter.value);
+        if (indexes.length > 0) {
+            findAll();
             results.replaceChildren();
             showMore();
-            status.textContent = describeFound(found);
         }
     }
 
+    // The results that are shown stay where they are; those of the index come after them.
+    function join(index) {
+        indexes.push(index);
+        const { set, names } = index;
+        const modules = [...new Set(index.prefixes.map((prefix) => names.get(prefix)))].sort();
+        const options = modules.map((name) => create("option", { value: `${set}/${name}` }, name));
+        filter.append(create("optgroup", { label: set }, create("option", { value: set }, `All of ${set}`), ...options));
+        if (!filter.isConnected && (indexes.length > 1 || modules.length > 1)) {
+            form.append(create("label", {}, "Search in ", filter));
+        }
+        const shown = found.pages.slice(0, results.childElementCount);
+        findAll();
+        const isShown = (page) => shown.some((other) => other.page === page.page && other.weighed.lookup === page.weighed.lookup);
+        found.pages = [...shown, ...found.pages.filter((page) => !isShown(page))];
+        showMore();
+    }
+
+    // The set being read, then the other one; data-sets names those that are searched.
     async function loadIndex() {
         box.onfocus = null;
         status.textContent = "Loading the search index";
-        const lists = await runOutput("global_index.js", ["pages", "info", "common", "searchIndex"], "Search is", status);
-        if (lists) {
-            index = orderIndex(lists);
-            const names = [...new Set(index.prefixes.map((prefix) => index.modules.get(prefix)))].sort();
-            filter.append(...names.map((name) => create("option", {}, name)));
-            names.length > 1 && form.append(create("label", {}, "Module ", filter));
-            update();
+        const own = nameOf(setFolder, -2);
+        const sets = (tag.dataset.sets ?? SETS.join(" ")).split(" ").filter((set) => set !== own && SETS.includes(own));
+        for (const set of [own, ...sets]) {
+            const folder = set === own ? setFolder : new URL(`../${set}/`, setFolder).href;
+            const index = await openIndex(folder, set === own ? status : create("p", {}));
+            if (index) {
+                join(index);
+            }
         }
     }
 
@@ -276,9 +271,11 @@
     }
 
     async function loadContents() {
-        const output = await runOutput("global_toc.js", ["toc"], "Contents are", contents);
-        if (output) {
-            const { toc, prefixes } = output;
+        const frame = await openFrame();
+        const { values, prefixes } = await runOutput(frame, `${docdata}global_toc.js`, ["toc"], "Contents are", contents);
+        frame.remove();
+        if (values) {
+            const { toc } = values;
             const isPage = createPageTest(prefixes);
             const way = findWay(toc.children, (link) => !link.includes("#") && isPage(link)) ??
                 findWay(toc.children, isPage) ?? [];
@@ -326,7 +323,7 @@
         box.oninput = filter.onchange = update;
         box.onblur = results.onclick = keepQuery;
         more.onclick = () => showMore().querySelector("a").focus();
-        form.onsubmit = () => { results.querySelector("a")?.click(); return false; };
+        form.onsubmit = () => { (results.querySelector("li:first-child [data-asked]") ?? results.querySelector("a"))?.click(); return false; };
     }
 
     // The first thing in the body, or in what fills the window by itself, as javadoc's pages do.
