@@ -12,6 +12,8 @@
 
 #include <gtest/gtest.h>
 
+#include <stdexcept>
+
 #include <unistd.h>
 
 using UnitTest::TestAttribute;
@@ -90,6 +92,15 @@ TEST(RunNativeTests, ReportsFailedIgnoredAndUngroupedTests)
                   "returned 3",
               RunWithPlaceholders(filter, tests));
     EXPECT_TRUE(Testing::g_IsRunningNativeTests);
+    EXPECT_EQ(nullptr, Testing::g_TestReporter);
+}
+
+TEST(RunNativeTests, ForgetsTheReporterWhenATestThrows)
+{
+    DescribedTests tests({{"S", "T", "Unit", [] { throw std::runtime_error("of a test"); }}});
+    const CapturedConsole console;
+    TestFilter filter;
+    EXPECT_THROW((void)RunNativeTests(filter, tests), std::runtime_error);
     EXPECT_EQ(nullptr, Testing::g_TestReporter);
 }
 

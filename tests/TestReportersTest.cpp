@@ -169,11 +169,21 @@ TEST(ConsoleTestReporter, SortsIgnoredTestsAndGroupsThemByCaseAndReason)
         {{Ignored("\n\n", "b", 1), Ignored("12345", "b", 1)},
          "\n2 tests were IGNORED!\n[S] 12345 and 1 other test was ignored: b (case 1)\n"},
     };
+    static std::string formats;
+    SetLogEntryHandler(
+        [](LogType, const char* format, std::va_list)
+        {
+            formats += "|" + std::string(format);
+            return true;
+        });
     for (const auto& c : cases)
     {
         const CapturedConsole console;
         std::vector<DisabledTestInfo> ignored = c.ignored;
+        formats.clear();
         ConsoleTestReporter().ReportIgnoredTests(ignored);
         EXPECT_EQ(c.expected, console.GetText());
     }
+    SetLogEntryHandler(nullptr);
+    EXPECT_EQ("|\n%zu %s IGNORED!\n|[%s] %s| and %d other %s ignored|: |%s |(case %i)|\n", formats);
 }

@@ -78,39 +78,33 @@ bool ShareLine(const DisabledTestInfo& a, const DisabledTestInfo& b)
 }
 
 /// The space after a reason stays even if no case number follows.
-core::string DescribeReason(const DisabledTestInfo& info)
+void PrintReason(const DisabledTestInfo& info)
 {
-    core::string text = info.reason.empty() ? "" : info.reason + " ";
+    if (info.caseNumber == 0 && info.reason.empty())
+    {
+        printf_console("No reason given");
+        return;
+    }
+    if (!info.reason.empty())
+    {
+        printf_console("%s ", info.reason.c_str());
+    }
     if (info.caseNumber != 0)
     {
-        text += Format("(case %i)", info.caseNumber);
+        printf_console("(case %i)", info.caseNumber);
     }
-    return text.empty() ? "No reason given" : text;
 }
 
-core::string DescribeIgnoredGroup(const DisabledTestInfo& first, std::size_t otherCount)
+void PrintIgnoredGroup(const DisabledTestInfo& first, std::size_t otherCount)
 {
-    core::string line =
-        Format("[%s] %s", first.details.suiteName, GetDisplayedTestName(first.details).c_str());
+    printf_console("[%s] %s", first.details.suiteName, GetDisplayedTestName(first.details).c_str());
     if (otherCount > 0)
     {
-        line += Format(" and %zu other %s ignored", otherCount, TestsWere(otherCount));
+        printf_console(" and %d other %s ignored", static_cast<int>(otherCount), TestsWere(otherCount));
     }
-    return line + ": " + DescribeReason(first) + "\n";
-}
-
-core::string DescribeGroups(const std::vector<DisabledTestInfo>& sortedTests)
-{
-    core::string lines;
-    for (auto first = sortedTests.begin(); first != sortedTests.end();)
-    {
-        const auto end =
-            std::find_if_not(first + 1, sortedTests.end(),
-                             [&](const DisabledTestInfo& info) { return ShareLine(*first, info); });
-        lines += DescribeIgnoredGroup(*first, static_cast<std::size_t>(end - first) - 1);
-        first = end;
-    }
-    return lines;
+    printf_console(": ");
+    PrintReason(first);
+    printf_console("\n");
 }
 
 } // namespace
@@ -154,6 +148,14 @@ void ConsoleTestReporter::ReportIgnoredTests(std::vector<DisabledTestInfo>& igno
         return;
     }
     std::sort(ignoredTests.begin(), ignoredTests.end(), GroupByBugAndReason);
-    printf_console("\n%zu %s IGNORED!\n%s", ignoredTests.size(), TestsWere(ignoredTests.size()),
-                   DescribeGroups(ignoredTests).c_str());
+    // One print a step, since a log handler sees each of them.
+    printf_console("\n%zu %s IGNORED!\n", ignoredTests.size(), TestsWere(ignoredTests.size()));
+    for (auto first = ignoredTests.begin(); first != ignoredTests.end();)
+    {
+        const auto end =
+            std::find_if_not(first + 1, ignoredTests.end(),
+                             [&](const DisabledTestInfo& info) { return ShareLine(*first, info); });
+        PrintIgnoredGroup(*first, static_cast<std::size_t>(end - first) - 1);
+        first = end;
+    }
 }

@@ -63,6 +63,17 @@ std::unique_ptr<NativeTestReporter> CreateReporter(const TestFilter& filter)
     return reporter;
 }
 
+/// Makes a reporter known to the log handler, until the run ends: normally or by an exception of a test.
+class KnownReporter
+{
+public:
+    explicit KnownReporter(NativeTestReporter& reporter) { Testing::g_TestReporter = &reporter; }
+    ~KnownReporter() { Testing::g_TestReporter = nullptr; }
+
+    KnownReporter(const KnownReporter&) = delete;
+    KnownReporter& operator=(const KnownReporter&) = delete;
+};
+
 /// There is nothing to do between tests on this platform.
 void PlatformSpecificIntraTestHandler(const UnitTest::TestDetails& /*details*/, float /*seconds*/) {}
 
@@ -102,7 +113,7 @@ int RunNativeTests(TestFilter& filter, UnitTest::TestList& tests)
     tests.ForEach(longest);
 
     const std::unique_ptr<NativeTestReporter> reporter = CreateReporter(filter);
-    Testing::g_TestReporter = reporter.get();
+    const KnownReporter known(*reporter);
     reporter->longestSuiteNameLength = longest.longestSuiteNameLength;
     reporter->longestTestNameLength = longest.longestTestNameLength;
     reporter->intraTestHandler = PlatformSpecificIntraTestHandler;
@@ -112,7 +123,6 @@ int RunNativeTests(TestFilter& filter, UnitTest::TestList& tests)
     (void)runner.RunTestsIf(tests, nullptr, filter); // counts failures, of which a test can have several
     const auto failedTestCount = static_cast<int>(reporter->failedTests.size());
     reporter->ReportIgnoredTests(filter.ignoredTests);
-    Testing::g_TestReporter = nullptr;
     return failedTestCount;
 }
 
