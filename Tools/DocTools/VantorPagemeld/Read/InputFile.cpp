@@ -2,8 +2,8 @@
 
 #include "Tools/DocTools/VantorPagemeld/System/ScopedFile.h"
 
+#include <algorithm>
 #include <cerrno>
-#include <cstdint>
 #include <new>
 
 #include <fcntl.h>
@@ -13,8 +13,8 @@
 namespace
 {
 
-/// The parser counts in 32 bits.
-constexpr long kMaxFileSize = UINT32_MAX;
+/// The parser counts in 32 bits, and a NUL is added.
+constexpr std::int64_t kMaxFileSize = std::min<std::uint64_t>(UINT32_MAX, SIZE_MAX - 1);
 
 int OpenDescriptor(const char* path)
 {
@@ -44,21 +44,20 @@ ScopedFile OpenForReading(const char* path)
 
 /// Returns the size in bytes, or -1 for what has none: a directory, whatever its file system reports, or a
 /// pipe. Leaves the stream at its start.
-long SizeOf(std::FILE* file)
+std::int64_t SizeOf(std::FILE* file)
 {
     struct stat status = {};
-    if (::fstat(::fileno(file), &status) != 0 || S_ISDIR(status.st_mode) ||
-        std::fseek(file, 0, SEEK_END) != 0)
+    if (::fstat(::fileno(file), &status) != 0 || S_ISDIR(status.st_mode) || ::fseeko(file, 0, SEEK_END) != 0)
     {
         return -1;
     }
-    const long size = std::ftell(file);
+    const std::int64_t size = ::ftello(file);
     std::rewind(file);
     return size;
 }
 
 /// Returns size + 1 bytes that are not set yet, or null when the size is out of bounds or memory ran out.
-std::unique_ptr<char[]> AllocateText(long size)
+std::unique_ptr<char[]> AllocateText(std::int64_t size)
 {
     return std::unique_ptr<char[]>(size >= 0 && size <= kMaxFileSize
                                        ? new (std::nothrow) char[static_cast<std::size_t>(size) + 1]

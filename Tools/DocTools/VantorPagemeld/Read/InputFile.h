@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <cstdint>
 #include <memory>
 
 /// The result of reading an input file.
@@ -10,12 +11,12 @@ struct InputText
     {
         Read,
         NotOpened, ///< missing, or not readable by this user
-        NotWhole,  ///< not a regular file, above 4 GiB, out of memory, or fewer bytes came than its size
+        NotWhole,  ///< a directory or pipe, above 4 GiB, out of memory, or not as many bytes came as its size
     };
 
     Outcome outcome = Outcome::NotOpened;
     std::unique_ptr<char[]> bytes; ///< all of the file and a NUL after it; null unless outcome is Read
-    long size = 0; ///< of the file in bytes; -1 for what has none, such as a directory or a pipe
+    std::int64_t size = 0; ///< of the file in bytes; -1 for what has none, such as a directory or a pipe
     std::size_t bytesRead = 0;
 };
 
