@@ -31,15 +31,16 @@ TEST(Environment, OutputsNeverTakeTheDescriptorsOfMessages)
     const ExampleDocs docs;
     for (const char* redirections : {"2>&-", ">&-", "<&-", ">&- 2>&-", "<&- >&- 2>&-", "2>/dev/full"})
     {
-        std::vector<std::string> command = {
-            "strace", "-E", "ASAN_OPTIONS=detect_leaks=0", "-o", docs / "trace", "-e", "trace=openat"};
+        std::vector<std::string> command = {"strace",       "-E", "ASAN_OPTIONS=detect_leaks=0", "-o",
+                                            docs / "trace", "-e", "trace=openat,close,rename"};
         const std::vector<std::string> shell = WithStreams(redirections);
         command.insert(command.end(), shell.begin(), shell.end());
         EXPECT_EQ(0, docs.Run(command).status) << redirections;
         EXPECT_EQ("NNNN NNNN", docs.Describe()) << redirections;
         const std::string trace = ReadFile(docs / "trace");
         EXPECT_TRUE(HasMatch(trace, "global_toc.js.tmp.* = [0-9]+$")) << trace;
-        EXPECT_FALSE(HasMatch(trace, "global_.* = [012]$")) << redirections << trace;
+        EXPECT_FALSE(HasMatch(trace, "openat.*global_.* = [012]$")) << redirections << trace;
+        EXPECT_FALSE(HasMatch(trace, "openat.*\nrename")) << "renamed while open: " << trace;
         docs.Restore();
     }
 }

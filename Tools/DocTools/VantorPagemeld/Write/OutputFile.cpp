@@ -47,8 +47,10 @@ bool WriteOutput(const char* path, std::string_view head, SharedText& body, cons
 void ReplaceOutput(const std::string& path, std::string_view head, SharedText& body, const OutputKind& kind)
 {
     const std::string temporaryPath = path + ".tmp";
-    if (WriteOutput(temporaryPath.c_str(), head, body, kind))
+    const bool isReplaced = WriteOutput(temporaryPath.c_str(), head, body, kind) &&
+                            std::rename(temporaryPath.c_str(), path.c_str()) == 0;
+    if (isReplaced && head.empty())
     {
-        (void)std::rename(temporaryPath.c_str(), path.c_str());
+        body.SetOriginal(path);
     }
 }

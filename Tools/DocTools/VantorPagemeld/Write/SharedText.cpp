@@ -17,25 +17,21 @@ bool SharedText::WriteTo(ScopedFile file, std::string_view head)
     {
         return true;
     }
-    // Flushes, so that errors of buffered writes are seen.
-    const bool isComplete =
-        WriteText(file.get(), head) && WriteText(file.get(), TextOf(m_text)) && std::fflush(file.get()) == 0;
-    if (isComplete && head.empty() && m_original == nullptr)
-    {
-        m_original = std::move(file);
-    }
-    return isComplete;
+    // The flush comes last: a write that only filled the buffer has proved nothing yet.
+    return WriteText(file.get(), head) && WriteText(file.get(), TextOf(m_text)) &&
+           std::fflush(file.get()) == 0;
 }
 
 #ifdef PAGEMELD_HAVE_FILE_CLONES
 bool SharedText::CloneTo(std::FILE* file) const
 {
-    if (m_original == nullptr || ::ioctl(::fileno(file), FICLONE, ::fileno(m_original.get())) != 0)
+    const ScopedFile original(m_originalPath.empty() ? nullptr : std::fopen(m_originalPath.c_str(), "rb"));
+    if (original == nullptr || ::ioctl(::fileno(file), FICLONE, ::fileno(original.get())) != 0)
     {
         return false;
     }
-    // The file can be the original itself, under its temporary name after a failed rename: opening it has
-    // then emptied the original.
+    // The original can have been cut short by a full disk. Or file is the original itself, by a link: opening
+    // it has then emptied the original.
     struct stat status = {};
     return ::fstat(::fileno(file), &status) == 0 &&
            static_cast<std::size_t>(status.st_size) == m_text.GetSize();

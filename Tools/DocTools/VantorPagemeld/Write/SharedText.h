@@ -4,11 +4,12 @@
 #include "Tools/DocTools/VantorPagemeld/System/ScopedFile.h"
 
 #include <cstdio>
+#include <string>
 #include <string_view>
 
 /// A text that is rendered once and written to a file of every module.
 ///
-/// On file systems that can clone, files that hold nothing else share the blocks of the first one, which
+/// On file systems that can clone, files that hold nothing else share the blocks of an earlier one, which
 /// takes neither time nor disk space. Each is still a file of its own: changing one leaves the others as they
 /// are.
 class SharedText
@@ -16,17 +17,19 @@ class SharedText
 public:
     explicit SharedText(TextBuffer text);
 
-    /// Writes head and then the text to a file that was opened empty for reading and writing. Closes it, or
-    /// keeps it open, flushed, as the original of later clones.
+    /// Writes head and then the text to a file that was opened empty for writing, and closes it.
     ///
     /// Returns whether every byte reached the file. The result of the close itself is not examined.
     bool WriteTo(ScopedFile file, std::string_view head);
+
+    /// Lets later files be clones of the one at path, which holds the text and nothing else.
+    void SetOriginal(const std::string& path) { m_originalPath = path; }
 
 private:
     [[nodiscard]] bool CloneTo(std::FILE* file) const;
 
     TextBuffer m_text;
-    ScopedFile m_original; // the first file that holds the text, all of it and nothing else
+    std::string m_originalPath; // empty at first; no file is kept open: one is closed before it is renamed
 };
 
 /// Writes all of text to the stream, block by block. Returns false if not all was written.
