@@ -26,13 +26,6 @@ endif()
 check_struct_has_member("struct dirent" d_type dirent.h has_dirent_type LANGUAGE CXX)
 pagemeld_feature(DIRENT_TYPE "${has_dirent_type}")
 
-# A linker that redirects malloc, so that running out of memory ends the process instead of a write through null.
-check_linker_flag(CXX -Wl,--wrap=malloc has_linker_wrap)
-pagemeld_feature(LINKER_WRAP "${has_linker_wrap}")
-if(has_linker_wrap AND NOT PAGEMELD_PORTABLE)
-    target_link_options(pagemeld_objects PUBLIC -Wl,--wrap=malloc,--wrap=realloc)
-endif()
-
 # Relocations that are resolved at start and read-only from then on.
 check_linker_flag(CXX -Wl,-z,relro,-z,now has_relro)
 if(has_relro AND NOT PAGEMELD_PORTABLE)

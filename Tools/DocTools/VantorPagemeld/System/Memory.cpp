@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <cstdlib>
 #include <new>
 
 #ifdef PAGEMELD_HAVE_HEAP_ADVICE
@@ -65,17 +66,10 @@ void PrepareHeap()
 void PrepareHeap() {}
 #endif
 
-#ifdef PAGEMELD_HAVE_LINKER_WRAP
-// The JSON library does not check what malloc and realloc return, so it would write through null when memory
-// runs out. The linker redirects these two, for our objects only, to the functions here (--wrap). Running out
-// of memory then ends the process as it does everywhere else: by std::bad_alloc, which nobody catches.
-
 extern "C"
 {
-    void* RealMalloc(std::size_t size) __asm__("__real_malloc");
-    void* RealRealloc(void* memory, std::size_t size) __asm__("__real_realloc");
-    void* MallocOrEnd(std::size_t size) noexcept __asm__("__wrap_malloc");
-    void* ReallocOrEnd(void* memory, std::size_t size) noexcept __asm__("__wrap_realloc");
+    void* MallocOrEnd(std::size_t size) noexcept __asm__("PagemeldMallocOrEnd");
+    void* ReallocOrEnd(void* memory, std::size_t size) noexcept __asm__("PagemeldReallocOrEnd");
 }
 
 namespace
@@ -94,11 +88,10 @@ void* EndIfNull(void* memory)
 
 void* MallocOrEnd(std::size_t size) noexcept
 {
-    return EndIfNull(RealMalloc(size));
+    return EndIfNull(std::malloc(size));
 }
 
 void* ReallocOrEnd(void* memory, std::size_t size) noexcept
 {
-    return EndIfNull(RealRealloc(memory, size));
+    return EndIfNull(std::realloc(memory, size));
 }
-#endif

@@ -1,0 +1,16 @@
+#pragma once
+
+#include <cstdlib>
+
+// The build includes this header before every source. The JSON library does not check what malloc and realloc
+// return, so it would write through null when memory runs out. Therefore our objects call the two functions
+// of Memory.cpp in their place. Running out of memory then ends the process as it does everywhere else: by
+// std::bad_alloc, which nobody catches.
+
+#ifndef PAGEMELD_CALLS_REAL_MALLOC
+extern "C"
+{
+    decltype(std::malloc) malloc __asm__("PagemeldMallocOrEnd");
+    decltype(std::realloc) realloc __asm__("PagemeldReallocOrEnd");
+}
+#endif
