@@ -15,8 +15,7 @@ import corpus
 LAUNCHER = Path(__file__).parent / "launch.py"
 ALTERNATIVES = Path(__file__).parent / "alternatives"
 BLOCK = 1 << 20
-INDEX_OUTPUT = "global_index.json"
-OUTPUTS = (INDEX_OUTPUT, "global_index.js", "global_toc.json", "global_toc.js")
+OUTPUTS = ("global_index.json", "global_index.js", "global_toc.json", "global_toc.js")
 
 
 class Cost(NamedTuple):
@@ -34,11 +33,6 @@ def run(command):
     if status != 0:
         raise SystemExit(f"{' '.join(command[:3])} ... ended with {status:.0f}")
     return Cost(wall, user, system, user + system, peak)
-
-
-def outputs_of(program):
-    """jq makes only the search index, and of that only the JSON file."""
-    return [INDEX_OUTPUT] if program == "jq" else OUTPUTS
 
 
 def blocks_of(files):
@@ -59,7 +53,6 @@ class Arena:
             "pagemeld": [str(tool), *roots],
             "node": ["node", str(ALTERNATIVES / "combine.mjs"), *roots],
             "python": [sys.executable, str(ALTERNATIVES / "combine.py"), *roots],
-            "jq": ["sh", str(ALTERNATIVES / "combine_index.sh"), *roots],
         }
         self.run("pagemeld")
         self.set_sizes = [self._make_ready(set_name) for set_name in corpus.SETS]
@@ -85,9 +78,9 @@ class Arena:
         for _ in blocks_of([*self._corpus.glob("m*/*/docdata/*"), *self._corpus.glob("ready/*/*")]):
             pass
 
-    def require_outputs(self, program):
+    def require_outputs(self):
         """Ends the benchmark if an output is missing or too short, as on a full disk: such a run does not count."""
-        for output in self._outputs(program):
+        for output in self._outputs():
             ready = self._corpus / "ready" / output.parts[-3] / output.name
             if not output.exists() or output.stat().st_size < ready.stat().st_size:
                 raise SystemExit(f"{output} was not written whole")
@@ -99,15 +92,15 @@ class Arena:
             self.prepare()
             self.run(each)
             digests.append(hashlib.sha256())
-            for block in blocks_of(self._outputs(program)):
+            for block in blocks_of(self._outputs()):
                 digests[-1].update(block)
         if digests[0].digest() != digests[1].digest():
             raise SystemExit(f"{self._corpus.name}: the outputs of {program} differ from those of pagemeld")
         print(f"{self._corpus.name}: {program} makes the same outputs as pagemeld", file=sys.stderr)
 
-    def _outputs(self, program):
+    def _outputs(self):
         directories = sorted(self._corpus.glob("m*/*/docdata"))
-        return [directory / output for directory in directories for output in outputs_of(program)]
+        return [directory / output for directory in directories for output in OUTPUTS]
 
 
 class Rounds:
@@ -126,7 +119,7 @@ class Rounds:
             each.prepare()
         arena, program = self.contenders[name]
         self._costs[name].append(arena.run(program))
-        arena.require_outputs(program)
+        arena.require_outputs()
 
     def median(self, name, measure):
         return statistics.median(getattr(cost, measure) for cost in self._costs[name])

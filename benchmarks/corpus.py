@@ -28,11 +28,10 @@ SHARED_PAGE_SHARE = 0.1  # of the pages there are in every module's
 # The kinds of corpora: they yield module, documentation sets, search index and table of contents.
 
 
-def realistic(modules, manual_pages, reference_pages, has_contents=True):
+def realistic(modules, manual_pages, reference_pages):
     for module in range(modules):
         for set_name, page_count in zip(SETS, (manual_pages, reference_pages)):
-            index, toc = realistic_documents(module, set_name, page_count)
-            yield module, [set_name], index, toc if has_contents else root(None)
+            yield module, [set_name], *realistic_documents(module, set_name, page_count)
 
 
 def many_terms(count):
@@ -64,7 +63,6 @@ CORPORA = {
     "small": lambda: realistic(3, 200, 400),
     "medium": lambda: realistic(10, 2_000, 4_000),
     "large": lambda: realistic(30, 3_300, 6_600),
-    "medium-index": lambda: realistic(10, 2_000, 4_000, has_contents=False),
     "many-modules": lambda: realistic(300, 3, 3),
     "one-module": lambda: realistic(1, 200_000, 200_000),
     "deep": lambda: deep_contents(2_000),
