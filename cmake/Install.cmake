@@ -12,13 +12,13 @@ set(PAGEMELD_WEB_DIRECTORY ${CMAKE_INSTALL_DATADIR}/pagemeld/web)
 configure_package_config_file(
     cmake/PagemeldConfig.cmake.in ${PROJECT_BINARY_DIR}/PagemeldConfig.cmake
     INSTALL_DESTINATION ${package_directory}
-    PATH_VARS PAGEMELD_WEB_DIRECTORY)
+    PATH_VARS CMAKE_INSTALL_BINDIR PAGEMELD_WEB_DIRECTORY)
 write_basic_package_version_file(
     ${PROJECT_BINARY_DIR}/PagemeldConfigVersion.cmake
     COMPATIBILITY SameMajorVersion ARCH_INDEPENDENT)
 install(EXPORT PagemeldTargets NAMESPACE Pagemeld:: DESTINATION ${package_directory})
 install(FILES ${PROJECT_BINARY_DIR}/PagemeldConfig.cmake ${PROJECT_BINARY_DIR}/PagemeldConfigVersion.cmake
-              cmake/PagemeldCombine.cmake cmake/PagemeldModules.cmake
+              cmake/PagemeldCombine.cmake cmake/PagemeldDocdata.cmake cmake/PagemeldModules.cmake
         DESTINATION ${package_directory})
 
 install(DIRECTORY web/ DESTINATION ${PAGEMELD_WEB_DIRECTORY})
@@ -29,6 +29,8 @@ install(DIRECTORY examples DESTINATION ${CMAKE_INSTALL_DOCDIR} PATTERN __pycache
 set(docdata_sources Tools/DocTools/PagemeldDocdata)
 install(PROGRAMS ${docdata_sources}/pagemeld-docdata TYPE BIN)
 install(DIRECTORY ${docdata_sources}/ DESTINATION ${CMAKE_INSTALL_DATADIR}/pagemeld/docdata FILES_MATCHING PATTERN *.py)
+file(WRITE ${PROJECT_BINARY_DIR}/docdata/version "${PROJECT_VERSION}\n")
+install(FILES ${PROJECT_BINARY_DIR}/docdata/version DESTINATION ${CMAKE_INSTALL_DATADIR}/pagemeld/docdata)
 
 install(DIRECTORY schema DESTINATION ${CMAKE_INSTALL_DATADIR}/pagemeld)
 add_subdirectory(man)

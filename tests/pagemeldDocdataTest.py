@@ -1,4 +1,4 @@
-"""Tests pagemeld-docdata by whole outputs: pagemeldDocdataTest.py PROGRAM"""
+"""Tests pagemeld-docdata by what it writes and says: pagemeldDocdataTest.py PROGRAM"""
 import json
 import os
 import subprocess
@@ -6,7 +6,7 @@ import sys
 import tempfile
 import unittest
 
-PROGRAM = sys.argv.pop(1)
+PROGRAM = os.path.abspath(sys.argv.pop(1))
 PAGES = {
     "index.html": """<title>Lib: Main Page (1.0)</title><h1>Site</h1><main><nav><h2>Here</h2></nav><h1>Start</h1>
         <p>The <b>first</b><br>paragraph. <a href="#details">More...</a><p>No other.
@@ -63,7 +63,7 @@ FROM_LISTS = node("index.html", "All",
                   node("index.html", "lib",
                        node("null", "Group", node("a b.html#café", "Café"), node("Foo.html", "Path")),
                        node("sub/index.html", "C:∖new"), node("sub/index.html", "Again")))
-FROM_DIRECTORIES = node("index.html", "Set", node(
+FROM_DIRECTORIES = node("index.html", "Manual", node(
     "index.html", "lib", node("Foo.html", "By “heading”"), node("a b.html", "a b.html"), node("latin.htm", "été"),
     node("members.html", "Gauge Class"), node("plain.html", "Plain"),
     node("sub/index.html", "C:∖new␀", node("sub/w%41?.html", 'Wide "quotes"'))))
@@ -76,7 +76,83 @@ WARNINGS = """'back\\\\slash.html': left out: the scripts can't hold its path
 sub/index.html: what would break the scripts is replaced in the title "C:∖new␀"
 index.html: what would break the scripts is replaced in the title "C:∖new"
 index.html: links to 'gone.html', which is not a page of the set, are left out
-Set: there is no page none.html""".split("\n")
+Manual: there is no page none.html
+plain.html: its lists lead to no page of the set""".split("\n")
+
+
+# A row is what a page has, its places and its texts.
+PLACES = [
+    ("heading, its container, an anchor before it, no anchor",
+     "<h1>P</h1><h2 id=a>Alpha</h2><section id=b><h2>Two</h2></section><a name='c'></a><h3>Three</h3>"
+     "<div id=d>x</div><h2>Four</h2><p>y", ["#a Alpha", "#b Two", "#c Three"], ["P", "Alpha", "Two", "x", "Four – y"]),
+    ("what follows a list of members belongs to the section around it",
+     "<h2 id=s>S</h2><p>lead<dl><dt id=m class=sig><span class=descclassname><span>Q.</span></span>"
+     "<span class=descname>get</span>(x)<dd><p>Gets.</dl>after", ["#s S", "#m Q.get"], ["P", "lead", "Q.get(x) – Gets."]),
+    ("members of other generators",
+     "<a id='f()'><!-- --></a><ul><li><h4>f</h4><div class=block>Old javadoc.</div></ul>"
+     "<div class=refsect2><a name=g></a><h3>g ()</h3><p>gtk-doc.</div>"
+     "<section id=method.h><a class=src href=s>source</a><h4>pub fn <a class=fn>h</a>() -&gt; T</h4></section>"
+     "<dl><dt id=i><span>Function: </span><strong class=def-name>i</strong> (n)<dd><p>texinfo.</dl>",
+     ["#f() f", "#g g ()", "#method.h h", "#i i"],
+     ["P", "Old javadoc.", "gtk-doc.", "pub fn h() -> T", "Function: i (n) – texinfo."]),
+    ("a term without an anchor is text", "<h2 id=t>T</h2><dl><dt>Returns:<dd>zero</dl>", ["#t T"], ["P", "Returns:"]),
+    ("no text: scripts, comments, navigation; broken marks",
+     "<script>if (a < b) '</p>'</script><!-- <p>no --><nav><h2 id=n>N</h2></nav><p title='a>b' x=\"it's\">1 < 2 &amp; "
+     "&#x33;<svg><title>no</title></svg></p><!-- <p>never closed", [], ["1 < 2 & 3"]),
+    ("of a listing the first line", "<h2 id=l>L</h2><pre>\n <b>one</b>\n two</pre><h2 id=m>M</h2>"
+     "<div class=fragment><div>three</div>\nfour</div>", ["#l L", "#m M"], ["P", "one", "three"]),
+    ("a text is cut between words", f"<p>{'wörter ' * 60}", [], ["wörter " * 42 + "…"]),
+    ("an anchor that the scripts can't hold", "<h2 id='a\\b'>Q</h2><p>text", [], ["P", "Q – text"]),
+    ("a heading that is the title is the page's", "<h3 id=p>1.2 P</h3><p>text", [], ["1.2 P – text"]),
+]
+# A row is a word, what stands around it in a page, and whether it is found. A hundred other pages have the word "often".
+WORDS = [("a" + "b" * 40, "<p>{}", False), ("c" * 40, "<p>{}", True), ("d" * 41, "<h2>{}</h2><p>x", True),
+         ("12345", "<p>{}", False), ("1234", "<p>{}", True), ("later", "<p>x<ul><li>{}</ul>", True),
+         ("often", "<p>x<ul><li>{}</ul>", False), ("often", "<p>{}", True), ("common", "<pre>x\n{}</pre>", False)]
+# A row is the titles and main headings of some pages, and what they are called.
+TITLES = [
+    ("a tail, although the first heading is the theme's",
+     [("A \u2014 Lib 1.2 docs", "Lib"), ("B-c \u2014 Lib 1.2 docs", "Lib"), ("D", "Lib")], ["A", "B-c", "D"]),
+    ("a tail in brackets", [("A (X (1.0))", ""), ("f(x) (X (1.0))", "")], ["A", "f(x)"]),
+    ("a head", [("Lib: A", ""), ("Lib: B: C", ""), ("Lib: D", "")], ["A", "B: C", "D"]),
+    ("nothing in common", [("A - B", ""), ("C - D", "")], ["A - B", "C - D"]),
+    ("the same title twice, none, and only the frame", [("A - L", "x"), ("A - L", "y"), ("", "z"), ("B - L", ""), ("", "")],
+     ["x", "y", "z", "B", "page4.html"]),
+]
+# A row is the start page's title and heading, more options, and the name of the entry of module "lib".
+MODULE_NAMES = [("Main Page", "Overview", [], "lib"), ("3.11.2 Documentation", "", [], "lib"), ("Overview", "The Lib", [], "The Lib"),
+                ("Lib Manual", "Welcome", [], "Lib Manual"), ("Lib", "", ["--title", "L"], "L")]
+LIST = '<li><a href="b.html">B</a></li><li><a href="#">Menu</a></li>'
+# A row is what makes a generator known, the page with its list, and the list.
+GENERATORS = [("index.html", '<meta name="generator" content="Doxygen 1.9">', "annotated.html", '<tr id="row_0_"><td><a href="b.html">B</a>'),
+              ("element-list", "", "overview-tree.html", f"<ul>{LIST}</ul>"),
+              ("objects.inv", "", "contents.html", f"<ul>{LIST}</ul>"),
+              ("book.js", "", "index.html", f'<nav><ol>{LIST}</ol></nav><a rel="next" href="c.html">Next</a>'),
+              ("index.html", "<META content='DocBook XSL' name='generator'>", "index.html",
+               '<dl class="toc"><dt><a href="b.html">B</a></dt></dl>')]
+TAG = '<script src="docdata/pagemeld.js" defer="defer"></script>'
+WIDE_TAG = TAG.replace(" defer", ' charset="utf-8" defer')
+# A row is a page's name, its bytes, and those with the tag; None if it gets none.
+SCRIPT = [
+    ("plain.html", "<body>x</BODY ></html>", f"<body>x{TAG}</BODY ></html>"),
+    ("script.html", "<script>'</body>'</script>x</body><!-- </body> -->", f"<script>'</body>'</script>x{TAG}</body><!-- </body> -->"),
+    ("open.html", "<p>x", f"<p>x{TAG}"), ("html.html", "<p>x</html>", f"<p>x{TAG}</html>"),
+    ("bytes.html", b"\xff\r\n</body>", b"\xff\r\n" + TAG.encode() + b"</body>"),
+    ("wide.html", "\ufeff<p>\u010d</body>".encode("utf-16-le") + b"!", f"\ufeff<p>\u010d{WIDE_TAG}</body>".encode("utf-16-le") + b"!"),
+    ("deep/er/page.html", "</body>", TAG.replace('"doc', '"../../doc') + "</body>"),
+    ("frames.html", "<frameset><frame src=x></frameset><noframes><body></body></noframes>", None),
+    ("strict.xhtml", '<?xml version="1.0"?><html><body/></html>', None),
+    ("quoted.html", f"<!-- {TAG} --></body>", f"<!-- {TAG} -->{TAG}</body>"),
+]
+OLD_TAG = '<head><script src="docdata/pagemeld.js" defer data-docdata="../docdata"></script></head></body>'
+# A row is arguments, what the error says, and the status.
+MISTAKES = [(["lib"], "lib is a module, not a set directory; the call is pagemeld-docdata lib/Manual", 2),
+            (["."], ". is a directory of modules, not a set directory; the call is pagemeld-docdata ./*/Manual", 2),
+            (["lib/Manual/sub"], "sub is not a set directory: that must be called Manual or ScriptReference", 2),
+            (["lib/Manual/index.html"], "index.html is not a directory", 2),
+            (["--title", "T", "lib/Manual", "other/Manual"], "--title names one module, but the sets belong to several", 2),
+            (["--page-script", "--remove", "lib/Manual"], "--page-script and --remove exclude each other", 2),
+            (["other/Manual"], "other/Manual has no pages", 1)]
 
 
 class PagemeldDocdata(unittest.TestCase):
@@ -84,44 +160,121 @@ class PagemeldDocdata(unittest.TestCase):
         self.maxDiff = None
         parent = tempfile.TemporaryDirectory()
         self.addCleanup(parent.cleanup)
-        self.directory = os.path.join(parent.name, "lib", "Set")
-        for path, page in PAGES.items():
+        self.parent = parent.name
+        self.directory = os.path.join(parent.name, "lib", "Manual")
+
+    def write(self, pages):
+        for path, page in pages.items():
             path = os.path.join(os.fsencode(self.directory), os.fsencode(path))
             os.makedirs(os.path.dirname(path), exist_ok=True)
             with open(path, "wb") as file:
                 file.write(page if isinstance(page, bytes) else page.encode())
 
+    def read(self, path):
+        with open(os.path.join(self.directory, path), "rb") as file:
+            return file.read()
+
+    def run_program(self, *arguments, status=0):
+        """Returns the lines that the program says, with paths relative to the set."""
+        run = subprocess.run([sys.executable, PROGRAM, *arguments], stderr=subprocess.PIPE, cwd=self.parent,
+                             env={**os.environ, "PYTHONIOENCODING": "utf-8", "PYTHONHASHSEED": "random"}, check=False)
+        said = run.stderr.decode().replace(self.directory + "/", "").replace(self.directory, "Manual")
+        self.assertEqual(status, run.returncode, said)
+        return said.splitlines()
+
     def make(self, *options):
-        run = subprocess.run([sys.executable, PROGRAM, *options, self.directory], stderr=subprocess.PIPE, check=True,
-                             env={**os.environ, "PYTHONIOENCODING": "utf-8", "PYTHONHASHSEED": "random"})
-        texts = []
-        for name in ("index.json", "toc.json"):
-            with open(os.path.join(self.directory, "docdata", name), encoding="utf-8") as file:
-                texts.append(file.read())
-        return texts, run.stderr.decode().replace(self.directory + "/", "").replace(self.directory, "Set").splitlines()
+        said = self.run_program(*options, self.directory)
+        return self.read("docdata/index.json").decode(), self.read("docdata/toc.json").decode(), said
+
+    def find_module(self, *options):
+        return json.loads(self.make(*options)[1])["children"][0]
 
     def test_writes_index_and_contents_and_says_what_it_left_out_or_replaced(self):
-        (index, contents), said = self.make("--toc", "index.html", "--toc", "none.html", "--toc", "Foo.html",
-                                            "--root-title", "All", "--share", "ns")
+        self.write(PAGES)
+        index, contents, said = self.make("--toc", "index.html", "--toc", "none.html", "--toc", "Foo.html", "--toc",
+                                          "plain.html", "--root-title", "All", "--share", "ns")
         self.assertEqual(INDEX, json.loads(index))
         self.assertEqual(list(INDEX["searchIndex"]), list(json.loads(index)["searchIndex"]))
         self.assertEqual(FROM_LISTS, json.loads(contents))
         self.assertEqual(["pagemeld-docdata: warning: " + warning for warning in WARNINGS], said[:-1])
-        self.assertEqual("pagemeld-docdata: Set: 8 pages, 5 places, 14 texts, 36 terms", said[-1])
+        self.assertEqual("pagemeld-docdata: Manual: 8 pages, 5 places, 14 texts, 36 terms", said[-1])
 
-    def test_writes_nothing_without_pages(self):
-        with tempfile.TemporaryDirectory() as empty:
-            self.assertEqual(1, subprocess.run([sys.executable, PROGRAM, empty], stderr=subprocess.PIPE).returncode)
-            self.assertEqual([], os.listdir(empty))
+    def test_any_number_of_processes_gives_the_same_bytes(self):
+        self.write({f"{number}.html": f"<h1>{number}</h1><h2 id=a>A{number % 7}</h2><p>x" for number in range(100)})
+        self.assertEqual(self.make("--jobs", "1")[:2], self.make("--jobs", "5")[:2])
 
-    def test_same_pages_give_same_bytes(self):
-        self.assertEqual(self.make()[0], self.make()[0])
+    def test_contents_from_directories_have_no_generated_and_no_excluded_pages(self):
+        self.write({**PAGES, "genindex.html": "<h1>Index</h1><h2 id=a>A</h2><p>gauge", "draft/x.html": ""})
+        index, contents, said = self.make("--toc", "list.html", "--exclude", "draft/*")
+        self.assertEqual(FROM_DIRECTORIES, json.loads(contents))
+        self.assertIn(["Index", 4], json.loads(index)["info"])
+        self.assertNotIn("genindex.html#a", index)
+        self.assertIn("Manual: the contents are made from the directories", "\n".join(said))
 
-    def test_contents_from_directories_and_an_unknown_list(self):
-        self.assertEqual(FROM_DIRECTORIES, json.loads(self.make()[0][1]))
-        texts, said = self.make("--toc", "list.html")
-        self.assertEqual(FROM_DIRECTORIES, json.loads(texts[1]))
-        self.assertIn("Set: the contents are made from the directories", "\n".join(said))
+    def test_places(self):
+        for name, page, places, texts in PLACES:
+            with self.subTest(name):
+                self.write({"p.html": f"<title>P</title>{page}"})
+                index = json.loads(self.make()[0])
+                self.assertEqual(["p.html P"] + [f"p.html{place}" for place in places],
+                                 [" ".join(entry) for entry in index["pages"]])
+                self.assertEqual(sorted(texts), sorted(text for text, _ in index["info"]))
+
+    def test_words(self):
+        self.write({f"{number}.html": "<p>y<ul><li>often" for number in range(100)})
+        for word, page, is_found in WORDS:
+            with self.subTest(word, page=page):
+                self.write({"a.html": page.format(word)})
+                index = json.loads(self.make()[0])
+                entries = [index["info"][number][1] for number in index["searchIndex"].get(word, [])]
+                self.assertEqual(is_found, "a.html" in [index["pages"][entry][0] for entry in entries])
+
+    def test_a_heading_of_most_pages_is_no_place(self):
+        self.write({f"{number}.html": "<h1>P</h1><h2 id=e>Examples</h2><p>x<h3 id=o>Own %d</h3>" % number for number in range(20)})
+        self.assertEqual(["0.html", "0.html#o"], [path for path, _ in json.loads(self.make()[0])["pages"][:2]])
+
+    def test_titles(self):
+        for name, pages, expected in TITLES:
+            with self.subTest(name), tempfile.TemporaryDirectory() as parent:
+                self.directory = os.path.join(parent, "Manual")
+                self.write({f"page{number}.html": f"<title>{title}</title><h1>{heading}</h1>"
+                            for number, (title, heading) in enumerate(pages)})
+                self.assertEqual(expected, [title for _, title in json.loads(self.make()[0])["pages"]])
+
+    def test_module_names(self):
+        for title, heading, options, expected in MODULE_NAMES:
+            with self.subTest(title):
+                self.write({"index.html": f"<title>{title}</title><h1>{heading}</h1>", "b.html": ""})
+                self.assertEqual(expected, self.find_module(*options)["title"])
+
+    def test_generators(self):
+        for known_by, content, page, contents in GENERATORS:
+            with self.subTest(known_by, page=page), tempfile.TemporaryDirectory() as parent:
+                self.directory = os.path.join(parent, "Manual")
+                pages = {"index.html": "", "b.html": "<title>B</title>", "c.html": "", known_by: content}
+                self.write({**pages, page: pages.get(page, "") + contents})
+                self.assertEqual([node("b.html", "B")], self.find_module()["children"])
+
+    def test_page_script(self):
+        before = {name: page if isinstance(page, bytes) else page.encode() for name, page, _ in SCRIPT}
+        after = {name: page if isinstance(page, bytes) else (page or before[name].decode()).encode() for name, _, page in SCRIPT}
+        self.write({**before, "old.html": OLD_TAG})
+        for _ in range(2):
+            self.make("--page-script")
+            self.assertEqual(after, {name: self.read(name) for name in before})
+            self.assertEqual(OLD_TAG.encode(), self.read("old.html"))
+        self.assertIn(b"function", self.read("docdata/pagemeld.js"))
+        self.run_program("--remove", self.directory)
+        self.assertEqual({**before, "quoted.html": before["quoted.html"]}, {name: self.read(name) for name in before})
+        self.assertEqual(b"<head></head></body>", self.read("old.html"))
+        self.assertEqual(["index.json", "toc.json"], sorted(os.listdir(os.path.join(self.directory, "docdata"))))
+
+    def test_mistakes(self):
+        self.write({"index.html": "x", "sub/index.html": "x", "../../other/Manual/picture.png": ""})
+        for arguments, message, status in MISTAKES:
+            with self.subTest(arguments):
+                self.assertIn(message, self.run_program(*arguments, status=status)[-1])
+                self.assertEqual(["index.html", "sub"], sorted(os.listdir(self.directory)))
 
 
 if __name__ == "__main__":

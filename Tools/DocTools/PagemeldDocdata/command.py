@@ -1,32 +1,92 @@
 """The command line."""
 import argparse
+import glob
 import os
+import re
+import sys
 
-from documentation_set import SetOptions, make_docdata
+from documentation_set import SetOptions, make_docdata, remove_page_script
+from messages import PROGRAM, say
+
+SET_NAMES = ("Manual", "ScriptReference")
+HERE = os.path.dirname(os.path.realpath(__file__))
+# Where the program is installed, and in the sources.
+VERSION_FILES = (os.path.join(HERE, "version"), os.path.join(HERE, "..", "..", "..", "CMakeLists.txt"))
+
+
+def read_version():
+    with open(next(filter(os.path.exists, VERSION_FILES)), encoding="utf-8") as file:
+        return re.search(r"\d+\.\d+\.\d+", file.read())[0]
+
+
+class ShowVersion(argparse.Action):
+    def __call__(self, parser, namespace, values, option_string=None):
+        print(PROGRAM, read_version())
+        parser.exit()
 
 
 def make_parser():
-    parser = argparse.ArgumentParser(prog="pagemeld-docdata", description="Makes index.json and toc.json from HTML.")
-    parser.add_argument("--root-title", metavar="T", default="", help="default: the name of the set directory")
-    parser.add_argument("--root-link", metavar="L", default="index.html", help="default: %(default)s")
-    parser.add_argument("--title", default="", help="of the module's entry")
-    parser.add_argument("--share", metavar="GROUP", action="append", default=[])
-    parser.add_argument("--exclude", metavar="PATTERN", action="append", default=[])
-    parser.add_argument("--jobs", metavar="N", type=int, default=os.cpu_count())
-    parser.add_argument("--toc", metavar="FILE", action="append", default=[],
-                        help="page in each set directory whose lists are contents; several are allowed")
-    parser.add_argument("set_directories", metavar="SET_DIRECTORY", nargs="+")
+    parser = argparse.ArgumentParser(
+        prog=PROGRAM, usage="%(prog)s [OPTION]... SET_DIRECTORY...",
+        description="Makes docdata/index.json and docdata/toc.json of documentation sets from their HTML pages.",
+        epilog='A set directory is called Manual or ScriptReference and lies in the directory of its module.')
+    parser.add_argument("set_directories", metavar="SET_DIRECTORY", nargs="+", help=argparse.SUPPRESS)
+    add = parser.add_argument
+    add("--page-script", action="store_true", help="put the page script into every page and into docdata")
+    add("--remove", action="store_true", help="take the page script out again, and do nothing else")
+    add("--toc", metavar="PAGE", action="append", default=[],
+        help="take the contents from the lists in this page of each set; may be repeated")
+    add("--share", metavar="GROUP", action="append", default=[],
+        help="join this group without a page with that of other modules; may be repeated")
+    add("--exclude", metavar="PATTERN", action="append", default=[],
+        help="leave out pages whose path in the set matches; may be repeated")
+    add("--title", metavar="TITLE", default="", help="name of the module in the contents; default: of its start page")
+    add("--root-title", metavar="TITLE", default="", help="title of all contents; default: the name of the set directory")
+    add("--root-link", metavar="PAGE", default="index.html", help="start page of each set; default: %(default)s")
+    add("--jobs", metavar="NUMBER", type=int, default=len(os.sched_getaffinity(0)),
+        help="processes; default: the processors")
+    add("--version", nargs=0, action=ShowVersion, help="show the version")
     return parser
+
+
+def find_mistake(directory):
+    """Returns what is wrong with the argument for a set directory, or None."""
+    if not os.path.isdir(directory):
+        return f"{directory} is not a directory"
+    if os.path.basename(os.path.abspath(directory)) in SET_NAMES:
+        return None
+    for kind, levels in (("a module", ()), ("a directory of modules", ("*",))):
+        sets = [os.path.join(directory, *levels, name) for name in SET_NAMES
+                if glob.glob(os.path.join(glob.escape(directory), *levels, name))]
+        if sets:
+            return f"{directory} is {kind}, not a set directory; the call is {PROGRAM} {' '.join(sets)}"
+    return f"{directory} is not a set directory: that must be called Manual or ScriptReference"
+
+
+def check(parser, arguments):
+    """Ends the program if the arguments can't be meant so."""
+    for directory in arguments.set_directories:
+        mistake = find_mistake(directory)
+        if mistake:
+            parser.error(mistake)
+    modules = {os.path.dirname(os.path.abspath(directory)) for directory in arguments.set_directories}
+    if arguments.title and len(modules) > 1:
+        parser.error("--title names one module, but the sets belong to several")
+    if arguments.page_script and arguments.remove:
+        parser.error("--page-script and --remove exclude each other")
 
 
 def main():
     parser = make_parser()
     arguments = parser.parse_args()
-    for directory in arguments.set_directories:
-        if not os.path.isdir(directory):
-            parser.error(f"{directory} is not a directory")
+    check(parser, arguments)
     options = SetOptions(arguments.root_link, arguments.root_title, arguments.title, arguments.toc, arguments.share,
-                         arguments.exclude, arguments.jobs)
+                         arguments.exclude, arguments.page_script, max(arguments.jobs, 1))
+    status = 0
     for directory in map(os.path.abspath, arguments.set_directories):
-        if not make_docdata(directory, options):
-            parser.exit(1, f"pagemeld-docdata: {directory} has no pages\n")
+        if arguments.remove:
+            remove_page_script(directory, arguments.exclude)
+        elif not make_docdata(directory, options):
+            say(f"error: {directory} has no pages")
+            status = 1
+    sys.exit(status)

@@ -4,7 +4,7 @@ import re
 from typing import NamedTuple
 from urllib.parse import unquote
 
-from generators import DIRECTORY_PAGES, PARTS, SKIP, SKIPPED_ROLES, SKIPPED_TAGS
+from generators import DIRECTORY_PAGES, GENERATED, PARTS, SKIP, SKIPPED_ROLES, SKIPPED_TAGS
 from markup import TOKEN, read_attributes, squeeze
 from messages import warn
 from search_index import UNWRITABLE
@@ -73,6 +73,8 @@ class ListReader:
         elif name in ("li", "dt") or row.startswith("row_") or "col-first" in classes:
             self.item = Item(row.count("_") - 1 if row else max(self.depth, 1))
             self.items.append(self.item)
+        elif attributes.get("rel") in ("next", "prev"):
+            self.item = None  # leads through the pages
         elif name == "a" and self.item and self.item.address is None and "href" in attributes:
             self.item.address, self.item.link_start = attributes["href"], len(self.item.pieces)
 
@@ -89,7 +91,10 @@ class ListReader:
 
 
 def resolve(address, base, paths):
-    """Returns path and fragment of an address in the page base; the path is empty if it leads out of the set."""
+    """Returns path and fragment of an address in the page base; the path is empty if it leads out of the set. "#" is the
+    address of what opens a menu."""
+    if address.strip() == "#":
+        return "", ""
     place, _, fragment = address.strip().partition("#")
     place = unquote(place.partition("?")[0])
     path = os.path.normpath(os.path.join(os.path.dirname(base), place)) if place else base
@@ -118,9 +123,11 @@ def list_links(items, base, titles, directory):
 
 
 def list_directories(titles, start):
-    """Returns directories and pages as rows; a directory leads to its own page."""
+    """Returns directories and pages as rows, without generated ones; a directory leads to its own page."""
     rows, last_parents = [], []
     for path, title in titles.items():
+        if GENERATED.fullmatch(path):
+            continue
         *parents, name = path.split("/")
         rows += [Row(depth, "null", parent) for depth, parent in enumerate(parents, 1)
                  if parents[:depth] != last_parents[:depth]]
@@ -133,12 +140,15 @@ def list_directories(titles, start):
 
 
 def take_nodes(rows, above):
-    """Takes rows from the end of the list while they are deeper than above; drops those without a link or children."""
+    """Takes rows from the end of the list while they are deeper than above; drops those without a link or children. What
+    is below an item without text, as in mdBook's lists, is below the item before."""
     nodes = []
     while rows and rows[-1].depth > above:
         depth, link, title = rows.pop()
         children = take_nodes(rows, depth)
-        if link != "null" or children:
+        if not title and nodes:
+            nodes[-1]["children"] = (nodes[-1]["children"] or []) + children or None
+        elif link != "null" or children:
             nodes.append({"link": link, "title": title, "children": children or None})
     return nodes
 

@@ -6,7 +6,8 @@ from typing import NamedTuple
 from contents import ListReader, list_directories, list_links, make_contents
 from generators import find_generator
 from messages import say, warn
-from page_files import list_paths, read_file, read_pages
+from page_script import copy_script, remove_from_page, remove_script
+from page_files import Task, list_paths, read_file, read_pages
 from search_index import make_index
 from titles import choose_titles, is_generic, make_title
 
@@ -18,6 +19,7 @@ class SetOptions(NamedTuple):
     lists: list
     shared_groups: list
     excluded: list
+    adds_script: bool
     jobs: int
 
 
@@ -70,9 +72,20 @@ def write_file(file, write):
     os.replace(file + ".tmp", file)
 
 
+def write_docdata(docdata, index, contents, options):
+    os.makedirs(docdata, exist_ok=True)
+    write_file(os.path.join(docdata, "index.json"), index.write)
+    write_file(os.path.join(docdata, "toc.json"),
+               lambda file: file.write(json.dumps(contents, ensure_ascii=False, indent=1) + "\n"))
+    if options.adds_script:
+        copy_script(docdata)
+
+
 def make_docdata(directory, options):
-    """Writes both files of a set directory. Returns whether it has pages."""
-    pages = read_pages(directory, list_paths(directory, options.excluded), options.jobs)
+    """Writes both files of a set directory, and what the page script needs if the options say so. Returns whether the
+    directory has pages."""
+    paths = list_paths(directory, options.excluded)
+    pages = read_pages([Task(directory, path, options.adds_script) for path in paths], options.jobs)
     if not pages:
         return False
     titles = choose_titles(pages, options.root_link, directory)
@@ -80,11 +93,16 @@ def make_docdata(directory, options):
     module = make_module_entry(directory, titles, options)
     contents = make_contents(root, module, list_rows(directory, titles, options), options.shared_groups)
     index = make_index(pages, titles)
-    docdata = os.path.join(directory, "docdata")
-    os.makedirs(docdata, exist_ok=True)
-    write_file(os.path.join(docdata, "index.json"), index.write)
-    write_file(os.path.join(docdata, "toc.json"),
-               lambda file: file.write(json.dumps(contents, ensure_ascii=False, indent=1) + "\n"))
+    write_docdata(os.path.join(directory, "docdata"), index, contents, options)
     say(f"{directory}: {len(titles)} pages, {len(index.entries) - len(titles)} places, {len(index.texts)} texts, "
         f"{index.term_count} terms")
     return True
+
+
+def remove_page_script(directory, excluded):
+    """Takes the tag of the page script out of the pages of a set directory, and the script out of its docdata."""
+    paths = list_paths(directory, excluded)
+    for path in paths:
+        remove_from_page(directory, path)
+    remove_script(os.path.join(directory, "docdata"))
+    say(f"{directory}: {len(paths)} pages without the page script")

@@ -23,6 +23,7 @@ PARTS = {
     # javadoc: its tables of members repeat the first sentences of what follows
     ("div", "block"): TEXT, ("table", "memberSummary"): SKIP, ("section", "method-summary"): SKIP,
     ("section", "field-summary"): SKIP, ("section", "constructor-summary"): SKIP, ("div", "inherited-list"): SKIP,
+    ("ul", "horizontal"): SKIP,
     # DocBook and gtk-doc
     ("div", "navheader"): SKIP, ("div", "navfooter"): SKIP, ("table", "navigation"): SKIP,
     # rustdoc
@@ -68,7 +69,6 @@ GENERATORS = (
     Generator("javadoc", "javadoc", ("element-list", "package-list"), (("overview-tree.html", "package-tree.html"),)),
     Generator("mdBook", "mdbook", ("book.js",), (("toc.html", "index.html"),), True),
     Generator("MkDocs", "mkdocs", ("mkdocs", "search/search_index.json"), (("index.html",),), True),
-    Generator("rustdoc", "rustdoc", (), (("all.html",),)),
     Generator("texinfo", "makeinfo|texi2any|texinfo", (), (("index.html",),)),
     Generator("DocBook", "docbook|gtk-doc", (), (("index.html",),)),
     Generator("Sphinx", "sphinx", ("objects.inv", "searchindex.js"), (("contents.html", "index.html"),)),

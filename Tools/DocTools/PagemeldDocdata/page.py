@@ -10,7 +10,8 @@ from markup import TAG, TOKEN, first_line, read_attributes, squeeze
 
 COMMON = dict.fromkeys("a an and are as at be by for from has in is it its of on one or that the to with".split(), 1)
 # Queries are split into runs of letters, marks, digits and "_". \w matches all of these except the marks.
-MARKS = "".join(c for c in map(chr, range(0x300, 0xE0200)) if unicodedata.category(c)[0] == "M")
+MARKS = "".join(c for c in map(chr, [*range(0x300, 0x1F000), *range(0xE0100, 0xE01F0)])
+                if unicodedata.category(c)[0] == "M")
 WORD = re.compile(f"[\\w{MARKS}]+")
 ASCII_WORD = re.compile(r"\w+", re.A)
 LONG_NUMBER = re.compile(r"\d{5,}")

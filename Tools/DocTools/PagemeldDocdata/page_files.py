@@ -8,8 +8,9 @@ from typing import NamedTuple
 
 from generators import DIRECTORY_PAGES, GENERATED
 from markup import decode
-from messages import warn
+from messages import Progress, warn
 from page import read_headings, read_page
+from page_script import add_to_page
 from search_index import UNWRITABLE
 
 PAGE_NAMES = (".html", ".htm", ".xhtml")
@@ -53,24 +54,48 @@ def read_file(file):
         return decode(stream.read())
 
 
+class Task(NamedTuple):
+    """What is done with a page."""
+    directory: str
+    path: str
+    adds_script: bool
+
+
 def try_page(task):
-    """Returns the page in a file, packed, or what is wrong with the file."""
-    directory, path = task
+    """Returns the page in a file, packed, or what is wrong with the file. Puts the tag of the page script into it if that
+    is part of the task."""
     try:
-        html = read_file(os.path.join(directory, path))
+        with open(os.path.join(task.directory, task.path), "rb") as stream:
+            data = stream.read()
+        if task.adds_script:
+            data = add_to_page(task.directory, task.path, data)
     except OSError as error:
         return str(error)
-    return pack(read_headings(html) if GENERATED.fullmatch(path) else read_page(html))
+    html = decode(data)
+    return pack(read_headings(html) if GENERATED.fullmatch(task.path) else read_page(html))
 
 
-def read_pages(directory, paths, jobs):
-    """Returns the pages by path."""
-    pages = {}
-    with multiprocessing.Pool(min(jobs, len(paths) // PAGES_AT_ONCE + 1)) as pool:
-        tasks = [(directory, path) for path in paths]
-        for path, page in zip(paths, pool.imap(try_page, tasks, PAGES_AT_ONCE)):
-            if isinstance(page, str):
-                warn(f"{os.path.join(directory, path)}: left out: {page}")
-            else:
-                pages[path] = page
+def try_pages(tasks, jobs):
+    """Yields the results of try_page in the order of the tasks, whatever the number of processes."""
+    processes = min(jobs, len(tasks) // PAGES_AT_ONCE)
+    if processes < 2:
+        yield from map(try_page, tasks)
+        return
+    with multiprocessing.Pool(processes) as pool:
+        yield from pool.imap(try_page, tasks, PAGES_AT_ONCE)
+
+
+def read_pages(tasks, jobs):
+    """Returns the pages by path, without those that can't be read."""
+    pages, failures = {}, []
+    progress = Progress(len(tasks))
+    for task, page in zip(tasks, try_pages(tasks, jobs)):
+        progress.advance(task.directory)
+        if isinstance(page, str):
+            failures.append(f"{task.directory}/{task.path}: left out: {page}")
+        else:
+            pages[task.path] = page
+    progress.clear()
+    for failure in failures:
+        warn(failure)
     return pages
