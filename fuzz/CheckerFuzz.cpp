@@ -104,9 +104,10 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     for (const bool isJson : {false, true})
     {
         Report report;
-        CheckSet(0, roots, {true, true, 10, isJson ? SIZE_MAX : 80}, report);
-        Require(report.MissingOf(0).search == refused.search, "what is missing from the search is refused");
-        Require(report.MissingOf(0).contents == refused.contents,
+        CheckSet(DocSet::Manual, roots, {true, true, 10, isJson ? SIZE_MAX : 80}, report);
+        Require(report.MissingOf(DocSet::Manual).search == refused.search,
+                "what is missing from the search is refused");
+        Require(report.MissingOf(DocSet::Manual).contents == refused.contents,
                 "what is missing from the contents is dropped");
         RequirePrintable(report, isJson, roots);
     }

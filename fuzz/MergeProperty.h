@@ -13,11 +13,10 @@ template <class Check>
 bool IsSound(Check check, const rapidjson::Value& document)
 {
     int faults = 0;
-    Require(check(document, [&](const StructureFault&, const JsonPointer& pointer, const rapidjson::Value&)
-                  { return (void)pointer.Text(), ++faults > 0; }),
-            "a check that is told to go on does");
-    const bool sound = check(document, [](const StructureFault&, const JsonPointer&, const rapidjson::Value&)
-                             { return false; });
+    Require(
+        check(document, [&](const FoundFault& found) { return (void)found.pointer.Text(), ++faults > 0; }),
+        "a check that is told to go on does");
+    const bool sound = check(document, [](const FoundFault&) { return false; });
     Require(sound == (faults == 0), "the first fault and all faults agree");
     return sound;
 }

@@ -609,17 +609,17 @@ TEST(PagemeldCheck, ExplainsEveryRuleInHelpAndOnItsPage)
     EXPECT_EQ(0, RunProgram(PAGEMELD_CHECK_PROGRAM, {"--version"}).status);
     const std::string page = ReadFile(RULES_PAGE);
     std::string expected = page.substr(0, page.find("\n## ") + 1);
-    for (const Rule& rule : AllRules())
+    for (const RuleRow& rule : AllRules())
     {
         const std::string level = NameOf(rule.level);
-        EXPECT_NE(std::string::npos, help.find(level + ": " + rule.meaning + "\n")) << rule.id;
+        EXPECT_NE(std::string::npos, help.find(level + ": " + rule.meaning + "\n")) << rule.name;
         const std::string text =
             level + ": " + rule.meaning + ".\n\n" + rule.consequence + "\n\n" + rule.remedy + "\n";
-        expected += "## `" + std::string(rule.id) + "`\n\n" + static_cast<char>(std::toupper(level[0])) +
+        expected += "## `" + std::string(rule.name) + "`\n\n" + static_cast<char>(std::toupper(level[0])) +
                     text.substr(1) + "\n";
-        EXPECT_EQ(std::string(rule.id) + " (" + level + "): " + rule.meaning + "\n\n" + rule.consequence +
+        EXPECT_EQ(std::string(rule.name) + " (" + level + "): " + rule.meaning + "\n\n" + rule.consequence +
                       "\n\n" + rule.remedy + "\n",
-                  RunProgram(PAGEMELD_CHECK_PROGRAM, {"-e", rule.id}).standardOutput);
+                  RunProgram(PAGEMELD_CHECK_PROGRAM, {"-e", rule.name}).standardOutput);
     }
     expected.pop_back();
     EXPECT_EQ(ReplaceAll(expected, "\n", " "), ReplaceAll(page, "\n", " "));

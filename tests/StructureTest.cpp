@@ -36,11 +36,11 @@ std::string AllFaults(Check check, const rapidjson::Value& document)
     std::string faults;
     const bool wentOn =
         check(document,
-              [&](const StructureFault& fault, const JsonPointer& pointer, const rapidjson::Value& value)
+              [&](const FoundFault& found)
               {
-                  const std::string where = pointer.Text();
-                  EXPECT_EQ(&value, rapidjson::Pointer(where.c_str()).Get(document)) << where;
-                  faults += (faults.empty() ? "" : " ") + std::to_string(fault.number) + where;
+                  const std::string where = found.pointer.Text();
+                  EXPECT_EQ(&found.place, rapidjson::Pointer(where.c_str()).Get(document)) << where;
+                  faults += (faults.empty() ? "" : " ") + std::to_string(RowOf(found.fault).number) + where;
                   return true;
               });
     return wentOn ? faults : faults + "stopped";

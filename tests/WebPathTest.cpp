@@ -1,6 +1,6 @@
 #include "Tools/DocTools/PagemeldCheck/Browse/WebPath.h"
 
-#include "Tools/DocTools/VantorPagemeld/ModulePath.h"
+#include "Tools/DocTools/VantorPagemeld/ModuleLayout.h"
 #include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"
 #include "tests/support/AnswersOfNode.h"
 

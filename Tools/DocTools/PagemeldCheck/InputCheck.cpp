@@ -3,13 +3,15 @@
 #include "Tools/DocTools/PagemeldCheck/Explain/FaultText.h"
 #include "Tools/DocTools/PagemeldCheck/Explain/ParseFailure.h"
 #include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
+#include "Tools/DocTools/PagemeldCheck/Report/FileFindings.h"
+#include "Tools/DocTools/PagemeldCheck/TextCheck.h"
 #include "Tools/DocTools/VantorPagemeld/Check/IndexStructure.h"
 #include "Tools/DocTools/VantorPagemeld/Check/TocStructure.h"
 #include "Tools/DocTools/VantorPagemeld/Read/InputFile.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonReader.h"
 
-#include <cstring>
+#include <utility>
 
 namespace
 {
@@ -22,125 +24,124 @@ bool IsMergedPage(const Value& entry)
     return entry.IsArray() && entry.Size() == 3 && entry[2].IsInt();
 }
 
+std::set<std::string> NamesOf(const Value& object)
+{
+    std::set<std::string> names;
+    for (const auto& member : object.GetObject())
+    {
+        names.emplace(BytesOf(member.name));
+    }
+    return names;
+}
+
 /// One file while it is checked.
 class InputCheck
 {
 public:
-    InputCheck(const FileScope& scope, const std::string& moduleName, const Value& document)
-        : m_findings(scope), m_moduleName(moduleName), m_document(document)
+    InputCheck(const FileScope& scope, const Value& document)
+        : m_scope(scope), m_findings(scope), m_document(document)
     {
     }
 
     FileFindings& Findings() { return m_findings; }
 
-    /// Looks at the bytes that no parser sees as a fault.
+    /// Looks for what the parser accepts and readers don't get.
     void CheckBytes(std::string_view seen, std::size_t size)
     {
         const std::size_t invalid = FindInvalidUtf8(seen);
         if (invalid != std::string_view::npos)
         {
-            m_findings.AddAtOffset("invalid-utf8", invalid,
+            m_findings.AddAtOffset(Rule::InvalidUtf8, invalid,
                                    "byte " + Visible(seen.substr(invalid, 1)) +
                                        " is not UTF-8: readers see a replacement character");
         }
         if (seen.size() + 1 < size)
         {
-            m_findings.AddAtOffset("text-after-nul", seen.size(),
+            m_findings.AddAtOffset(Rule::TextAfterNul, seen.size(),
                                    "a NUL byte ends the text; bytes after it that are not seen: " +
                                        std::to_string(size - seen.size() - 1));
         }
     }
 
-    void ReportRefusal(InputKind kind, std::string_view seen, std::size_t size,
-                       const rapidjson::ParseResult& failure)
+    void ReportRefusal(std::string_view seen, std::size_t size, const rapidjson::ParseResult& failure)
     {
-        m_findings.AddAtOffset("not-json", failure.Offset(),
-                               DescribeParseFailure(seen, size, failure) + Consequence(kind));
+        m_findings.AddAtOffset(Rule::NotJson, failure.Offset(),
+                               DescribeParseFailure(seen, size, failure) + "; " + m_scope.Loss());
     }
 
     /// Returns whether the tool takes the document.
-    bool CheckIndex()
-    {
-        bool isMerged = false;
-        bool isSound = true;
-        CheckIndexStructure(m_document,
-                            [&](const StructureFault& fault, const JsonPointer& pointer, const Value& value)
-                            {
-                                isSound = false;
-                                if (fault.number == kPageNotPairNumber && IsMergedPage(value))
-                                {
-                                    ReportMergedPage(std::exchange(isMerged, true), pointer, value);
-                                    return true;
-                                }
-                                const auto wording = [&]
-                                {
-                                    return DescribeIndexFault(fault, pointer, value, m_document,
-                                                              QuoteSize()) +
-                                           Consequence(InputKind::Index);
-                                };
-                                m_findings.AddAtValue("structure", value, pointer, wording);
-                                return true;
-                            });
-        return isSound;
-    }
-
-    bool CheckToc()
+    bool CheckStructure()
     {
         bool isSound = true;
-        CheckTocStructure(m_document,
-                          [&](const StructureFault& fault, const JsonPointer& pointer, const Value& value)
-                          {
-                              isSound = false;
-                              const auto wording = [&] {
-                                  return DescribeTocFault(fault, pointer, value, QuoteSize()) +
-                                         Consequence(InputKind::Toc);
-                              };
-                              m_findings.AddAtValue("structure", value, pointer, wording);
-                              return true;
-                          });
+        const auto onFault = [&](const FoundFault& found)
+        {
+            isSound = false;
+            ReportFault(found);
+            return true;
+        };
+        if (m_scope.input == Input::Index)
+        {
+            CheckIndexStructure(m_document, onFault);
+            return isSound;
+        }
+        CheckTocStructure(m_document, onFault);
         (void)ReportTaggedNode(m_document, JsonPointer(), isSound);
         return isSound;
     }
 
-private:
-    static constexpr int kPageNotPairNumber = 318;
-
-    [[nodiscard]] std::size_t QuoteSize() const { return m_findings.Scope().quoteSize; }
-
-    [[nodiscard]] std::string Consequence(InputKind kind) const
+    /// Looks at the texts of a sound document. Returns what it holds.
+    InputFacts CheckTexts()
     {
-        return "; " + Quoted(m_moduleName, QuoteSize()) + " will be missing from the " +
-               (kind == InputKind::Index ? "search" : "contents") + " of " +
-               kSetNames[m_findings.Scope().set];
+        InputFacts facts;
+        facts.state = InputFacts::State::Sound;
+        if (m_scope.input == Input::Index)
+        {
+            facts.commonWords = NamesOf(*FindMember(m_document, "common"));
+            CheckIndexTexts(m_document, m_scope, m_findings);
+            return facts;
+        }
+        facts.rootLink = CStringOf(*FindMember(m_document, "link"));
+        facts.rootTitle = CStringOf(*FindMember(m_document, "title"));
+        CheckTocTexts(m_document, m_scope, m_findings);
+        return facts;
     }
 
-    void ReportMergedPage(bool wasReported, const JsonPointer& pointer, const Value& page)
+private:
+    void ReportFault(const FoundFault& found)
     {
-        if (!wasReported)
+        const bool isMerged = found.fault == StructureFault::PageNotPair && IsMergedPage(found.place);
+        if (isMerged && !std::exchange(m_wasMergedReported, true))
         {
-            m_findings.AddAtValue("merged-input", page, pointer,
-                                  [&]
-                                  {
-                                      return "this is an output: the page entry names its module, " +
-                                             DescribeValue(page[2], QuoteSize()) +
-                                             Consequence(InputKind::Index);
+            ReportMerged("page entry", found.place, found.pointer, found.place[2], "; " + m_scope.Loss());
+        }
+        else if (!isMerged)
+        {
+            m_findings.AddAtValue(Rule::Structure, found.place, found.pointer,
+                                  [&] {
+                                      return DescribeFault(found, m_document, m_scope.options.quoteSize) +
+                                             "; " + m_scope.Loss();
                                   });
         }
+    }
+
+    void ReportMerged(const std::string& kind, const Value& value, const JsonPointer& pointer,
+                      const Value& module, const std::string& consequence)
+    {
+        m_findings.AddAtValue(Rule::MergedInput, value, pointer,
+                              [&]
+                              {
+                                  return "this is an output: the " + kind + " names its module, " +
+                                         DescribeValue(module, m_scope.options.quoteSize) + consequence;
+                              });
     }
 
     /// Reports the first node that has a module. Returns whether to go on.
     bool ReportTaggedNode(const Value& node, const JsonPointer& pointer, bool isSound)
     {
-        if (FindMember(node, "module") != nullptr)
+        if (const Value* module = FindMember(node, "module"))
         {
-            m_findings.AddAtValue("merged-input", node, pointer,
-                                  [&]
-                                  {
-                                      return "this is an output: the node names its module, " +
-                                             DescribeValue(*FindMember(node, "module"), QuoteSize()) +
-                                             (isSound ? "; its links will lead to that module"
-                                                      : Consequence(InputKind::Toc));
-                                  });
+            ReportMerged("node", node, pointer, *module,
+                         isSound ? "; its links will lead to that module" : "; " + m_scope.Loss());
             return false;
         }
         const Value* const children = FindMember(node, "children");
@@ -156,24 +157,14 @@ private:
         return true;
     }
 
+    const FileScope& m_scope;
     FileFindings m_findings;
-    const std::string& m_moduleName;
     const Value& m_document;
+    bool m_wasMergedReported = false;
 };
 
-std::set<std::string> NamesOf(const Value& object)
-{
-    std::set<std::string> names;
-    for (const auto& member : object.GetObject())
-    {
-        names.emplace(BytesOf(member.name));
-    }
-    return names;
-}
-
 /// Checks what was read, and returns what it holds.
-InputFacts CheckInputText(InputKind kind, const InputText& text, const FileScope& scope,
-                          const std::string& moduleName, const TextChecks& checks, Report& report)
+InputFacts CheckInputText(const InputText& text, const FileScope& scope, Report& report)
 {
     DocumentPool pool;
     rapidjson::Document document(&pool.allocator);
@@ -182,26 +173,15 @@ InputFacts CheckInputText(InputKind kind, const InputText& text, const FileScope
 
     InputFacts facts;
     facts.state = InputFacts::State::Refused;
-    InputCheck check(scope, moduleName, document);
+    InputCheck check(scope, document);
     check.CheckBytes(seen, text.bytesRead);
     if (failure.IsError())
     {
-        check.ReportRefusal(kind, seen, text.bytesRead, failure);
+        check.ReportRefusal(seen, text.bytesRead, failure);
     }
-    else if (kind == InputKind::Index ? check.CheckIndex() : check.CheckToc())
+    else if (check.CheckStructure())
     {
-        facts.state = InputFacts::State::Sound;
-    }
-    if (facts.IsSound() && kind == InputKind::Index)
-    {
-        facts.commonWords = NamesOf(*FindMember(document, "common"));
-        CheckIndexTexts(document, checks, check.Findings());
-    }
-    else if (facts.IsSound())
-    {
-        facts.rootLink = CStringOf(*FindMember(document, "link"));
-        facts.rootTitle = CStringOf(*FindMember(document, "title"));
-        CheckTocTexts(document, checks, check.Findings());
+        facts = check.CheckTexts();
     }
     check.Findings().HandTo(report, text.bytes.get(), document);
     return facts;
@@ -209,17 +189,16 @@ InputFacts CheckInputText(InputKind kind, const InputText& text, const FileScope
 
 } // namespace
 
-InputFacts CheckInput(InputKind kind, const FileScope& scope, const std::string& moduleName,
-                      const TextChecks& checks, Report& report)
+InputFacts CheckInput(const FileScope& scope, Report& report)
 {
-    const InputText text = ReadInputFile(scope.path.c_str());
-    if (text.outcome != InputText::Outcome::Read)
+    const InputText text = ReadInputFile(scope.file.path.c_str());
+    if (text.outcome == InputText::Outcome::Read)
     {
-        InputFacts facts;
-        facts.state = InputFacts::State::Unreadable;
-        return facts;
+        return CheckInputText(text, scope, report);
     }
-    return CheckInputText(kind, text, scope, moduleName, checks, report);
+    InputFacts facts;
+    facts.state = InputFacts::State::Unreadable;
+    return facts;
 }
 
 std::vector<ValuePlace> LocateRoot(const std::string& path)

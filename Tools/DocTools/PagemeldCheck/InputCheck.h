@@ -1,10 +1,11 @@
 #pragma once
 
-#include "Tools/DocTools/PagemeldCheck/Report/FileFindings.h"
-#include "Tools/DocTools/PagemeldCheck/TextCheck.h"
+#include "Tools/DocTools/PagemeldCheck/Report/Report.h"
+#include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 
 #include <set>
 #include <string>
+#include <vector>
 
 /// The outcome of reading an input file, and what the checks of a whole set need from it.
 struct InputFacts
@@ -26,20 +27,12 @@ struct InputFacts
     std::string rootTitle;
 
     [[nodiscard]] bool IsSound() const { return state == State::Sound; }
-};
-
-/// The two input files of a set.
-enum class InputKind
-{
-    Index,
-    Toc,
+    [[nodiscard]] EntryKey Root() const { return {rootLink.c_str(), rootTitle.c_str()}; }
 };
 
 /// Reads the file of the scope, reports everything that is wrong in it, and returns the outcome. A
-/// file that is missing or can't be read is left to the caller to report. moduleName is what messages call
-/// the module.
-InputFacts CheckInput(InputKind kind, const FileScope& scope, const std::string& moduleName,
-                      const TextChecks& checks, Report& report);
+/// file that is missing or can't be read is left to the caller to report.
+InputFacts CheckInput(const FileScope& scope, Report& report);
 
 /// Returns the places of the root's link and title of a toc.json that was sound when it was checked; nothing
 /// if it can't be read any more.

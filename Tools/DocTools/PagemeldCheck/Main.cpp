@@ -1,8 +1,8 @@
-#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
+#include "Tools/DocTools/PagemeldCheck/LinkCheck.h"
 #include "Tools/DocTools/PagemeldCheck/Options.h"
 #include "Tools/DocTools/PagemeldCheck/RootCheck.h"
 #include "Tools/DocTools/PagemeldCheck/SetCheck.h"
-#include "Tools/DocTools/VantorPagemeld/System/Messages.h"
+#include "Tools/DocTools/VantorPagemeld/System/Diagnostics.h"
 
 #include <cstdio>
 #include <cstdlib>
@@ -35,8 +35,10 @@ bool IsColored()
     return ::isatty(STDOUT_FILENO) == 1 && (noColor == nullptr || *noColor == '\0');
 }
 
-int Check(const Options& options)
+int Check(Options options)
 {
+    options.checks.quoteSize = options.form.isJson ? SIZE_MAX : options.checks.quoteSize;
+    options.form.isColored = !options.form.isJson && IsColored();
     Report report;
     std::vector<std::string> roots = options.roots;
     if (options.discover)
@@ -44,21 +46,18 @@ int Check(const Options& options)
         DiscoverRoots(*options.discover, roots, report);
     }
     CheckRoots(roots, report);
-    const SetChecks checks = {options.checksTargets, options.checksOutputs, options.limit,
-                              options.isJson ? SIZE_MAX : kLongText};
-    for (std::size_t set = 0; set < std::size(kSetNames); ++set)
+    CheckLinks(roots, report);
+    for (const auto& set : kDocSets)
     {
-        CheckSet(set, roots, checks, report);
+        CheckSet(set.id, roots, options.checks, report);
     }
-    const ReportForm form = {options.isJson, options.showsErrorsOnly, !options.isJson && IsColored(),
-                             options.countsWarningsAsErrors};
-    report.Print(stdout, form, roots);
+    report.Print(stdout, options.form, roots);
     if (std::fflush(stdout) != 0 || std::ferror(stdout) != 0)
     {
         (void)std::fputs("pagemeld-check: standard output can't be written\n", stderr);
         return kUnusable;
     }
-    return report.HasErrors(form) ? kFaulty : kSound;
+    return report.HasErrors(options.form) ? kFaulty : kSound;
 }
 
 } // namespace

@@ -81,26 +81,27 @@ std::string TakeOption(Options& options, int letter, const char* argument)
         options.discover = argument;
         break;
     case 't':
-        options.checksTargets = true;
+        options.checks.checksTargets = true;
         break;
     case 'o':
-        options.checksOutputs = true;
+        options.checks.checksOutputs = true;
         break;
     case 'f':
-        options.isJson = std::strcmp(argument, "json") == 0;
-        return options.isJson || std::strcmp(argument, "text") == 0 ? ""
-                                                                    : "the format is \"text\" or \"json\"";
+        options.form.isJson = std::strcmp(argument, "json") == 0;
+        return options.form.isJson || std::strcmp(argument, "text") == 0
+                   ? ""
+                   : "the format is \"text\" or \"json\"";
     case 'W':
-        options.countsWarningsAsErrors = true;
+        options.form.countsWarningsAsErrors = true;
         break;
     case 'n':
     {
         const std::optional<std::size_t> limit = ParseNumber(argument);
-        options.limit = limit.value_or(0);
+        options.checks.limit = limit.value_or(0);
         return limit ? "" : "the limit is a number";
     }
     case 'q':
-        options.showsErrorsOnly = true;
+        options.form.showsErrorsOnly = true;
         break;
     case 'e':
         options.action = Options::Action::Explain;
@@ -115,9 +116,9 @@ std::string TakeOption(Options& options, int letter, const char* argument)
     return "";
 }
 
-std::string RuleLine(const Rule& rule)
+std::string RuleLine(const RuleRow& rule)
 {
-    std::string line = "  " + std::string(rule.id);
+    std::string line = "  " + std::string(rule.name);
     line.resize(std::max<std::size_t>(line.size() + 1, 21), ' ');
     return line + NameOf(rule.level) + ": " + rule.meaning + "\n";
 }
@@ -155,7 +156,7 @@ std::optional<Options> ParseOptions(int argc, char* argv[])
 std::string HelpText()
 {
     std::string text = std::string(kUsage) + kOptionsHelp;
-    for (const Rule& rule : AllRules())
+    for (const RuleRow& rule : AllRules())
     {
         text += RuleLine(rule);
     }
@@ -164,13 +165,13 @@ std::string HelpText()
 
 std::optional<std::string> ExplainRule(const std::string& id)
 {
-    if (const Rule* rule = FindRule(id))
+    if (const RuleRow* rule = FindRule(id))
     {
-        return std::string(rule->id) + " (" + NameOf(rule->level) + "): " + rule->meaning + "\n\n" +
+        return std::string(rule->name) + " (" + NameOf(rule->level) + "): " + rule->meaning + "\n\n" +
                rule->consequence + "\n\n" + rule->remedy + "\n";
     }
     (void)std::fprintf(stderr, "pagemeld-check: there is no rule '%s'. The rules are:\n", id.c_str());
-    for (const Rule& rule : AllRules())
+    for (const RuleRow& rule : AllRules())
     {
         (void)std::fputs(RuleLine(rule).c_str(), stderr);
     }

@@ -1,6 +1,7 @@
 #pragma once
 
-#include <cstddef>
+#include "Tools/DocTools/PagemeldCheck/Report/Report.h"
+
 #include <optional>
 #include <string>
 #include <vector>
@@ -20,12 +21,8 @@ struct Options
     std::vector<std::string> roots;      ///< as typed
     std::optional<std::string> discover; ///< the directory below which roots are looked for
     std::string ruleToExplain;
-    bool checksTargets = false;
-    bool checksOutputs = false;
-    bool isJson = false;
-    bool countsWarningsAsErrors = false;
-    bool showsErrorsOnly = false;
-    std::size_t limit = 10; ///< findings shown per rule and file; 0 for all
+    CheckOptions checks;
+    ReportForm form;
 };
 
 /// Returns the options, or nothing after a message on standard error.

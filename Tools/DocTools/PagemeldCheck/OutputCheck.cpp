@@ -1,101 +1,70 @@
 #include "Tools/DocTools/PagemeldCheck/OutputCheck.h"
 
-#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/Read/InputFile.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonReader.h"
 
 #include <algorithm>
-#include <cstring>
 #include <functional>
+#include <optional>
 #include <string_view>
 #include <tuple>
-
-#include <fcntl.h>
-#include <sys/stat.h>
-#include <unistd.h>
 
 namespace
 {
 
-/// One of the four outputs, in the order in which they are written.
-struct OutputForm
+/// What shows that a script is whole. Its end alone does not: a line in the middle can end in the same way,
+/// so a script that was cut there would pass. Only a whole one has the last part too.
+struct ScriptMarks
 {
-    const char* name;
-    bool endsRun;               ///< whether a run ends where it can't be created
-    std::string_view bodyStart; ///< of a script, after the prefix lines; empty for JSON
-    std::string_view lastPart;  ///< of a script, where its last statement or line begins
+    std::string_view bodyStart; ///< after the prefix lines
+    std::string_view lastPart;  ///< where its last statement or line begins
     std::string_view bodyEnd;
 };
 
-constexpr OutputForm kOutputs[] = {
-    {kIndexJsonOutput, false, "", "", ""},
-    {kIndexScriptOutput, true, "pages = [\n", "\nsearchIndex = {", "};\n"},
-    {kTocJsonOutput, false, "", "", ""},
-    {kTocScriptOutput, false, "toc = {\n", "\n\"link\": ", "]};\n"},
-};
+constexpr ScriptMarks kIndexScript = {"pages = [\n", "\nsearchIndex = {", "};\n"};
+constexpr ScriptMarks kTocScript = {"toc = {\n", "\n\"link\": ", "]};\n"};
 
-/// Returns the mode of what is at path, or 0 if nothing is.
-mode_t ModeOf(const std::string& path)
+std::optional<std::string_view> JsonBody(const char* text, std::string_view whole)
 {
-    struct stat status = {};
-    return ::stat(path.c_str(), &status) == 0 ? status.st_mode : 0;
+    rapidjson::Document document;
+    return ParseJson(text, document).IsError() ? std::nullopt : std::optional(whole);
 }
 
-std::string EndOfRun(std::size_t laterModules, std::size_t set)
+std::optional<std::string_view> ScriptBody(const ScriptMarks& marks, std::string_view whole)
 {
-    std::string unwritten = laterModules == 0   ? ""
-                            : laterModules == 1 ? "1 later module"
-                                                : std::to_string(laterModules) + " later modules";
-    if (set == 0)
+    const bool hasPrefixes = whole.substr(0, marks.bodyStart.size()) != marks.bodyStart;
+    const std::size_t lineEnd = hasPrefixes ? whole.find("\n" + std::string(marks.bodyStart)) : 0;
+    if (lineEnd == std::string_view::npos)
     {
-        unwritten += (unwritten.empty() ? "" : " and ") + std::string(kSetNames[1]);
+        return std::nullopt;
     }
-    return "the run ends here with status 255" +
-           (unwritten.empty() ? "" : ", and leaves " + unwritten + " unwritten");
+    const std::string_view body = whole.substr(lineEnd + (hasPrefixes ? 1 : 0));
+    const bool isWhole = body.find(marks.lastPart) != std::string_view::npos &&
+                         body.substr(body.size() - marks.bodyEnd.size()) == marks.bodyEnd;
+    return isWhole ? std::optional(body) : std::nullopt;
 }
 
-/// Returns why nothing can be written into the directory, or an empty text.
-std::string ProblemOf(const std::string& docdata)
+/// Returns what all modules' copies share, or nothing if the output is not whole.
+std::optional<std::string_view> BodyOf(Output output, const InputText& text)
 {
-    const mode_t mode = ModeOf(docdata);
-    if (mode == 0)
+    const std::string_view whole(text.bytes.get(), text.bytesRead);
+    switch (output)
     {
-        return "is missing";
+    case Output::IndexScript:
+        return ScriptBody(kIndexScript, whole);
+    case Output::TocScript:
+        return ScriptBody(kTocScript, whole);
+    case Output::IndexJson:
+    case Output::TocJson:
+    case Output::Count:
+        break;
     }
-    if (!S_ISDIR(mode))
-    {
-        return "is not a directory";
-    }
-    return ::faccessat(AT_FDCWD, docdata.c_str(), W_OK | X_OK, AT_EACCESS) == 0 ? "" : "can't be written to";
+    return JsonBody(text.bytes.get(), whole);
 }
 
-/// Whether a directory itself has the path. A link to one is not an obstacle: the rename replaces it.
-bool IsDirectoryItself(const std::string& path)
+bool IsEarlier(const timespec& a, const timespec& b)
 {
-    struct stat status = {};
-    return ::lstat(path.c_str(), &status) == 0 && S_ISDIR(status.st_mode);
-}
-
-void CheckPlaces(std::size_t module, std::size_t set, const SetModule& place, const std::string& endOfRun,
-                 Report& report)
-{
-    for (const OutputForm& output : kOutputs)
-    {
-        const std::string path = place.path.File(output.name);
-        const mode_t temporary = ModeOf(path + ".tmp");
-        if (IsDirectoryItself(path))
-        {
-            report.Add({"output-blocked", module, set, path,
-                        "a directory is in the place of the output: the new one stays as .tmp"});
-        }
-        if (S_ISDIR(temporary) || S_ISFIFO(temporary))
-        {
-            const std::string what = S_ISDIR(temporary) ? "a directory" : "a pipe";
-            report.Add({"output-blocked", module, set, path + ".tmp",
-                        what + " is in the place of the temporary file: " +
-                            (output.endsRun ? endOfRun : "the run keeps the old output")});
-        }
-    }
+    return std::tie(a.tv_sec, a.tv_nsec) < std::tie(b.tv_sec, b.tv_nsec);
 }
 
 timespec NewestInput(const std::vector<SetModule>& modules)
@@ -103,143 +72,111 @@ timespec NewestInput(const std::vector<SetModule>& modules)
     timespec newest = {};
     for (const SetModule& module : modules)
     {
-        for (const char* name : {kIndexInput, kTocInput})
+        for (const auto& input : kInputs)
         {
-            struct stat status = {};
-            if (::stat(module.path.File(name).c_str(), &status) == 0)
-            {
-                newest = std::max(newest, status.st_mtim,
-                                  [](const timespec& a, const timespec& b)
-                                  { return std::tie(a.tv_sec, a.tv_nsec) < std::tie(b.tv_sec, b.tv_nsec); });
-            }
+            const FileStatus status = FileStatus::Of(module.path.PathOf(input.id));
+            newest = std::max(newest, status.Details().st_mtim, IsEarlier);
         }
     }
     return newest;
 }
 
-bool IsOlder(const std::string& path, const timespec& time)
+/// Compares the copies of one output with the inputs, and with the first whole copy.
+class CopyCheck
 {
-    struct stat status = {};
-    return ::stat(path.c_str(), &status) == 0 &&
-           std::tie(status.st_mtim.tv_sec, status.st_mtim.tv_nsec) < std::tie(time.tv_sec, time.tv_nsec);
-}
-
-/// Returns what all modules' copies share, or nothing if the output is not whole.
-std::optional<std::string_view> BodyOf(const OutputForm& output, const InputText& text)
-{
-    const std::string_view whole(text.bytes.get(), text.bytesRead);
-    if (output.bodyStart.empty())
+public:
+    CopyCheck(Output output, const timespec& newestInput, Report& report)
+        : m_output(RowOf(kOutputs, output)), m_newestInput(newestInput), m_report(report)
     {
-        rapidjson::Document document;
-        return ParseJson(text.bytes.get(), document).IsError() ? std::nullopt : std::optional(whole);
     }
-    std::size_t start = 0;
-    if (whole.substr(0, output.bodyStart.size()) != output.bodyStart)
+
+    void Check(const SetModule& module)
     {
-        start = whole.find("\n" + std::string(output.bodyStart));
-        if (start == std::string_view::npos)
+        const ModuleFile file = module.File(m_output);
+        const InputText text = ReadInputFile(file.path.c_str());
+        if (text.outcome != InputText::Outcome::Read)
         {
-            return std::nullopt;
+            m_report.Add(
+                Finding::OfFile(Rule::OutputMissing, file,
+                                "is not there, or can't be read: readers of the module can't use it"));
+            return;
         }
-        ++start;
+        if (IsStale(file.path))
+        {
+            m_report.Add(Finding::OfFile(Rule::OutputStale, file,
+                                         "is older than an input of the set: readers see an earlier build"));
+        }
+        if (const std::optional<std::string_view> body = BodyOf(m_output.id, text))
+        {
+            CompareWithFirst(file, module.root, *body);
+            return;
+        }
+        m_report.Add(Finding::OfFile(Rule::OutputBroken, file,
+                                     "is cut short or broken: readers of the module can't use it"));
     }
-    const bool isWhole = whole.size() >= output.bodyEnd.size() &&
-                         whole.find(output.lastPart, start) != std::string_view::npos &&
-                         whole.substr(whole.size() - output.bodyEnd.size()) == output.bodyEnd;
-    return isWhole ? std::optional(whole.substr(start)) : std::nullopt;
-}
 
-/// The first whole copy of an output: a fingerprint of its body, and where it is.
-struct FirstCopy
-{
-    std::size_t size = 0;
-    std::size_t hash = 0;
-    const std::string* root = nullptr;
+private:
+    [[nodiscard]] bool IsStale(const std::string& path) const
+    {
+        const FileStatus status = FileStatus::Of(path);
+        return status.Exists() && IsEarlier(status.Details().st_mtim, m_newestInput);
+    }
+
+    void CompareWithFirst(const ModuleFile& file, const std::string& root, std::string_view body)
+    {
+        const std::size_t hash = std::hash<std::string_view>()(body);
+        if (m_firstRoot.empty())
+        {
+            m_firstRoot = Visible(root);
+            m_firstSize = body.size();
+            m_firstHash = hash;
+        }
+        else if (m_firstSize != body.size() || m_firstHash != hash)
+        {
+            m_report.Add(Finding::OfFile(Rule::OutputDiffers, file,
+                                         "has other content than in " + m_firstRoot +
+                                             ": a run ended early, and readers find different things"));
+        }
+    }
+
+    const OutputRow& m_output;
+    const timespec& m_newestInput;
+    Report& m_report;
+    std::string m_firstRoot; ///< of the first whole copy; empty as long as there is none
+    std::size_t m_firstSize = 0;
+    std::size_t m_firstHash = 0;
 };
-
-void CheckCopy(const OutputForm& output, std::size_t module, std::size_t set, const SetModule& place,
-               const timespec& newestInput, FirstCopy& first, Report& report)
-{
-    const std::string path = place.path.File(output.name);
-    const InputText text = ReadInputFile(path.c_str());
-    if (text.outcome != InputText::Outcome::Read)
-    {
-        report.Add({"output-missing", module, set, path,
-                    "is not there, or can't be read: readers of the module can't use it"});
-        return;
-    }
-    if (IsOlder(path, newestInput))
-    {
-        report.Add({"output-stale", module, set, path,
-                    "is older than an input of the set: readers see an earlier build"});
-    }
-    const std::optional<std::string_view> body = BodyOf(output, text);
-    if (!body)
-    {
-        report.Add({"output-broken", module, set, path,
-                    "is cut short or broken: readers of the module can't use it"});
-        return;
-    }
-    const std::size_t hash = std::hash<std::string_view>()(*body);
-    if (first.root == nullptr)
-    {
-        first = {body->size(), hash, &place.root};
-    }
-    else if (first.size != body->size() || first.hash != hash)
-    {
-        report.Add({"output-differs", module, set, path,
-                    "has other content than in " + Visible(*first.root) +
-                        ": a run ended early, and readers find different things"});
-    }
-}
 
 } // namespace
 
-void CheckWritable(std::size_t set, const std::vector<SetModule>& modules, Report& report)
-{
-    for (std::size_t i = 0; i < modules.size(); ++i)
-    {
-        const std::string endOfRun = EndOfRun(modules.size() - 1 - i, set);
-        const std::string problem = ProblemOf(modules[i].docdata);
-        if (problem.empty())
-        {
-            CheckPlaces(i, set, modules[i], endOfRun, report);
-        }
-        else
-        {
-            report.Add({"output-blocked", i, set, modules[i].docdata, problem + ": " + endOfRun});
-        }
-    }
-}
-
-void CheckOutputs(std::size_t set, const std::vector<SetModule>& modules, Report& report)
+void CheckOutputs(const std::vector<SetModule>& modules, Report& report)
 {
     const timespec newestInput = NewestInput(modules);
-    for (const OutputForm& output : kOutputs)
+    for (const OutputRow& output : kOutputs)
     {
-        FirstCopy first;
-        for (std::size_t i = 0; i < modules.size(); ++i)
+        CopyCheck check(output.id, newestInput, report);
+        for (const SetModule& module : modules)
         {
-            if (modules[i].hasDocdata) // otherwise output-blocked reports it
+            if (module.hasDocdata) // otherwise output-blocked reports it
             {
-                CheckCopy(output, i, set, modules[i], newestInput, first, report);
+                check.Check(module);
             }
         }
     }
 }
 
-void CheckLeftovers(std::size_t set, const std::vector<SetModule>& modules, Report& report)
+void CheckLeftovers(const std::vector<SetModule>& modules, Report& report)
 {
-    for (std::size_t i = 0; i < modules.size(); ++i)
+    for (const SetModule& module : modules)
     {
-        for (const OutputForm& output : kOutputs)
+        for (const OutputRow& output : kOutputs)
         {
-            const std::string path = modules[i].path.File(output.name) + ".tmp";
-            if (S_ISREG(ModeOf(path)))
+            const ModuleFile temporary = module.File(TemporaryPathOf(module.path.PathOf(output)));
+            if (FileStatus::Of(temporary.path).IsRegularFile())
             {
-                report.Add({"leftover", i, set, path,
-                            "a temporary file is left over: a run was ended, and the output beside it may "
-                            "be old"});
+                report.Add(Finding::OfFile(Rule::Leftover, temporary,
+                                           "a temporary file is left over: a run was ended, and the output "
+                                           "beside it may be old"));
             }
         }
     }

@@ -1,16 +1,13 @@
 #include "Tools/DocTools/PagemeldCheck/RootCheck.h"
 
-#include "Tools/DocTools/PagemeldCheck/Browse/WebPath.h"
 #include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/ModuleDiscovery.h"
-#include "Tools/DocTools/VantorPagemeld/ModulePath.h"
-#include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"
+#include "Tools/DocTools/VantorPagemeld/ModuleLayout.h"
+#include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
 
 #include <algorithm>
-#include <filesystem>
+#include <iterator>
 #include <map>
-
-#include <sys/stat.h>
 
 namespace
 {
@@ -31,13 +28,9 @@ const char* DescribePassedOver(PassedOver reason)
 
 bool IsModule(const std::string& root)
 {
-    return std::any_of(std::begin(kSetNames), std::end(kSetNames),
-                       [&](const char* setName)
-                       {
-                           std::error_code error;
-                           return std::filesystem::is_directory(ModulePath(root, setName).File("docdata"),
-                                                                error);
-                       });
+    return std::any_of(std::begin(kDocSets), std::end(kDocSets),
+                       [&](const auto& set)
+                       { return FileStatus::Of(ModulePath(root, set.id).Docdata()).IsDirectory(); });
 }
 
 /// Reports the first root if none is a module. If only some are not, output-blocked reports each of them in
@@ -46,9 +39,10 @@ void ReportIfNoneIsModule(const std::vector<std::string>& roots, Report& report)
 {
     if (!roots.empty() && std::none_of(roots.begin(), roots.end(), IsModule))
     {
-        report.Add({"no-modules", 0, std::nullopt, roots[0],
-                    std::string("neither Manual/docdata nor ScriptReference/docdata is found in it") +
-                        (roots.size() > 1 ? ", nor in any other root" : "") + ": nothing will be combined"});
+        report.Add(Finding::OfRoot(
+            Rule::NoModules, 0, roots[0],
+            std::string("neither Manual/docdata nor ScriptReference/docdata is found in it") +
+                (roots.size() > 1 ? ", nor in any other root" : "") + ": nothing will be combined"));
     }
 }
 
@@ -57,118 +51,19 @@ void ReportDuplicates(const std::vector<std::string>& roots, Report& report)
     std::map<std::pair<dev_t, ino_t>, std::size_t> known;
     for (std::size_t i = 0; i < roots.size(); ++i)
     {
-        struct stat status = {};
-        if (::stat(roots[i].c_str(), &status) != 0)
+        const FileStatus status = FileStatus::Of(roots[i]);
+        if (!status.Exists())
         {
             continue;
         }
-        const auto [first, isNew] = known.try_emplace({status.st_dev, status.st_ino}, i);
+        const auto [first, isNew] = known.try_emplace({status.Details().st_dev, status.Details().st_ino}, i);
         if (!isNew)
         {
-            report.Add({"duplicate-root", i, std::nullopt, roots[i],
-                        "is the same directory as " + Visible(roots[first->second]) +
-                            ": its pages will be in the search twice"});
+            report.Add(Finding::OfRoot(Rule::DuplicateRoot, i, roots[i],
+                                       "is the same directory as " + Visible(roots[first->second]) +
+                                           ": its pages will be in the search twice"));
         }
     }
-}
-
-/// One root as the scripts and the web see it. Both sets give the same result; the links are those of Manual.
-struct RootPath
-{
-    explicit RootPath(const std::string& root) : module(root, kSetNames[0]), webPath(WebPathOf(module.Text()))
-    {
-    }
-
-    ModulePath module;
-    std::string webPath;
-};
-
-/// Where the links from a root lead, if it is not where they should.
-struct WrongLinks
-{
-    std::size_t first = 0; ///< the first root that is not reached
-    std::size_t count = 0;
-    std::string reached; ///< instead of the first; empty if it is not a directory at all
-};
-
-WrongLinks FindWrongLinksFromRoot(const std::vector<RootPath>& paths, std::size_t from)
-{
-    WrongLinks wrong;
-    for (std::size_t to = 0; to < paths.size(); ++to)
-    {
-        const std::string prefix = RelativePrefix(paths[from].module.Text(), paths[to].module.AsLinkTarget());
-        const std::optional<std::string> reached = FollowLink(paths[from].module.Text(), prefix);
-        if (to == from || reached == paths[to].webPath)
-        {
-            continue;
-        }
-        if (wrong.count++ == 0)
-        {
-            wrong.first = to;
-            wrong.reached = reached.value_or("");
-        }
-    }
-    return wrong;
-}
-
-/// Returns a web path as people write it: without "./" before it and "/" after it.
-std::string DisplayedWebPath(std::string_view webPath)
-{
-    if (webPath.substr(0, 2) == "./")
-    {
-        webPath.remove_prefix(2);
-    }
-    return Visible(webPath.substr(0, webPath.find_last_not_of('/') + 1));
-}
-
-bool EndsInSlash(const std::string& root)
-{
-    return !root.empty() && root.back() == '/';
-}
-
-/// Whether one name begins with the other, apart from being in the same directory.
-bool ShareBeginning(const std::string& a, const std::string& b)
-{
-    const std::size_t length = std::min(a.size(), b.size());
-    return a.compare(0, length, b, 0, length) == 0;
-}
-
-std::string Remedy(const std::string& from, const std::string& to)
-{
-    if (EndsInSlash(from) || EndsInSlash(to))
-    {
-        return "give the roots without a slash at the end";
-    }
-    if (ShareBeginning(from, to))
-    {
-        return "one name begins with the other: rename one";
-    }
-    const bool isSpecial = to.find_first_of("%#?\\\n\r\t") != std::string::npos;
-    return isSpecial || (from[0] == '/' && to[0] == '/') ? "rename the directory" : "give absolute paths";
-}
-
-std::string DescribeWrongLinks(const std::vector<std::string>& roots, std::size_t from,
-                               const WrongLinks& wrong)
-{
-    const std::string& to = roots[wrong.first];
-    const std::string others = wrong.count > 1 ? " and " + std::to_string(wrong.count - 1) + " more" : "";
-    const std::string lead =
-        wrong.reached.empty() ? " will lead elsewhere" : " will lead to " + DisplayedWebPath(wrong.reached);
-    return "links to " + Visible(to) + others + lead + ": " + Remedy(roots[from], to);
-}
-
-/// Returns the first root in whose scripts the prefix to another one breaks the string, or nothing.
-std::optional<std::size_t> FindUnnamable(const std::vector<RootPath>& paths, std::size_t to)
-{
-    for (std::size_t from = 0; from < paths.size(); ++from)
-    {
-        const std::string prefix = RelativePrefix(paths[from].module.Text(), paths[to].module.AsLinkTarget());
-        if (prefix.find_first_of("\"\\\n\r") != std::string::npos)
-        {
-            return from;
-        }
-    }
-    return std::nullopt;
 }
 
 } // namespace
@@ -179,14 +74,13 @@ void DiscoverRoots(const std::string& directory, std::vector<std::string>& roots
     std::replace(converted.begin(), converted.end(), '\\', '/');
     std::list<std::string> found;
     FindModules(converted, found,
-                [&](const std::string& path, PassedOver reason) {
-                    report.Add({"passed-over", std::nullopt, std::nullopt, path, DescribePassedOver(reason)});
-                });
+                [&](const std::string& path, PassedOver reason)
+                { report.Add(Finding::OfRun(Rule::PassedOver, path, DescribePassedOver(reason))); });
     roots.assign(found.begin(), found.end());
     if (roots.empty())
     {
-        report.Add({"no-modules", std::nullopt, std::nullopt, directory,
-                    "no directory below it has Manual/docdata: nothing will be combined"});
+        report.Add(Finding::OfRun(Rule::NoModules, directory,
+                                  "no directory below it has Manual/docdata: nothing will be combined"));
     }
 }
 
@@ -194,20 +88,4 @@ void CheckRoots(const std::vector<std::string>& roots, Report& report)
 {
     ReportIfNoneIsModule(roots, report);
     ReportDuplicates(roots, report);
-    const std::vector<RootPath> paths(roots.begin(), roots.end());
-    for (std::size_t i = 0; i < roots.size(); ++i)
-    {
-        if (const std::optional<std::size_t> from = FindUnnamable(paths, i))
-        {
-            report.Add({"wrong-link-path", i, std::nullopt, roots[i],
-                        "a quote, backslash or line break in the path breaks both scripts of " +
-                            Visible(roots[*from]) + ": rename the directory"});
-            continue;
-        }
-        const WrongLinks wrong = FindWrongLinksFromRoot(paths, i);
-        if (wrong.count > 0)
-        {
-            report.Add({"wrong-link-path", i, std::nullopt, roots[i], DescribeWrongLinks(roots, i, wrong)});
-        }
-    }
 }

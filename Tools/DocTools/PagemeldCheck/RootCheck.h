@@ -9,6 +9,5 @@
 /// over, or that there are none.
 void DiscoverRoots(const std::string& directory, std::vector<std::string>& roots, Report& report);
 
-/// Reports if none of the roots is a module, roots that are the same directory, and roots whose links to
-/// others lead to the wrong place.
+/// Reports if none of the roots is a module, and roots that are the same directory.
 void CheckRoots(const std::vector<std::string>& roots, Report& report);

@@ -1,281 +1,158 @@
 #include "Tools/DocTools/PagemeldCheck/SetCheck.h"
 
-#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
+#include "Tools/DocTools/PagemeldCheck/ContentsCheck.h"
 #include "Tools/DocTools/PagemeldCheck/OutputCheck.h"
 #include "Tools/DocTools/PagemeldCheck/SetModule.h"
+#include "Tools/DocTools/PagemeldCheck/WriteCheck.h"
 
 #include <algorithm>
 #include <cerrno>
 
-#include <sys/stat.h>
-
 namespace
 {
 
-bool IsDirectory(const std::string& path)
+using Modules = std::vector<SetModule>;
+
+Modules ModulesOf(DocSet set, const std::vector<std::string>& roots, const CheckOptions& options)
 {
-    struct stat status = {};
-    return ::stat(path.c_str(), &status) == 0 && S_ISDIR(status.st_mode);
+    Modules modules;
+    modules.reserve(roots.size());
+    for (const std::string& root : roots)
+    {
+        modules.emplace_back(modules.size(), set, root, options);
+    }
+    return modules;
 }
 
 /// Whether something is at path, or may be: a directory may hide what is in it.
 bool IsThere(const std::string& path)
 {
-    struct stat status = {};
-    return ::lstat(path.c_str(), &status) == 0 || errno == EACCES;
+    const FileStatus status = FileStatus::OfEntry(path);
+    return status.Exists() || status.Error() == EACCES;
 }
 
-/// Checks one set. Each step uses what the steps before it found out.
-class SetCheck
+InputFacts CheckFile(const FileScope& scope, Report& report)
 {
-public:
-    SetCheck(std::size_t set, const std::vector<std::string>& roots, const SetChecks& checks, Report& report)
-        : m_set(set), m_checks(checks), m_report(report)
+    InputFacts facts = CheckInput(scope, report);
+    if (facts.state == InputFacts::State::Unreadable && !IsThere(scope.file.path))
     {
-        for (const std::string& root : roots)
-        {
-            SetModule& module = m_modules.emplace_back(root, kSetNames[set]);
-            module.hasDocdata = IsDirectory(module.docdata);
-        }
+        facts.state = InputFacts::State::Missing;
     }
+    return facts;
+}
 
-    void Run()
+void ReportUnreadable(const FileScope& scope, const InputFacts& facts, Report& report)
+{
+    const bool isMissing = facts.state == InputFacts::State::Missing;
+    if (isMissing || facts.state == InputFacts::State::Unreadable)
     {
-        for (std::size_t i = 0; i < m_modules.size(); ++i)
-        {
-            if (m_modules[i].hasDocdata)
-            {
-                CheckModule(i);
-            }
-        }
-        CheckContentRoots();
-        CheckCommonWords();
-        const bool isWritten = CheckWhetherWritten();
-        if (isWritten)
-        {
-            CheckWritable(m_set, m_modules, m_report);
-        }
-        if (m_checks.checksOutputs)
-        {
-            if (isWritten)
-            {
-                CheckOutputs(m_set, m_modules, m_report);
-            }
-            CheckLeftovers(m_set, m_modules, m_report);
-        }
-        NoteMissing();
-    }
-
-private:
-    void CheckModule(std::size_t i)
-    {
-        SetModule& module = m_modules[i];
-        module.index = CheckFile(InputKind::Index, i);
-        module.toc = CheckFile(InputKind::Toc, i);
-        if (!module.HasFiles())
-        {
-            m_report.Add({"set-empty", i, m_set, module.docdata,
-                          std::string("has neither index.json nor toc.json: the module adds nothing to ") +
-                              kSetNames[m_set]});
-            return;
-        }
-        ReportUnreadable(i, InputKind::Index);
-        ReportUnreadable(i, InputKind::Toc);
-    }
-
-    [[nodiscard]] static std::string PathOf(const SetModule& module, InputKind kind)
-    {
-        return module.path.File(kind == InputKind::Index ? kIndexInput : kTocInput);
-    }
-
-    InputFacts CheckFile(InputKind kind, std::size_t i)
-    {
-        const SetModule& module = m_modules[i];
-        const std::string path = PathOf(module, kind);
-        InputFacts facts =
-            CheckInput(kind, {i, m_set, path, m_checks.limit, m_checks.quoteSize}, NameOfRoot(module.root),
-                       {m_checks.checksTargets, module.path.Text()}, m_report);
-        if (facts.state == InputFacts::State::Unreadable && !IsThere(path))
-        {
-            facts.state = InputFacts::State::Missing;
-        }
-        return facts;
-    }
-
-    void ReportUnreadable(std::size_t i, InputKind kind)
-    {
-        const SetModule& module = m_modules[i];
-        const bool isIndex = kind == InputKind::Index;
-        const InputFacts& facts = isIndex ? module.index : module.toc;
-        if (facts.state != InputFacts::State::Missing && facts.state != InputFacts::State::Unreadable)
-        {
-            return;
-        }
+        const Input other = scope.input == Input::Index ? Input::Toc : Input::Index;
         const std::string reason =
-            facts.state == InputFacts::State::Unreadable
-                ? "can't be read"
-                : std::string("is missing beside ") + (isIndex ? "toc.json" : "index.json");
-        m_report.Add({"unreadable", i, m_set, PathOf(module, kind),
-                      reason + "; " + Quoted(NameOfRoot(module.root), m_checks.quoteSize) +
-                          " will be missing from the " + (isIndex ? "search" : "contents") + " of " +
-                          kSetNames[m_set]});
+            isMissing ? std::string("is missing beside ") + NameOf(other) : "can't be read";
+        report.Add(Finding::OfFile(Rule::Unreadable, scope.file, reason + "; " + scope.Loss()));
     }
+}
 
-    [[nodiscard]] std::vector<std::size_t> SoundContents() const
+void CheckModule(SetModule& module, Report& report)
+{
+    for (const auto& input : kInputs)
     {
-        std::vector<std::size_t> sound;
-        for (std::size_t i = 0; i < m_modules.size(); ++i)
-        {
-            if (m_modules[i].toc.IsSound())
-            {
-                sound.push_back(i);
-            }
-        }
-        return sound;
+        module.FactsOf(input.id) = CheckFile(module.ScopeOf(input.id), report);
     }
-
-    [[nodiscard]] bool HasSameRoot(std::size_t a, std::size_t b) const
+    if (!module.HasFiles())
     {
-        const InputFacts& first = m_modules[a].toc;
-        const InputFacts& second = m_modules[b].toc;
-        return first.rootLink == second.rootLink && first.rootTitle == second.rootTitle;
+        report.Add(
+            Finding::OfFile(Rule::SetEmpty, module.docdata,
+                            std::string("has neither index.json nor toc.json: the module adds nothing to ") +
+                                NameOf(module.docdata.set)));
+        return;
     }
-
-    void CheckContentRoots()
+    for (const auto& input : kInputs)
     {
-        const std::vector<std::size_t> sound = SoundContents();
-        std::vector<std::size_t> dropped;
-        for (const std::size_t i : sound)
+        ReportUnreadable(module.ScopeOf(input.id), module.FactsOf(input.id), report);
+    }
+}
+
+void CheckCommonWords(DocSet set, const Modules& modules, Report& report)
+{
+    const auto hasWords = [](const SetModule& module) { return !module.index.commonWords.empty(); };
+    const auto counts = std::find_if(modules.begin(), modules.end(), hasWords);
+    std::string differing;
+    for (auto module = counts; module != modules.end(); ++module)
+    {
+        if (hasWords(*module) && module->index.commonWords != counts->index.commonWords)
         {
-            if (!HasSameRoot(i, sound.front()))
-            {
-                dropped.push_back(i);
-                m_modules[i].isDropped = true;
-            }
-        }
-        const bool isFirstOdd = dropped.size() >= 2 && dropped.size() + 1 == sound.size();
-        if (isFirstOdd)
-        {
-            ReportOddFirst(sound.front(), dropped);
-            return;
-        }
-        for (const std::size_t i : dropped)
-        {
-            ReportDropped(i, sound.front());
+            AppendListed(differing, module->name);
         }
     }
-
-    void ReportDropped(std::size_t i, std::size_t first)
+    if (!differing.empty())
     {
-        ReportRoot(i, first,
-                   "of " + Visible(m_modules[first].root) + "; " + NameInText(i) +
-                       " will be missing from the contents of " + kSetNames[m_set]);
+        report.Add(Finding::OfSet(Rule::CommonIgnored, set,
+                                  "the common words of " + counts->name +
+                                      " count for all modules; those that differ are ignored, of " +
+                                      differing));
     }
+}
 
-    void ReportOddFirst(std::size_t first, const std::vector<std::size_t>& dropped)
+/// Returns whether a run writes the set, and reports if it does not though it has files.
+bool CheckWhetherWritten(DocSet set, const Modules& modules, Report& report)
+{
+    const auto has = [&](auto test) { return std::any_of(modules.begin(), modules.end(), test); };
+    const bool hasIndex = has([](const SetModule& module) { return module.index.IsSound(); });
+    const bool hasToc = has([](const SetModule& module) { return module.toc.IsSound(); });
+    if (has([](const SetModule& module) { return module.HasFiles(); }) && !(hasIndex && hasToc))
     {
-        std::string names;
-        for (const std::size_t i : dropped)
+        report.Add(Finding::OfSet(Rule::NothingToCombine, set,
+                                  std::string("no module has ") +
+                                      (hasIndex ? "a sound toc.json"
+                                       : hasToc ? "a sound index.json"
+                                                : "a sound index.json, and none a sound toc.json") +
+                                      ": nothing will be written, and earlier outputs stay"));
+    }
+    return hasIndex && hasToc;
+}
+
+void NoteMissing(const Modules& modules, MissingModules& missing)
+{
+    for (const SetModule& module : modules)
+    {
+        if (module.HasFiles() && !module.index.IsSound())
         {
-            names += (names.empty() ? "" : ", ") + NameInText(i);
+            missing.search.push_back(module.root);
         }
-        ReportRoot(first, dropped.front(),
-                   "of " + std::to_string(dropped.size()) +
-                       " other modules; it comes first, so they are dropped from the contents of " +
-                       kSetNames[m_set] + ": " + names);
-    }
-
-    /// Reports the root of module i, which differs from that of another one.
-    void ReportRoot(std::size_t i, std::size_t other, const std::string& consequence)
-    {
-        const InputFacts& facts = m_modules[i].toc;
-        const InputFacts& otherFacts = m_modules[other].toc;
-        const bool linkDiffers = facts.rootLink != otherFacts.rootLink;
-        const auto& own = linkDiffers ? facts.rootLink : facts.rootTitle;
-        const auto& others = linkDiffers ? otherFacts.rootLink : otherFacts.rootTitle;
-        const char* const member = linkDiffers ? "link" : "title";
-        Finding finding("root-differs", i, m_set, PathOf(m_modules[i], InputKind::Toc),
-                        std::string("root ") + member + " " + Quoted(own, m_checks.quoteSize) +
-                            " differs from " + Quoted(others, m_checks.quoteSize) + " " + consequence);
-        const std::vector<ValuePlace> places = LocateRoot(finding.file);
-        if (!places.empty())
+        if (module.HasFiles() && (!module.toc.IsSound() || module.isDropped))
         {
-            finding.place = places[linkDiffers ? 0 : 1];
-        }
-        finding.pointer = std::string("/") + member;
-        m_report.Add(std::move(finding));
-    }
-
-    [[nodiscard]] std::string NameInText(std::size_t i) const
-    {
-        return Quoted(NameOfRoot(m_modules[i].root), m_checks.quoteSize);
-    }
-
-    void CheckCommonWords()
-    {
-        const auto counts =
-            std::find_if(m_modules.begin(), m_modules.end(),
-                         [](const SetModule& module) { return !module.index.commonWords.empty(); });
-        std::string differing;
-        for (auto module = counts; module != m_modules.end(); ++module)
-        {
-            if (!module->index.commonWords.empty() && module->index.commonWords != counts->index.commonWords)
-            {
-                differing +=
-                    (differing.empty() ? "" : ", ") + Quoted(NameOfRoot(module->root), m_checks.quoteSize);
-            }
-        }
-        if (!differing.empty())
-        {
-            m_report.Add({"common-ignored", std::nullopt, m_set, "",
-                          "the common words of " + Quoted(NameOfRoot(counts->root), m_checks.quoteSize) +
-                              " count for all modules; those that differ are ignored, of " + differing});
+            missing.contents.push_back(module.root);
         }
     }
-
-    /// Returns whether a run writes the set, and reports if it does not though it has files.
-    bool CheckWhetherWritten()
-    {
-        const auto has = [&](auto test) { return std::any_of(m_modules.begin(), m_modules.end(), test); };
-        const bool hasIndex = has([](const SetModule& module) { return module.index.IsSound(); });
-        const bool hasToc = has([](const SetModule& module) { return module.toc.IsSound(); });
-        if (has([](const SetModule& module) { return module.HasFiles(); }) && !(hasIndex && hasToc))
-        {
-            m_report.Add({"nothing-to-combine", std::nullopt, m_set, "",
-                          std::string("no module has ") +
-                              (hasIndex ? "a sound toc.json"
-                               : hasToc ? "a sound index.json"
-                                        : "a sound index.json, and none a sound toc.json") +
-                              ": nothing will be written, and earlier outputs stay"});
-        }
-        return hasIndex && hasToc;
-    }
-
-    void NoteMissing()
-    {
-        MissingModules& missing = m_report.MissingOf(m_set);
-        for (const SetModule& module : m_modules)
-        {
-            if (module.HasFiles() && !module.index.IsSound())
-            {
-                missing.search.push_back(module.root);
-            }
-            if (module.HasFiles() && (!module.toc.IsSound() || module.isDropped))
-            {
-                missing.contents.push_back(module.root);
-            }
-        }
-    }
-
-    std::size_t m_set;
-    const SetChecks& m_checks;
-    Report& m_report;
-    std::vector<SetModule> m_modules;
-};
+}
 
 } // namespace
 
-void CheckSet(std::size_t set, const std::vector<std::string>& roots, const SetChecks& checks, Report& report)
+void CheckSet(DocSet set, const std::vector<std::string>& roots, const CheckOptions& options, Report& report)
 {
-    SetCheck(set, roots, checks, report).Run();
+    Modules modules = ModulesOf(set, roots, options);
+    for (SetModule& module : modules)
+    {
+        if (module.hasDocdata)
+        {
+            CheckModule(module, report);
+        }
+    }
+    CheckContentRoots(modules, report);
+    CheckCommonWords(set, modules, report);
+    const bool isWritten = CheckWhetherWritten(set, modules, report);
+    if (isWritten)
+    {
+        CheckWritable(modules, report);
+    }
+    if (isWritten && options.checksOutputs)
+    {
+        CheckOutputs(modules, report);
+    }
+    if (options.checksOutputs)
+    {
+        CheckLeftovers(modules, report);
+    }
+    NoteMissing(modules, report.MissingOf(set));
 }

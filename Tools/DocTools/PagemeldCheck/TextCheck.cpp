@@ -5,8 +5,7 @@
 #include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 #include "Tools/DocTools/VantorPagemeld/Render/TextBuffer.h"
-
-#include <sys/stat.h>
+#include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
 
 namespace
 {
@@ -22,8 +21,8 @@ enum class TextKind
 
 bool IsFile(const std::string& path)
 {
-    struct stat status = {};
-    return ::stat(path.c_str(), &status) == 0 && !S_ISDIR(status.st_mode);
+    const FileStatus status = FileStatus::Of(path);
+    return status.Exists() && !status.IsDirectory();
 }
 
 /// Whether a link leads to a file below the directory, without what begins with "#" or "?": as it is, or
@@ -44,8 +43,8 @@ bool IsAddress(std::string_view link)
 class TextCheck
 {
 public:
-    TextCheck(const char* script, const TextChecks& checks, FileFindings& findings)
-        : m_script(script), m_checks(checks), m_findings(findings)
+    TextCheck(Output script, const FileScope& scope, FileFindings& findings)
+        : m_script(RowOf(kOutputs, script).name), m_scope(scope), m_findings(findings)
     {
     }
 
@@ -65,12 +64,12 @@ public:
         };
         if (!value)
         {
-            m_findings.AddAtValue("script-broken", text, pointer,
+            m_findings.AddAtValue(Rule::ScriptBroken, text, pointer,
                                   [&] { return named() + " breaks " + m_script + " in every module"; });
         }
         else if (*value != BytesOf(text))
         {
-            m_findings.AddAtValue("script-altered", text, pointer,
+            m_findings.AddAtValue(Rule::ScriptAltered, text, pointer,
                                   [&]
                                   {
                                       return named() + " is " + Quote(*value) + " in " + m_script +
@@ -86,7 +85,7 @@ public:
         CheckText(TextKind::Path, name, link, pointer);
         if (IsAddress(BytesOf(link)))
         {
-            m_findings.AddAtValue("prefixed-url", link, pointer,
+            m_findings.AddAtValue(Rule::PrefixedUrl, link, pointer,
                                   [&]
                                   {
                                       return std::string(name) + " " + Quote(BytesOf(link)) +
@@ -101,10 +100,10 @@ public:
 
     void CheckTarget(const char* name, const Value& link, const JsonPointer& pointer)
     {
-        if (m_checks.checksTargets && !IsAddress(BytesOf(link)) &&
-            !LeadsToFile(m_checks.setDirectory, CStringOf(link)))
+        if (m_scope.options.checksTargets && !IsAddress(BytesOf(link)) &&
+            !LeadsToFile(m_scope.directory.Text(), CStringOf(link)))
         {
-            m_findings.AddAtValue("missing-target", link, pointer,
+            m_findings.AddAtValue(Rule::MissingTarget, link, pointer,
                                   [&] {
                                       return std::string(name) + " " + Quote(BytesOf(link)) +
                                              " leads to no file: the link is dead";
@@ -119,7 +118,7 @@ public:
             if (BytesOf(member.name) == "__proto__")
             {
                 m_findings.AddAtValue(
-                    "special-term", member.value, {pointer, BytesOf(member.name)},
+                    Rule::SpecialTerm, member.value, {pointer, BytesOf(member.name)},
                     [&] {
                         return std::string(kind) +
                                " \"__proto__\" sets a prototype in the scripts: readers do not find it";
@@ -130,7 +129,7 @@ public:
 
     [[nodiscard]] std::string Quote(std::string_view text) const
     {
-        return Quoted(text, m_findings.Scope().quoteSize);
+        return Quoted(text, m_scope.options.quoteSize);
     }
 
 private:
@@ -150,7 +149,7 @@ private:
     }
 
     const char* m_script;
-    const TextChecks& m_checks;
+    const FileScope& m_scope;
     FileFindings& m_findings;
 };
 
@@ -181,9 +180,9 @@ void CheckNodes(TextCheck& check, const Value& children, const JsonPointer& poin
 
 } // namespace
 
-void CheckIndexTexts(const Value& index, const TextChecks& checks, FileFindings& findings)
+void CheckIndexTexts(const Value& index, const FileScope& scope, FileFindings& findings)
 {
-    TextCheck check("global_index.js", checks, findings);
+    TextCheck check(Output::IndexScript, scope, findings);
     const JsonPointer root;
     const JsonPointer pagesPointer(root, "pages");
     const Value& pages = *FindMember(index, "pages");
@@ -198,9 +197,9 @@ void CheckIndexTexts(const Value& index, const TextChecks& checks, FileFindings&
     check.CheckNames(*FindMember(index, "searchIndex"), "term", {root, "searchIndex"});
 }
 
-void CheckTocTexts(const Value& toc, const TextChecks& checks, FileFindings& findings)
+void CheckTocTexts(const Value& toc, const FileScope& scope, FileFindings& findings)
 {
-    TextCheck check("global_toc.js", checks, findings);
+    TextCheck check(Output::TocScript, scope, findings);
     const JsonPointer root;
     const Value& link = *FindMember(toc, "link");
     // The root's link is escaped as a title is, and gets no prefix.

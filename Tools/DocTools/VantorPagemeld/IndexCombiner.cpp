@@ -3,19 +3,19 @@
 #include "Tools/DocTools/VantorPagemeld/Check/IndexStructure.h"
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "Tools/DocTools/VantorPagemeld/Render/IndexScript.h"
-#include "Tools/DocTools/VantorPagemeld/System/Messages.h"
+#include "Tools/DocTools/VantorPagemeld/System/Diagnostics.h"
 
 namespace
 {
 
 constexpr Diagnostics kDiagnostics("./Tools/DocTools/VantorPagemeld/IndexCombiner");
 
-bool ReportAndStop(const StructureFault& fault, const JsonPointer& /*pointer*/,
-                   const rapidjson::Value& /*value*/)
+bool ReportAndStop(const FoundFault& found)
 {
-    if (fault.text != nullptr)
+    const StructureFaultRow& row = RowOf(found.fault);
+    if (row.text != nullptr)
     {
-        kDiagnostics.Warning(fault.number, "%s\n", fault.text);
+        kDiagnostics.Warning(row.number, "%s\n", row.text);
     }
     return false;
 }

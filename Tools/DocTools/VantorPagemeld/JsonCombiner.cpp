@@ -1,6 +1,6 @@
 #include "Tools/DocTools/VantorPagemeld/JsonCombiner.h"
 
-#include "Tools/DocTools/VantorPagemeld/ModulePath.h"
+#include "Tools/DocTools/VantorPagemeld/ModuleLayout.h"
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"
 

@@ -2,8 +2,9 @@
 #include "Runtime/Utilities/CommandLine.h"
 #include "Tools/DocTools/VantorPagemeld/DocumentationSet.h"
 #include "Tools/DocTools/VantorPagemeld/ModuleDiscovery.h"
+#include "Tools/DocTools/VantorPagemeld/ModuleLayout.h"
+#include "Tools/DocTools/VantorPagemeld/System/Diagnostics.h"
 #include "Tools/DocTools/VantorPagemeld/System/Memory.h"
-#include "Tools/DocTools/VantorPagemeld/System/Messages.h"
 #include "Tools/DocTools/VantorPagemeld/Verification.h"
 
 #include <algorithm>
@@ -41,8 +42,10 @@ int RunVerification(const char* rootDocPath)
 /// combined, nor does it change the exit status.
 int RunCombining(const std::list<std::string>& moduleRoots)
 {
-    (void)CombineAllTocAndIndex(moduleRoots, "Manual");
-    (void)CombineAllTocAndIndex(moduleRoots, "ScriptReference");
+    for (const auto& set : kDocSets)
+    {
+        (void)CombineAllTocAndIndex(moduleRoots, set.name);
+    }
     return kSuccess;
 }
 

@@ -1,26 +1,23 @@
 #include "Tools/DocTools/VantorPagemeld/ModuleDiscovery.h"
 
-#include "Tools/DocTools/VantorPagemeld/ModulePath.h"
+#include "Tools/DocTools/VantorPagemeld/ModuleLayout.h"
 #include "Tools/DocTools/VantorPagemeld/System/DirectoryListing.h"
+#include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
 
 #include <string_view>
-
-#include <sys/stat.h>
 
 namespace
 {
 
-bool HasDocdata(const std::string& path, const char* setName)
+bool HasDocdata(const std::string& path, DocSet set)
 {
-    const std::string probe = ModulePath(path, setName).File("docdata");
-    struct stat status = {};
     // Only the directory bit is tested, which sockets and block devices have too; this is intentional.
-    return ::stat(probe.c_str(), &status) == 0 && (status.st_mode & S_IFDIR) != 0;
+    return (FileStatus::Of(ModulePath(path, set).Docdata()).Details().st_mode & S_IFDIR) != 0;
 }
 
 bool IsModuleRoot(const std::string& path)
 {
-    return HasDocdata(path, "Manual");
+    return HasDocdata(path, DocSet::Manual);
 }
 
 /// Reports a hidden or linked entry that leads to a module.
@@ -46,7 +43,7 @@ void FindModules(const std::string& directory, std::list<std::string>& moduleRoo
     for (const dirent* entry : SortedListing(directory.c_str()))
     {
         const std::string path = directory + "/" + entry->d_name;
-        if (entry->d_name[0] == '.' || !IsDirectory(*entry, path))
+        if (entry->d_name[0] == '.' || !IsDirectoryItself(*entry, path))
         {
             ReportPassedOver(path, entry->d_name, onPassedOver);
             continue;
@@ -56,7 +53,7 @@ void FindModules(const std::string& directory, std::list<std::string>& moduleRoo
             moduleRoots.push_back(path);
             continue;
         }
-        if (onPassedOver && HasDocdata(path, "ScriptReference"))
+        if (onPassedOver && HasDocdata(path, DocSet::ScriptReference))
         {
             onPassedOver(path, PassedOver::WithoutManual);
         }

@@ -2,7 +2,7 @@
 
 #include "Tools/DocTools/VantorPagemeld/Read/InputFile.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonReader.h"
-#include "Tools/DocTools/VantorPagemeld/System/Messages.h"
+#include "Tools/DocTools/VantorPagemeld/System/Diagnostics.h"
 
 namespace
 {

@@ -3,17 +3,17 @@
 #include "Tools/DocTools/VantorPagemeld/Check/TocStructure.h"
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
-#include "Tools/DocTools/VantorPagemeld/System/Messages.h"
+#include "Tools/DocTools/VantorPagemeld/System/Diagnostics.h"
 
 namespace
 {
 
 constexpr Diagnostics kDiagnostics("./Tools/DocTools/VantorPagemeld/TocCombiner");
 
-bool ReportAndStop(const StructureFault& fault, const JsonPointer& /*pointer*/,
-                   const rapidjson::Value& /*value*/)
+bool ReportAndStop(const FoundFault& found)
 {
-    kDiagnostics.Warning(fault.number, "%s\n", fault.text);
+    const StructureFaultRow& row = RowOf(found.fault);
+    kDiagnostics.Warning(row.number, "%s\n", row.text);
     return false;
 }
 

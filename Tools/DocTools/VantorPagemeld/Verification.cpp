@@ -1,43 +1,36 @@
 #include "Tools/DocTools/VantorPagemeld/Verification.h"
 
+#include "Tools/DocTools/VantorPagemeld/ModuleLayout.h"
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
-#include "Tools/DocTools/VantorPagemeld/System/Messages.h"
+#include "Tools/DocTools/VantorPagemeld/System/Diagnostics.h"
+#include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
 
 #include <rapidjson/document.h>
-
-#include <sys/stat.h>
 
 namespace
 {
 
-constexpr const char* kInputFiles[] = {
-    "/en/Manual/docdata/toc.json",
-    "/en/Manual/docdata/index.json",
-    "/en/ScriptReference/docdata/toc.json",
-    "/en/ScriptReference/docdata/index.json",
-};
-
-bool Exists(const std::string& path)
+/// Returns whether the file is missing, or can be read and is JSON.
+bool Verify(const std::string& path)
 {
-    struct stat status = {};
-    return ::stat(path.c_str(), &status) == 0;
+    if (!FileStatus::Of(path).Exists())
+    {
+        ReportProgress("Skipping %s\n", path.c_str());
+        return true;
+    }
+    ReportProgress("Verifying %s\n", path.c_str());
+    rapidjson::Document document;
+    return RapidJsonIoUtil::TryGetJsonDocFromFile(path.c_str(), document);
 }
 
 } // namespace
 
 bool VerifyTocAndIndex(const std::string& rootDocPath)
 {
-    for (const char* inputFile : kInputFiles)
+    for (const auto& set : kDocSets)
     {
-        const std::string path = rootDocPath + inputFile;
-        if (!Exists(path))
-        {
-            ReportProgress("Skipping %s\n", path.c_str());
-            continue;
-        }
-        ReportProgress("Verifying %s\n", path.c_str());
-        rapidjson::Document document;
-        if (!RapidJsonIoUtil::TryGetJsonDocFromFile(path.c_str(), document))
+        const ModulePath directory(rootDocPath + "/en", set.id);
+        if (!Verify(directory.PathOf(Input::Toc)) || !Verify(directory.PathOf(Input::Index)))
         {
             return false;
         }

@@ -9,27 +9,12 @@ namespace
 
 using rapidjson::Value;
 
-/// Returns what should be there and what is: "\"pages\" is missing", "\"pages\" is 7, not an array".
-std::string DescribeMember(const char* name, const char* kind, const Value& value, bool isMissing,
-                           std::size_t quoteSize)
-{
-    const std::string member = std::string("\"") + name + "\"";
-    return isMissing ? member + " is missing; it must be " + kind
-                     : member + " is " + DescribeValue(value, quoteSize) + ", not " + kind;
-}
-
 /// Returns "but there are 3 pages" or "but there is 1 page" for the entries of an array of the document,
 /// which must be one: otherwise no number is out of its bounds.
 std::string CountEntries(const Value& document, const char* member, const std::string& noun)
 {
     const rapidjson::SizeType count = FindMember(document, member)->Size();
-    return count == 1 ? "but there is 1 " + noun
-                      : "but there are " + std::to_string(count) + " " + noun + "s";
-}
-
-std::string DescribePair(const char* kind, const char* form, const Value& value, std::size_t quoteSize)
-{
-    return std::string(kind) + " entry is " + DescribeValue(value, quoteSize) + ", not " + form;
+    return (count == 1 ? "but there is " : "but there are ") + Counted(count, noun);
 }
 
 /// Returns the value whose type is wrong in a pair of strings.
@@ -59,66 +44,58 @@ std::string DescribeValue(const Value& value, std::size_t quoteSize)
     return text.GetString();
 }
 
-std::string DescribeIndexFault(const StructureFault& fault, const JsonPointer& pointer, const Value& value,
-                               const Value& document, std::size_t quoteSize)
+std::string DescribeFault(const FoundFault& found, const Value& document, std::size_t quoteSize)
 {
-    const bool isMissing = pointer.Text().empty();
-    switch (fault.number)
+    const Value& value = found.place;
+    const auto show = [&](const Value& part) { return DescribeValue(part, quoteSize); };
+    const auto member = [&](const std::string& name, const std::string& kind)
     {
-    case 290:
-        return DescribeMember("pages", "an array", value, isMissing, quoteSize);
-    case 296:
-        return DescribeMember("info", "an array", value, isMissing, quoteSize);
-    case 302:
-        return DescribeMember("common", "an object", value, isMissing, quoteSize);
-    case 308:
-        return DescribeMember("searchIndex", "an object", value, isMissing, quoteSize);
-    case 318:
-        return DescribePair("page", "[path, title]", value, quoteSize);
-    case 327:
-        return "page path or title is " + DescribeValue(FirstNonString(value), quoteSize) + ", not a string";
-    case 340:
-        return DescribePair("info", "[text, page number]", value, quoteSize);
-    case 345:
-        return "text is " + DescribeValue(value[0], quoteSize) + ", not a string";
-    case 350:
-        return "page number is " + DescribeValue(value[1], quoteSize) + ", not a 32-bit integer";
-    case 356:
-        return "page number " + DescribeValue(value[1], quoteSize) + ", " +
-               CountEntries(document, "pages", "page");
-    case 371:
-        return "common word has the value " + DescribeValue(value, quoteSize) + ", not 1";
-    case 387:
-        return "term has " + DescribeValue(value, quoteSize) + ", not an array of info numbers";
-    case 396:
-        return "info number is " + DescribeValue(value, quoteSize) + ", not a 32-bit integer";
-    case 401:
-        return "info number " + DescribeValue(value, quoteSize) + ", " +
-               CountEntries(document, "info", "info");
-    default:
-        return "the document is " + DescribeValue(value, quoteSize) + ", not an object";
-    }
-}
-
-std::string DescribeTocFault(const StructureFault& fault, const JsonPointer& pointer, const Value& value,
-                             std::size_t quoteSize)
-{
-    const std::string name = pointer.Text();
-    const auto lacks = [&](const char* member)
-    {
-        const std::string suffix = std::string("/") + member;
-        return name.size() < suffix.size() ||
-               name.compare(name.size() - suffix.size(), suffix.size(), suffix) != 0;
+        return found.value == nullptr ? "\"" + name + "\" is missing; it must be " + kind
+                                      : "\"" + name + "\" is " + show(value) + ", not " + kind;
     };
-    switch (fault.number)
+    switch (found.fault)
     {
-    case 372:
-        return value.IsObject() || !lacks("title")
-                   ? DescribeMember("title", "a string", value, lacks("title"), quoteSize)
-                   : "node is " + DescribeValue(value, quoteSize) + ", not an object";
-    case 377:
-        return DescribeMember("link", "a string", value, lacks("link"), quoteSize);
-    default:
-        return DescribeMember("children", "an array or null", value, lacks("children"), quoteSize);
+    case StructureFault::PagesNotArray:
+        return member("pages", "an array");
+    case StructureFault::InfoNotArray:
+        return member("info", "an array");
+    case StructureFault::CommonNotObject:
+        return member("common", "an object");
+    case StructureFault::SearchIndexNotObject:
+        return member("searchIndex", "an object");
+    case StructureFault::PageNotPair:
+        return "page entry is " + show(value) + ", not [path, title]";
+    case StructureFault::PageNotStrings:
+        return "page path or title is " + show(FirstNonString(value)) + ", not a string";
+    case StructureFault::InfoNotPair:
+        return "info entry is " + show(value) + ", not [text, page number]";
+    case StructureFault::InfoTextNotString:
+        return "text is " + show(value[0]) + ", not a string";
+    case StructureFault::InfoPageNotInt:
+        return "page number is " + show(value[1]) + ", not a 32-bit integer";
+    case StructureFault::InfoPageOutOfBounds:
+        return "page number " + show(value[1]) + ", " + CountEntries(document, "pages", "page");
+    case StructureFault::CommonValueNotOne:
+        return "common word has the value " + show(value) + ", not 1";
+    case StructureFault::TermNotArray:
+        return "term has " + show(value) + ", not an array of info numbers";
+    case StructureFault::PostingNotInt:
+        return "info number is " + show(value) + ", not a 32-bit integer";
+    case StructureFault::PostingOutOfBounds:
+        return "info number " + show(value) + ", " + CountEntries(document, "info", "info");
+    case StructureFault::NodeNotAnObject:
+        return "node is " + show(value) + ", not an object";
+    case StructureFault::TitleNotString:
+        return member("title", "a string");
+    case StructureFault::LinkNotString:
+        return member("link", "a string");
+    case StructureFault::ChildrenNotList:
+        return member("children", "an array or null");
+    case StructureFault::CommonKeyNotString: // these two can't be in parsed text
+    case StructureFault::TermNotString:
+    case StructureFault::NotAnObject:
+    case StructureFault::Count:
+        break;
     }
+    return "the document is " + show(value) + ", not an object";
 }

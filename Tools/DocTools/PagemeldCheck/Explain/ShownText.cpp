@@ -168,3 +168,13 @@ std::string NameOfRoot(std::string_view root)
     const std::string_view path = root.substr(0, last + 1);
     return std::string(path.substr(path.rfind('/') + 1));
 }
+
+std::string Counted(std::size_t count, const std::string& noun)
+{
+    return std::to_string(count) + " " + noun + (count == 1 ? "" : "s");
+}
+
+void AppendListed(std::string& list, const std::string& item)
+{
+    list += (list.empty() ? "" : ", ") + item;
+}

@@ -7,15 +7,13 @@
 // Texts of input files and names on disk come from strangers. They are shown so that they can neither change
 // the terminal nor pass for something else.
 
-/// The length at which long texts are cut in the lines for people.
-constexpr std::size_t kLongText = 80;
-
 /// Returns the position of the first byte that is not UTF-8, or npos. Surrogates and
 /// overlong forms don't count as UTF-8.
 std::size_t FindInvalidUtf8(std::string_view text);
 
 /// Returns text with control characters, marks that reverse the direction of text and bytes that are not
-/// UTF-8 as escapes: "\n", "\x1B", "\xE9", "\u202E". All else stays as it is.
+/// UTF-8 as escapes: "\n", "\x1B", "\xE9", "\u202E". So are line and paragraph separators and byte order
+/// marks.
 std::string Visible(std::string_view text);
 
 /// Returns text in double quotes, visible and with a backslash before quotes and backslashes. One of more
@@ -24,3 +22,9 @@ std::string Quoted(std::string_view text, std::size_t maxBytes);
 
 /// Returns the path without the slashes at its end and all before its last name: "docs/charts/" is "charts".
 std::string NameOfRoot(std::string_view root);
+
+/// Returns a number and a noun: "1 page", "3 pages".
+std::string Counted(std::size_t count, const std::string& noun);
+
+/// Appends an item to a list with commas between the items.
+void AppendListed(std::string& list, const std::string& item);

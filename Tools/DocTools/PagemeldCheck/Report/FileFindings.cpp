@@ -1,6 +1,6 @@
 #include "Tools/DocTools/PagemeldCheck/Report/FileFindings.h"
 
-void FileFindings::AddAtOffset(const char* rule, std::size_t offset, std::string message)
+void FileFindings::AddAtOffset(Rule rule, std::size_t offset, std::string message)
 {
     if (Item* item = AddItem(rule))
     {
@@ -21,13 +21,14 @@ void FileFindings::HandTo(Report& report, const char* text, const rapidjson::Val
     m_counts.clear();
 }
 
-FileFindings::Item* FileFindings::AddItem(const char* rule)
+FileFindings::Item* FileFindings::AddItem(Rule rule)
 {
-    if (++m_counts[rule] > m_scope.limit && m_scope.limit != 0)
+    const std::size_t limit = m_scope.options.limit;
+    if (++m_counts[rule] > limit && limit != 0)
     {
         return nullptr;
     }
-    return &m_items.emplace_back(Item{{rule, m_scope.module, m_scope.set, m_scope.path, ""}});
+    return &m_items.emplace_back(Item{Finding::OfFile(rule, m_scope.file, "")});
 }
 
 void FileFindings::Locate(const char* text, const rapidjson::Value& document)
@@ -61,15 +62,15 @@ void FileFindings::Locate(const char* text, const rapidjson::Value& document)
 
 void FileFindings::AddCounts(Report& report) const
 {
-    for (const auto& [id, count] : m_counts)
+    const std::size_t limit = m_scope.options.limit;
+    for (const auto& [rule, count] : m_counts)
     {
-        if (m_scope.limit == 0 || count <= m_scope.limit)
+        if (limit != 0 && count > limit)
         {
-            continue;
+            const std::size_t hidden = count - limit;
+            report.Add(Finding::OfFile(rule, m_scope.file,
+                                       std::to_string(hidden) + " more of this rule; --limit=0 shows all"));
+            report.Count(rule, hidden - 1);
         }
-        const std::size_t hidden = count - m_scope.limit;
-        report.Add({id, m_scope.module, m_scope.set, m_scope.path,
-                    std::to_string(hidden) + " more of this rule; --limit=0 shows all"});
-        report.Count(RuleOf(id), hidden - 1);
     }
 }

@@ -1,38 +1,47 @@
 #pragma once
 
 #include "Tools/DocTools/PagemeldCheck/Explain/ValuePlaces.h"
+#include "Tools/DocTools/PagemeldCheck/FileScope.h"
 #include "Tools/DocTools/PagemeldCheck/Report/Rules.h"
 
-#include <iterator>
 #include <optional>
 #include <string>
-#include <string_view>
 #include <utility>
 #include <vector>
 
-/// The documentation sets, in the order in which they are combined.
-constexpr const char* kSetNames[] = {"Manual", "ScriptReference"};
-
-/// Something that a rule found. What does not apply is left empty.
+/// Something that a rule found, in visible text. What does not apply is left empty.
 struct Finding
 {
-    Finding(std::string_view ruleId, std::optional<std::size_t> ofModule, std::optional<std::size_t> ofSet,
-            std::string inFile, std::string text)
-        : rule(&RuleOf(ruleId)),
-          module(ofModule),
-          set(ofSet),
-          file(std::move(inFile)),
-          message(std::move(text))
+    /// Of the run as a whole; path is a directory.
+    static Finding OfRun(Rule rule, std::string path, std::string message)
     {
+        return {rule, std::nullopt, std::nullopt, std::move(path), std::move(message)};
     }
 
-    const Rule* rule;
+    /// Of the root at a position in the list of roots.
+    static Finding OfRoot(Rule rule, std::size_t module, std::string root, std::string message)
+    {
+        return {rule, module, std::nullopt, std::move(root), std::move(message)};
+    }
+
+    /// Of all modules' files of a set.
+    static Finding OfSet(Rule rule, DocSet set, std::string message)
+    {
+        return {rule, std::nullopt, set, "", std::move(message)};
+    }
+
+    static Finding OfFile(Rule rule, const ModuleFile& file, std::string message)
+    {
+        return {rule, file.module, file.set, file.path, std::move(message)};
+    }
+
+    Rule rule;
     std::optional<std::size_t> module; ///< its position in the list of roots
-    std::optional<std::size_t> set;    ///< its position in kSetNames
-    std::string file;                  ///< or directory, as pagemeld would name it
-    std::string message;               ///< visible text
-    std::optional<ValuePlace> place;
-    std::optional<std::string> pointer;
+    std::optional<DocSet> set;
+    std::string file; ///< or directory, as pagemeld would name it
+    std::string message;
+    std::optional<ValuePlace> place = std::nullopt;
+    std::optional<std::string> pointer = std::nullopt;
 };
 
 /// The roots of modules that are missing from the search and from the contents of a set.
@@ -47,7 +56,8 @@ struct Summary
 {
     std::size_t modules = 0;
     std::size_t findings[3] = {}; ///< by level
-    MissingModules missing[std::size(kSetNames)];
+    MissingModules missing[static_cast<std::size_t>(DocSet::Count)];
 
     [[nodiscard]] std::size_t CountOf(Level level) const { return findings[static_cast<std::size_t>(level)]; }
+    MissingModules& MissingOf(DocSet set) { return missing[static_cast<std::size_t>(set)]; }
 };

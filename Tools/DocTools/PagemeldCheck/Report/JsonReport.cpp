@@ -6,7 +6,6 @@
 #include <rapidjson/writer.h>
 
 #include <algorithm>
-#include <iterator>
 
 namespace
 {
@@ -15,7 +14,7 @@ namespace
 using JsonWriter = rapidjson::Writer<rapidjson::StringBuffer, rapidjson::UTF8<>, rapidjson::ASCII<>>;
 
 /// Writes a text that may hold bytes that are not UTF-8, which become escapes.
-void WriteText(JsonWriter& writer, const std::string& text)
+void WriteString(JsonWriter& writer, const std::string& text)
 {
     std::string valid;
     for (std::size_t start = 0; start < text.size();)
@@ -35,7 +34,7 @@ void WriteText(JsonWriter& writer, const std::string& text)
 void WriteMember(JsonWriter& writer, const char* name, const std::string& text)
 {
     writer.Key(name);
-    WriteText(writer, text);
+    WriteString(writer, text);
 }
 
 void WriteMember(JsonWriter& writer, const char* name, std::size_t number)
@@ -50,7 +49,7 @@ void WriteNames(JsonWriter& writer, const char* name, const std::vector<std::str
     writer.StartArray();
     for (const std::string& module : modules)
     {
-        WriteText(writer, module);
+        WriteString(writer, module);
     }
     writer.EndArray();
 }
@@ -59,11 +58,12 @@ void WriteNames(JsonWriter& writer, const char* name, const std::vector<std::str
 
 std::string JsonLine(const Finding& finding, const std::vector<std::string>& roots)
 {
+    const RuleRow& rule = RowOf(finding.rule);
     rapidjson::StringBuffer buffer;
     JsonWriter writer(buffer);
     writer.StartObject();
-    WriteMember(writer, "level", NameOf(finding.rule->level));
-    WriteMember(writer, "rule", finding.rule->id);
+    WriteMember(writer, "level", NameOf(rule.level));
+    WriteMember(writer, "rule", rule.name);
     if (!finding.file.empty())
     {
         WriteMember(writer, "file", finding.file);
@@ -84,7 +84,7 @@ std::string JsonLine(const Finding& finding, const std::vector<std::string>& roo
     }
     if (finding.set)
     {
-        WriteMember(writer, "set", kSetNames[*finding.set]);
+        WriteMember(writer, "set", NameOf(*finding.set));
     }
     WriteMember(writer, "message", finding.message);
     writer.EndObject();
@@ -104,12 +104,13 @@ std::string JsonSummary(const Summary& summary)
     WriteMember(writer, "notes", summary.CountOf(Level::Note));
     writer.Key("missing");
     writer.StartObject();
-    for (std::size_t set = 0; set < std::size(kSetNames); ++set)
+    for (const auto& set : kDocSets)
     {
-        writer.Key(kSetNames[set]);
+        const auto& [search, contents] = summary.missing[static_cast<std::size_t>(set.id)];
+        writer.Key(set.name);
         writer.StartObject();
-        WriteNames(writer, "search", summary.missing[set].search);
-        WriteNames(writer, "contents", summary.missing[set].contents);
+        WriteNames(writer, "search", search);
+        WriteNames(writer, "contents", contents);
         writer.EndObject();
     }
     writer.EndObject();

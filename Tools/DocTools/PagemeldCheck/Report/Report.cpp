@@ -10,10 +10,12 @@
 namespace
 {
 
-/// Findings without a module come last, those without a set before the sets, a count after what it counts.
+/// Within a module, findings without a set come before the sets; those without a module come last. The count
+/// of findings that are not shown has no place, and comes after those that are.
 auto OrderOf(const Finding& finding)
 {
-    return std::make_tuple(finding.module.value_or(SIZE_MAX), finding.set ? *finding.set + 1 : 0,
+    return std::make_tuple(finding.module.value_or(SIZE_MAX),
+                           finding.set ? static_cast<int>(*finding.set) + 1 : 0,
                            std::string_view(finding.file), finding.place ? finding.place->offset : SIZE_MAX);
 }
 
@@ -21,13 +23,13 @@ auto OrderOf(const Finding& finding)
 
 void Report::Add(Finding finding)
 {
-    Count(*finding.rule, 1);
+    Count(finding.rule, 1);
     m_findings.push_back(std::move(finding));
 }
 
-void Report::Count(const Rule& rule, std::size_t findings)
+void Report::Count(Rule rule, std::size_t findings)
 {
-    m_summary.findings[static_cast<std::size_t>(rule.level)] += findings;
+    m_summary.findings[static_cast<std::size_t>(RowOf(rule).level)] += findings;
 }
 
 void Report::Print(std::FILE* stream, const ReportForm& form, const std::vector<std::string>& roots)
@@ -39,7 +41,7 @@ void Report::Print(std::FILE* stream, const ReportForm& form, const std::vector<
                                                        : Level::Error;
     for (const Finding& finding : m_findings)
     {
-        if (finding.rule->level <= lowest)
+        if (RowOf(finding.rule).level <= lowest)
         {
             const std::string line =
                 form.isJson ? JsonLine(finding, roots) : TextLine(finding, form.isColored);

@@ -9,10 +9,10 @@
 /// How findings are printed.
 struct ReportForm
 {
-    bool isJson;
-    bool showsErrorsOnly;
-    bool isColored;
-    bool countsWarningsAsErrors;
+    bool isJson = false;
+    bool showsErrorsOnly = false;
+    bool isColored = false;
+    bool countsWarningsAsErrors = false;
 };
 
 /// Collects findings, and prints them in order: by module, set, file and place.
@@ -22,9 +22,9 @@ public:
     void Add(Finding finding);
 
     /// Counts findings that are not shown one by one.
-    void Count(const Rule& rule, std::size_t findings);
+    void Count(Rule rule, std::size_t findings);
 
-    MissingModules& MissingOf(std::size_t set) { return m_summary.missing[set]; }
+    MissingModules& MissingOf(DocSet set) { return m_summary.MissingOf(set); }
 
     /// Prints all findings and the summary. roots are the modules as typed.
     void Print(std::FILE* stream, const ReportForm& form, const std::vector<std::string>& roots);

@@ -1,112 +1,123 @@
 #include "Tools/DocTools/PagemeldCheck/Report/Rules.h"
 
+#include "Tools/DocTools/VantorPagemeld/System/EnumTable.h"
+
 #include <algorithm>
 #include <iterator>
 
 namespace
 {
 
-constexpr Rule kRules[] = {
-    {"no-modules", Level::Error, "--discover found no module, or none of the roots is one",
+constexpr RuleRow kRules[] = {
+    {Rule::NoModules, "no-modules", Level::Error, "--discover found no module, or none of the roots is one",
      "Nothing is combined; earlier outputs stay, and the run ends with status 0.",
      "A module is the directory above Manual/docdata and ScriptReference/docdata. Give the modules, or with "
      "--discover a directory above them."},
-    {"duplicate-root", Level::Error, "two roots are the same directory",
+    {Rule::DuplicateRoot, "duplicate-root", Level::Error, "two roots are the same directory",
      "The module's pages are in the search twice, and its links in the contents may be those of "
      "either name.",
      "Give each module once."},
-    {"passed-over", Level::Warning, "a directory looks like a module, but --discover does not take it",
+    {Rule::PassedOver, "passed-over", Level::Warning,
+     "a directory looks like a module, but --discover does not take it",
      "The module is missing from search and contents, and receives no outputs.",
      "Rename it if its name begins with a dot, replace a link by the directory, add Manual/docdata, or "
      "give the roots by name."},
-    {"output-blocked", Level::Error, "an output can't be written",
+    {Rule::OutputBlocked, "output-blocked", Level::Error, "an output can't be written",
      "For global_index.js the run ends there with status 255, and later modules stay unwritten; any "
      "other output stays as it was.",
      "Create the docdata directory, make it writable, and remove what is in the way of the output or of "
      "its temporary file."},
-    {"wrong-link-path", Level::Error, "links from one module to another lead to the wrong place",
+    {Rule::WrongLinkPath, "wrong-link-path", Level::Error,
+     "links from one module to another lead to the wrong place",
      "The links are dead, or lead to another module. Prefixes are computed on the paths as typed.",
      "Rename a module whose name begins with another's, give absolute roots, put no slash at their end, "
      "and keep quotes, backslashes and line breaks out of their names."},
-    {"unreadable", Level::Error, "one of the two files of a set is missing, or can't be read",
+    {Rule::Unreadable, "unreadable", Level::Error,
+     "one of the two files of a set is missing, or can't be read",
      "The module is missing from the search (index.json) or from the contents (toc.json).",
      "Create the file or make it readable."},
-    {"set-empty", Level::Note, "a module has the docdata directory of a set, but neither file",
+    {Rule::SetEmpty, "set-empty", Level::Note,
+     "a module has the docdata directory of a set, but neither file",
      "The module adds nothing to the set; it receives the outputs.",
      "Nothing needs to be done if the module has no such documentation."},
-    {"nothing-to-combine", Level::Error,
+    {Rule::NothingToCombine, "nothing-to-combine", Level::Error,
      "no module of the set has a sound index, or no module has sound contents",
      "Nothing is written for the set, and earlier outputs stay.",
      "Fix at least one index.json and one toc.json of the set."},
-    {"not-json", Level::Error, "a file is not JSON, or exceeds a limit of the reader",
+    {Rule::NotJson, "not-json", Level::Error, "a file is not JSON, or exceeds a limit of the reader",
      "The module is missing from the search (index.json) or from the contents (toc.json).",
      "Fix the text at the place shown; write the file with a JSON library."},
-    {"structure", Level::Error, "a file breaks its format",
+    {Rule::Structure, "structure", Level::Error, "a file breaks its format",
      "The module is missing from the search (index.json) or from the contents (toc.json); the run names "
      "the first such fault only.",
      "Fix every entry shown; docs/FORMATS.md has the formats."},
-    {"merged-input", Level::Error, "an input is an output of an earlier run",
+    {Rule::MergedInput, "merged-input", Level::Error, "an input is an output of an earlier run",
      "An index.json is refused, and the module is missing from the search. A sound toc.json is taken, "
      "and its links lead to other modules than they should.",
      "Put the module's own file in its place."},
-    {"root-differs", Level::Error, "the root of a toc.json differs from that of the first module",
+    {Rule::RootDiffers, "root-differs", Level::Error,
+     "the root of a toc.json differs from that of the first module",
      "The module is missing from the contents, without a message.",
      "Give the roots of all modules the same link and title."},
-    {"script-broken", Level::Error, "a title, page path or link is not a complete string in the scripts",
+    {Rule::ScriptBroken, "script-broken", Level::Error,
+     "a title, page path or link is not a complete string in the scripts",
      "The script is a syntax error in every module: nobody can search, or nobody sees the contents.",
      "Replace the backslash, quote or line break by another character."},
-    {"script-altered", Level::Warning, "a title, page path or link has another value in the scripts",
+    {Rule::ScriptAltered, "script-altered", Level::Warning,
+     "a title, page path or link has another value in the scripts",
      "Readers see another title, or the link is dead.",
      "Replace the backslash by another character, and remove NUL characters."},
-    {"prefixed-url", Level::Warning, "a page path or link is an absolute URL (https://...)",
+    {Rule::PrefixedUrl, "prefixed-url", Level::Warning,
+     "a page path or link is an absolute URL (https://...)",
      "The module's prefix is put before it, so the link is dead unless the page script removes it.",
      "Link to a page of the module, or use the page script."},
-    {"special-term", Level::Warning, "__proto__ is a term or common word",
+    {Rule::SpecialTerm, "special-term", Level::Warning, "__proto__ is a term or common word",
      "In the scripts it sets the prototype of the object instead of a member: it is not found.",
      "Leave it out, or use global_index.json."},
-    {"invalid-utf8", Level::Warning, "a file is not UTF-8",
+    {Rule::InvalidUtf8, "invalid-utf8", Level::Warning, "a file is not UTF-8",
      "Readers see replacement characters, and can't search for the words.", "Save the file as UTF-8."},
-    {"text-after-nul", Level::Warning, "bytes after a NUL byte are not seen",
+    {Rule::TextAfterNul, "text-after-nul", Level::Warning, "bytes after a NUL byte are not seen",
      "What follows is missing without a message.", "Remove the NUL byte; a file in UTF-16 has many."},
-    {"common-ignored", Level::Note, "modules of a set have different common words",
+    {Rule::CommonIgnored, "common-ignored", Level::Note, "modules of a set have different common words",
      "Those of the first module that has any count for all; the others' are ignored.",
      "Use one list for all modules."},
-    {"missing-target", Level::Warning, "--targets: a page path or link leads to no file", "The link is dead.",
-     "Fix the path; it is relative to the set's directory."},
-    {"output-missing", Level::Error, "--outputs: an output is not there",
+    {Rule::MissingTarget, "missing-target", Level::Warning, "--targets: a page path or link leads to no file",
+     "The link is dead.", "Fix the path; it is relative to the set's directory."},
+    {Rule::OutputMissing, "output-missing", Level::Error, "--outputs: an output is not there",
      "Readers of the module can't search, or see no contents.", "Run pagemeld, and read its messages."},
-    {"output-broken", Level::Error, "--outputs: an output is cut short or not JSON",
+    {Rule::OutputBroken, "output-broken", Level::Error, "--outputs: an output is cut short or not JSON",
      "Readers of the module can't search, or see no contents.",
      "Free space on the disk and run pagemeld again."},
-    {"output-differs", Level::Error, "--outputs: an output has other content than in the first module",
+    {Rule::OutputDiffers, "output-differs", Level::Error,
+     "--outputs: an output has other content than in the first module",
      "Readers of different modules find different things: a run ended early.",
      "Run pagemeld again, and look at its exit status."},
-    {"output-stale", Level::Error, "--outputs: an output is older than an input of the set",
-     "Readers see the result of an earlier build.", "Run pagemeld again."},
-    {"leftover", Level::Error, "--outputs: a temporary file is left over",
+    {Rule::OutputStale, "output-stale", Level::Error,
+     "--outputs: an output is older than an input of the set", "Readers see the result of an earlier build.",
+     "Run pagemeld again."},
+    {Rule::Leftover, "leftover", Level::Error, "--outputs: a temporary file is left over",
      "A run was ended, or could not rename the file: the output beside it may be old.",
      "Run pagemeld again; remove a directory that has the output's name."},
 };
+static_assert(HasRowOfEach(kRules));
 
 } // namespace
 
-const std::vector<Rule>& AllRules()
+const RuleTable& AllRules()
 {
-    static const std::vector<Rule> rules(std::begin(kRules), std::end(kRules));
-    return rules;
+    return kRules;
 }
 
-const Rule* FindRule(std::string_view id)
+const RuleRow& RowOf(Rule rule)
 {
-    const std::vector<Rule>& rules = AllRules();
-    const auto found =
-        std::find_if(rules.begin(), rules.end(), [&](const Rule& rule) { return id == rule.id; });
-    return found == rules.end() ? nullptr : &*found;
+    return RowOf(kRules, rule);
 }
 
-const Rule& RuleOf(std::string_view id)
+const RuleRow* FindRule(std::string_view name)
 {
-    return *FindRule(id);
+    const auto* const found = std::find_if(std::begin(kRules), std::end(kRules),
+                                           [&](const RuleRow& rule) { return name == rule.name; });
+    return found == std::end(kRules) ? nullptr : found;
 }
 
 const char* NameOf(Level level)

@@ -1,8 +1,7 @@
 #pragma once
 
-#include <string>
+#include <cstddef>
 #include <string_view>
-#include <vector>
 
 /// How much a finding matters.
 enum class Level
@@ -12,24 +11,57 @@ enum class Level
     Note,
 };
 
-/// One thing that the checker looks for. The texts are shown by --help and --explain and in docs/RULES.md.
-struct Rule
+/// One thing that the checker looks for.
+enum class Rule
 {
-    const char* id;
+    NoModules,
+    DuplicateRoot,
+    PassedOver,
+    OutputBlocked,
+    WrongLinkPath,
+    Unreadable,
+    SetEmpty,
+    NothingToCombine,
+    NotJson,
+    Structure,
+    MergedInput,
+    RootDiffers,
+    ScriptBroken,
+    ScriptAltered,
+    PrefixedUrl,
+    SpecialTerm,
+    InvalidUtf8,
+    TextAfterNul,
+    CommonIgnored,
+    MissingTarget,
+    OutputMissing,
+    OutputBroken,
+    OutputDiffers,
+    OutputStale,
+    Leftover,
+    Count,
+};
+
+/// What is said of a rule. The texts are shown by --help and --explain and in docs/RULES.md.
+struct RuleRow
+{
+    Rule id;
+    const char* name;
     Level level;
     const char* meaning;     ///< one line: when it holds
     const char* consequence; ///< what it does to readers or to the run
     const char* remedy;      ///< how to fix it
 };
 
+using RuleTable = RuleRow[static_cast<std::size_t>(Rule::Count)];
+
 /// All rules, in the order in which they are shown.
-const std::vector<Rule>& AllRules();
+const RuleTable& AllRules();
 
-/// Returns the rule with that id. There must be one.
-const Rule& RuleOf(std::string_view id);
+const RuleRow& RowOf(Rule rule);
 
-/// Returns the rule with that id, or null.
-const Rule* FindRule(std::string_view id);
+/// Returns the rule of that name, or null.
+const RuleRow* FindRule(std::string_view name);
 
 /// Returns "error", "warning" or "note".
 const char* NameOf(Level level);

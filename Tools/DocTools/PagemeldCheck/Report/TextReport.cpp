@@ -2,8 +2,6 @@
 
 #include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 
-#include <iterator>
-
 namespace
 {
 
@@ -28,35 +26,30 @@ std::string ShownPointer(const std::string& pointer)
     return pointer.size() > kLongPointer ? shown + "..." : shown;
 }
 
-/// Returns the names of modules with commas between them.
-std::string Joined(const std::vector<std::string>& roots)
+std::string NamesOf(const std::vector<std::string>& roots)
 {
-    std::string text;
-    for (const std::string& name : roots)
+    std::string names;
+    for (const std::string& root : roots)
     {
-        text += (text.empty() ? "" : ", ") + Visible(NameOfRoot(name));
+        AppendListed(names, Visible(NameOfRoot(root)));
     }
-    return text;
-}
-
-std::string Counted(std::size_t count, const char* noun)
-{
-    return std::to_string(count) + " " + noun + (count == 1 ? "" : "s");
+    return names;
 }
 
 } // namespace
 
 std::string TextLine(const Finding& finding, bool isColored)
 {
-    std::string line = finding.file.empty() && finding.set ? kSetNames[*finding.set] : Visible(finding.file);
+    std::string line = finding.file.empty() && finding.set ? NameOf(*finding.set) : Visible(finding.file);
     if (finding.place)
     {
         line += ":" + std::to_string(finding.place->line) + ":" + std::to_string(finding.place->column);
     }
-    const std::string level = NameOf(finding.rule->level);
+    const RuleRow& rule = RowOf(finding.rule);
+    const std::string level = NameOf(rule.level);
     line += line.empty() ? "" : ": ";
-    line += isColored ? ColorOf(finding.rule->level) + level + ":\033[0m " : level + ": ";
-    line += finding.message + " [" + finding.rule->id + "]";
+    line += isColored ? ColorOf(rule.level) + level + ":\033[0m " : level + ": ";
+    line += finding.message + " [" + rule.name + "]";
     return line + ShownPointer(finding.pointer.value_or(""));
 }
 
@@ -66,19 +59,19 @@ std::string TextSummary(const Summary& summary)
                          Counted(summary.CountOf(Level::Error), "error") + ", " +
                          Counted(summary.CountOf(Level::Warning), "warning");
     std::string missing;
-    for (std::size_t set = 0; set < std::size(kSetNames); ++set)
+    for (const auto& set : kDocSets)
     {
-        const auto& [search, contents] = summary.missing[set];
-        const std::string setName = kSetNames[set];
+        const auto& [search, contents] = summary.missing[static_cast<std::size_t>(set.id)];
+        const std::string setName = set.name;
         if (!search.empty())
         {
             missing += (missing.empty() ? "; missing from the search of " : "; from the search of ") +
-                       setName + ": " + Joined(search);
+                       setName + ": " + NamesOf(search);
         }
         if (!contents.empty())
         {
             const std::string of = search.empty() ? "the contents of " + setName : "its contents";
-            missing += (missing.empty() ? "; missing from " : "; from ") + of + ": " + Joined(contents);
+            missing += (missing.empty() ? "; missing from " : "; from ") + of + ": " + NamesOf(contents);
         }
     }
     return counts + missing;

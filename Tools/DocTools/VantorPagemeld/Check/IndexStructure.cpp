@@ -3,35 +3,12 @@
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 
 #include <cstdint>
-#include <optional>
-#include <utility>
 
 namespace
 {
 
 using rapidjson::SizeType;
 using rapidjson::Value;
-
-// Deliberately reported without a message.
-constexpr StructureFault kNotAnObject = {0, nullptr};
-
-constexpr StructureFault kPagesNotArray = {290, "Pages is not an array or absent"};
-constexpr StructureFault kInfoNotArray = {296, "Info is not an array or absent"};
-constexpr StructureFault kCommonNotObject = {302, "Common is not an object or absent"};
-constexpr StructureFault kSearchIndexNotObject = {308, "SearchIndex is not an object or absent"};
-constexpr StructureFault kPageNotPair = {318, "Content in pages is not an array of 2 elements"};
-constexpr StructureFault kPageNotStrings = {327, "Content in pages sub-element is not a string"};
-constexpr StructureFault kInfoNotPair = {340, "Content in info is not an array of 2 elements"};
-constexpr StructureFault kInfoTextNotString = {345, "1st item in info sub-element is not a string"};
-constexpr StructureFault kInfoPageNotInt = {350, "2nd item in info sub-element is not an int"};
-constexpr StructureFault kInfoPageOutOfBounds = {356, "2nd item in info sub-element is out of bounds"};
-// Keys of parsed text are strings: 366 and 382 can only occur in a document that was made by hand.
-constexpr StructureFault kCommonKeyNotString = {366, "Key in common is not a string"};
-constexpr StructureFault kCommonValueNotOne = {371, "Value in common is not an int(1)"};
-constexpr StructureFault kTermNotString = {382, "Key in searchIndex is not string"};
-constexpr StructureFault kTermNotArray = {387, "Value in searchIndex is not array"};
-constexpr StructureFault kPostingNotInt = {396, "Value in index is not int"};
-constexpr StructureFault kPostingOutOfBounds = {401, "Value in index is out of bounds"};
 
 /// The size that a missing array is given, so that numbers that refer to it are not reported as well.
 constexpr std::int64_t kUnbounded = INT64_MAX;
@@ -51,11 +28,11 @@ std::optional<StructureFault> FindPageFault(const Value& page)
 {
     if (!IsPair(page))
     {
-        return kPageNotPair;
+        return StructureFault::PageNotPair;
     }
     if (!page[0].IsString() || !page[1].IsString())
     {
-        return kPageNotStrings;
+        return StructureFault::PageNotStrings;
     }
     return std::nullopt;
 }
@@ -64,32 +41,34 @@ std::optional<StructureFault> FindInfoFault(const Value& entry, std::int64_t pag
 {
     if (!IsPair(entry))
     {
-        return kInfoNotPair;
+        return StructureFault::InfoNotPair;
     }
     if (!entry[0].IsString())
     {
-        return kInfoTextNotString;
+        return StructureFault::InfoTextNotString;
     }
     if (!entry[1].IsInt())
     {
-        return kInfoPageNotInt;
+        return StructureFault::InfoPageNotInt;
     }
     if (!IsBelow(entry[1], pageCount))
     {
-        return kInfoPageOutOfBounds;
+        return StructureFault::InfoPageOutOfBounds;
     }
     return std::nullopt;
 }
+
+// Keys of parsed text are strings: other keys can only occur in a document that was made by hand.
 
 std::optional<StructureFault> FindCommonFault(const Value::Member& word)
 {
     if (!word.name.IsString())
     {
-        return kCommonKeyNotString;
+        return StructureFault::CommonKeyNotString;
     }
     if (!word.value.IsInt() || word.value.GetInt() != 1)
     {
-        return kCommonValueNotOne;
+        return StructureFault::CommonValueNotOne;
     }
     return std::nullopt;
 }
@@ -98,11 +77,11 @@ std::optional<StructureFault> FindTermFault(const Value::Member& term)
 {
     if (!term.name.IsString())
     {
-        return kTermNotString;
+        return StructureFault::TermNotString;
     }
     if (!term.value.IsArray())
     {
-        return kTermNotArray;
+        return StructureFault::TermNotArray;
     }
     return std::nullopt;
 }
@@ -111,11 +90,11 @@ std::optional<StructureFault> FindPostingFault(const Value& posting, std::int64_
 {
     if (!posting.IsInt())
     {
-        return kPostingNotInt;
+        return StructureFault::PostingNotInt;
     }
     if (!IsBelow(posting, infoCount))
     {
-        return kPostingOutOfBounds;
+        return StructureFault::PostingOutOfBounds;
     }
     return std::nullopt;
 }
@@ -124,8 +103,7 @@ bool CheckPages(const Value& pages, const JsonPointer& pointer, const FaultHandl
 {
     for (SizeType i = 0; i < pages.Size(); ++i)
     {
-        const auto fault = FindPageFault(pages[i]);
-        if (fault && !onFault(*fault, {pointer, i}, pages[i]))
+        if (!HandOver(FindPageFault(pages[i]), {pointer, i}, pages[i], onFault))
         {
             return false;
         }
@@ -138,8 +116,7 @@ bool CheckInfo(const Value& info, std::int64_t pageCount, const JsonPointer& poi
 {
     for (SizeType i = 0; i < info.Size(); ++i)
     {
-        const auto fault = FindInfoFault(info[i], pageCount);
-        if (fault && !onFault(*fault, {pointer, i}, info[i]))
+        if (!HandOver(FindInfoFault(info[i], pageCount), {pointer, i}, info[i], onFault))
         {
             return false;
         }
@@ -151,8 +128,7 @@ bool CheckCommon(const Value& common, const JsonPointer& pointer, const FaultHan
 {
     for (const auto& word : common.GetObject())
     {
-        const auto fault = FindCommonFault(word);
-        if (fault && !onFault(*fault, {pointer, BytesOf(word.name)}, word.value))
+        if (!HandOver(FindCommonFault(word), {pointer, BytesOf(word.name)}, word.value, onFault))
         {
             return false;
         }
@@ -165,8 +141,7 @@ bool CheckPostings(const Value& postings, std::int64_t infoCount, const JsonPoin
 {
     for (SizeType i = 0; i < postings.Size(); ++i)
     {
-        const auto fault = FindPostingFault(postings[i], infoCount);
-        if (fault && !onFault(*fault, {pointer, i}, postings[i]))
+        if (!HandOver(FindPostingFault(postings[i], infoCount), {pointer, i}, postings[i], onFault))
         {
             return false;
         }
@@ -181,7 +156,7 @@ bool CheckSearchIndex(const Value& searchIndex, std::int64_t infoCount, const Js
     {
         const JsonPointer termPointer(pointer, BytesOf(term.name));
         const auto fault = FindTermFault(term);
-        if (fault ? !onFault(*fault, termPointer, term.value)
+        if (fault ? !HandOver(fault, termPointer, term.value, onFault)
                   : !CheckPostings(term.value, infoCount, termPointer, onFault))
         {
             return false;
@@ -197,21 +172,16 @@ std::int64_t CountOf(const Value* array)
 
 /// Looks for a member of a type. Sets found to it, or to null after handing over the fault. Returns whether
 /// to go on.
-bool RequireMember(const Value& document, const char* name, rapidjson::Type type,
-                   const StructureFault& notOfType, const FaultHandler& onFault, const Value*& found)
+bool RequireMember(const Value& document, const char* name, rapidjson::Type type, StructureFault notOfType,
+                   const FaultHandler& onFault, const Value*& found)
 {
-    const JsonPointer root;
     found = FindMember(document, name);
-    if (found == nullptr)
-    {
-        return onFault(notOfType, root, document);
-    }
-    if (found->GetType() == type)
+    if (found != nullptr && found->GetType() == type)
     {
         return true;
     }
-    const Value& mistyped = *std::exchange(found, nullptr);
-    return onFault(notOfType, {root, name}, mistyped);
+    found = nullptr;
+    return HandOverMember(notOfType, JsonPointer(), document, name, onFault);
 }
 
 } // namespace
@@ -221,17 +191,22 @@ bool CheckIndexStructure(const Value& document, const FaultHandler& onFault)
     const JsonPointer root;
     if (!document.IsObject())
     {
-        return onFault(kNotAnObject, root, document);
+        return HandOver(StructureFault::NotAnObject, root, document, onFault);
     }
     const Value* pages = nullptr;
     const Value* info = nullptr;
     const Value* common = nullptr;
     const Value* searchIndex = nullptr;
-    return RequireMember(document, "pages", rapidjson::kArrayType, kPagesNotArray, onFault, pages) &&
-           RequireMember(document, "info", rapidjson::kArrayType, kInfoNotArray, onFault, info) &&
-           RequireMember(document, "common", rapidjson::kObjectType, kCommonNotObject, onFault, common) &&
-           RequireMember(document, "searchIndex", rapidjson::kObjectType, kSearchIndexNotObject, onFault,
-                         searchIndex) &&
+    // Each step hands over its faults and says whether to go on. One that lacks its member has nothing to
+    // look at. The types of all members come before the content of any.
+    return RequireMember(document, "pages", rapidjson::kArrayType, StructureFault::PagesNotArray, onFault,
+                         pages) &&
+           RequireMember(document, "info", rapidjson::kArrayType, StructureFault::InfoNotArray, onFault,
+                         info) &&
+           RequireMember(document, "common", rapidjson::kObjectType, StructureFault::CommonNotObject, onFault,
+                         common) &&
+           RequireMember(document, "searchIndex", rapidjson::kObjectType,
+                         StructureFault::SearchIndexNotObject, onFault, searchIndex) &&
            (pages == nullptr || CheckPages(*pages, {root, "pages"}, onFault)) &&
            (info == nullptr || CheckInfo(*info, CountOf(pages), {root, "info"}, onFault)) &&
            (common == nullptr || CheckCommon(*common, {root, "common"}, onFault)) &&

@@ -3,6 +3,7 @@
 #include <rapidjson/document.h>
 
 #include <functional>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <variant>
@@ -10,13 +11,46 @@
 // What a structure check finds, and where.
 
 /// One way in which an input document breaks its format.
-struct StructureFault
+enum class StructureFault
 {
+    // Of an index.
+    NotAnObject,
+    PagesNotArray,
+    InfoNotArray,
+    CommonNotObject,
+    SearchIndexNotObject,
+    PageNotPair,
+    PageNotStrings,
+    InfoNotPair,
+    InfoTextNotString,
+    InfoPageNotInt,
+    InfoPageOutOfBounds,
+    CommonKeyNotString,
+    CommonValueNotOne,
+    TermNotString,
+    TermNotArray,
+    PostingNotInt,
+    PostingOutOfBounds,
+
+    // Of a node of a toc.
+    NodeNotAnObject,
+    TitleNotString,
+    LinkNotString,
+    ChildrenNotList,
+
+    Count,
+};
+
+struct StructureFaultRow
+{
+    StructureFault id;
     int number;       ///< the fixed number of its message
     const char* text; ///< its message without a line break; null for the fault that is reported without one
 };
 
-/// A JSON pointer (RFC 6901) to a value, as a step from the pointer to the value that holds it.
+const StructureFaultRow& RowOf(StructureFault fault);
+
+/// A JSON pointer (RFC 6901) to a value: its last step, and a link to the pointer to the value that holds it.
 ///
 /// A walk over a document keeps its pointers on the stack, so that they cost nothing until a fault asks for
 /// the text of one. Where an object holds a name twice, pointers to both members have the same text.
@@ -42,7 +76,25 @@ private:
     std::variant<std::string_view, rapidjson::SizeType> m_step;
 };
 
-/// Takes each fault that a structure check finds, in document order: with the faulty value, or the object
-/// that lacks a member, and the pointer to it. Returns whether to go on.
-using FaultHandler = std::function<bool(const StructureFault& fault, const JsonPointer& pointer,
-                                        const rapidjson::Value& value)>;
+/// A fault and where it was found.
+struct FoundFault
+{
+    StructureFault fault;
+    const JsonPointer& pointer;    ///< to place
+    const rapidjson::Value& place; ///< the faulty value, or the object that lacks a member
+    const rapidjson::Value* value; ///< the faulty value; null for a missing member
+};
+
+/// Takes each fault that a structure check finds, in document order. Returns whether to go on.
+using FaultHandler = std::function<bool(const FoundFault& found)>;
+
+/// Hands over the fault of a value, if it has one. Returns whether to go on.
+inline bool HandOver(std::optional<StructureFault> fault, const JsonPointer& pointer,
+                     const rapidjson::Value& value, const FaultHandler& onFault)
+{
+    return !fault || onFault({*fault, pointer, value, &value});
+}
+
+/// Hands over the fault of a member, or its absence from the object at pointer. Returns whether to go on.
+bool HandOverMember(StructureFault fault, const JsonPointer& pointer, const rapidjson::Value& object,
+                    const char* name, const FaultHandler& onFault);

@@ -7,25 +7,12 @@ namespace
 
 using rapidjson::Value;
 
-constexpr StructureFault kTitleNotString = {372, "Title is non-string or absent"};
-constexpr StructureFault kLinkNotString = {377, "Link is non-string or absent"};
-constexpr StructureFault kChildrenNotList = {382, "Children is not an array or null"};
-
-/// Hands over the fault of a member, at the member if the node has one of that name. Returns whether to go
-/// on.
-bool ReportMember(const Value& node, const JsonPointer& pointer, const char* name,
-                  const StructureFault& fault, const FaultHandler& onFault)
-{
-    const Value* const member = FindMember(node, name);
-    return member == nullptr ? onFault(fault, pointer, node) : onFault(fault, {pointer, name}, *member);
-}
-
 /// Returns whether to go on.
-bool RequireString(const Value& node, const JsonPointer& pointer, const char* name,
-                   const StructureFault& fault, const FaultHandler& onFault)
+bool RequireString(const Value& node, const JsonPointer& pointer, const char* name, StructureFault fault,
+                   const FaultHandler& onFault)
 {
     const Value* const member = FindMember(node, name);
-    return (member != nullptr && member->IsString()) || ReportMember(node, pointer, name, fault, onFault);
+    return (member != nullptr && member->IsString()) || HandOverMember(fault, pointer, node, name, onFault);
 }
 
 bool CheckChildren(const Value& children, const JsonPointer& pointer, const ChildCheck& checkChild)
@@ -54,17 +41,17 @@ bool CheckTocNode(const Value& node, const JsonPointer& pointer, const FaultHand
 {
     if (!node.IsObject())
     {
-        return onFault(kTitleNotString, pointer, node);
+        return HandOver(StructureFault::NodeNotAnObject, pointer, node, onFault);
     }
-    if (!RequireString(node, pointer, "title", kTitleNotString, onFault) ||
-        !RequireString(node, pointer, "link", kLinkNotString, onFault))
+    if (!RequireString(node, pointer, "title", StructureFault::TitleNotString, onFault) ||
+        !RequireString(node, pointer, "link", StructureFault::LinkNotString, onFault))
     {
         return false;
     }
     const Value* const children = FindMember(node, "children");
     if (children == nullptr || (!children->IsNull() && !children->IsArray()))
     {
-        return ReportMember(node, pointer, "children", kChildrenNotList, onFault);
+        return HandOverMember(StructureFault::ChildrenNotList, pointer, node, "children", onFault);
     }
     return children->IsNull() || CheckChildren(*children, {pointer, "children"}, checkChild);
 }

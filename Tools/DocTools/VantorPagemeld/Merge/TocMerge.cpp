@@ -3,8 +3,6 @@
 #include "Tools/DocTools/VantorPagemeld/Merge/SipHash.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 
-#include <cstring>
-
 using rapidjson::Value;
 
 namespace
@@ -17,24 +15,24 @@ const char* FindText(const Value& entry, const char* name)
     return text != nullptr && text->IsString() ? CStringOf(*text) : nullptr;
 }
 
-bool HaveSameText(const Value& a, const Value& b, const char* name)
+/// Returns nothing when the link or the title is missing or is not a string.
+std::optional<EntryKey> KeyOf(const Value& entry)
 {
-    const char* const text = FindText(a, name);
-    const char* const other = FindText(b, name);
-    return text != nullptr && other != nullptr && std::strcmp(text, other) == 0;
+    const char* const link = FindText(entry, "link");
+    const char* const title = FindText(entry, "title");
+    return link != nullptr && title != nullptr ? std::optional(EntryKey{link, title}) : std::nullopt;
 }
 
 /// Returns nothing for an entry without a link, a title or children: it is the same as no other.
 std::optional<std::uint64_t> HashOf(const Value& entry)
 {
-    const char* const link = FindText(entry, "link");
-    const char* const title = FindText(entry, "title");
-    if (link == nullptr || title == nullptr || FindMember(entry, "children") == nullptr)
+    const std::optional<EntryKey> key = KeyOf(entry);
+    if (!key || FindMember(entry, "children") == nullptr)
     {
         return std::nullopt;
     }
     // Without the factor, an entry would share its hash with one whose link and title are swapped.
-    return 31 * KeyedHash(link) + KeyedHash(title);
+    return 31 * KeyedHash(key->link) + KeyedHash(key->title);
 }
 
 /// Returns the children of the first entry of list that is the same as entry. If there is none, moves entry
@@ -61,7 +59,9 @@ Value* FindChildrenOrAppend(PositionTable& siblings, Value& list, Value& entry,
 
 bool HasSameLinkAndTitle(const Value& a, const Value& b)
 {
-    return HaveSameText(a, b, "link") && HaveSameText(a, b, "title");
+    const std::optional<EntryKey> key = KeyOf(a);
+    const std::optional<EntryKey> other = KeyOf(b);
+    return key && other && *key == *other;
 }
 
 void TocMerge::AppendValue(Value& destination, Value& source)

@@ -1,5 +1,6 @@
 #include "Tools/DocTools/VantorPagemeld/Read/InputFile.h"
 
+#include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
 #include "Tools/DocTools/VantorPagemeld/System/ScopedFile.h"
 
 #include <algorithm>
@@ -7,7 +8,6 @@
 #include <new>
 
 #include <fcntl.h>
-#include <sys/stat.h>
 #include <unistd.h>
 
 namespace
@@ -46,8 +46,8 @@ ScopedFile OpenForReading(const char* path)
 /// pipe. Leaves the stream at its start.
 std::int64_t SizeOf(std::FILE* file)
 {
-    struct stat status = {};
-    if (::fstat(::fileno(file), &status) != 0 || S_ISDIR(status.st_mode) || ::fseeko(file, 0, SEEK_END) != 0)
+    const FileStatus status = FileStatus::Of(file);
+    if (!status.Exists() || status.IsDirectory() || ::fseeko(file, 0, SEEK_END) != 0)
     {
         return -1;
     }

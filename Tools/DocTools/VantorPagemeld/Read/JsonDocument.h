@@ -4,6 +4,7 @@
 
 #include <array>
 #include <cstddef>
+#include <cstring>
 #include <string_view>
 #include <utility>
 
@@ -38,6 +39,18 @@ inline rapidjson::Value* FindMember(rapidjson::Value& object, const char* name)
 {
     return const_cast<rapidjson::Value*>(FindMember(static_cast<const rapidjson::Value&>(object), name));
 }
+
+/// What makes two entries of a table of contents one: equal links and equal titles, as NUL-terminated texts.
+struct EntryKey
+{
+    const char* link;
+    const char* title;
+
+    friend bool operator==(const EntryKey& a, const EntryKey& b)
+    {
+        return std::strcmp(a.link, b.link) == 0 && std::strcmp(a.title, b.title) == 0;
+    }
+};
 
 /// Returns all bytes of a JSON string, NUL included.
 inline std::string_view BytesOf(const rapidjson::Value& string)

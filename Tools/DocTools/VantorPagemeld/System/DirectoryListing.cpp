@@ -1,8 +1,8 @@
 #include "Tools/DocTools/VantorPagemeld/System/DirectoryListing.h"
 
-#include <cstdlib>
+#include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
 
-#include <sys/stat.h>
+#include <cstdlib>
 
 SortedListing::SortedListing(const char* directory)
     : m_count(::scandir(directory, &m_entries, nullptr, ::alphasort))
@@ -18,7 +18,7 @@ SortedListing::~SortedListing()
     std::free(m_entries);
 }
 
-bool IsDirectory([[maybe_unused]] const dirent& entry, const std::string& path)
+bool IsDirectoryItself([[maybe_unused]] const dirent& entry, const std::string& path)
 {
 #ifdef PAGEMELD_HAVE_DIRENT_TYPE
     if (entry.d_type != DT_UNKNOWN)
@@ -26,6 +26,5 @@ bool IsDirectory([[maybe_unused]] const dirent& entry, const std::string& path)
         return entry.d_type == DT_DIR;
     }
 #endif
-    struct stat status = {};
-    return ::lstat(path.c_str(), &status) == 0 && S_ISDIR(status.st_mode);
+    return FileStatus::OfEntry(path).IsDirectory();
 }

@@ -24,4 +24,4 @@ private:
 
 /// Whether the entry at path is a directory itself, and not a link to one. Asks the file system only if
 /// the listing does not say.
-bool IsDirectory(const dirent& entry, const std::string& path);
+bool IsDirectoryItself(const dirent& entry, const std::string& path);

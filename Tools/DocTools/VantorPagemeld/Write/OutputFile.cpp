@@ -1,28 +1,23 @@
 #include "Tools/DocTools/VantorPagemeld/Write/OutputFile.h"
 
+#include "Tools/DocTools/VantorPagemeld/ModuleLayout.h"
+#include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
 #include "Tools/DocTools/VantorPagemeld/System/ScopedFile.h"
 
 #include <cstdio>
 #include <utility>
 
-#include <sys/stat.h>
 #include <unistd.h>
 
 namespace
 {
-
-bool IsPipe(std::FILE* file)
-{
-    struct stat status = {};
-    return ::fstat(::fileno(file), &status) == 0 && S_ISFIFO(status.st_mode);
-}
 
 /// Returns null when the open fails or a named pipe is at path. A pipe would store nothing, and its reader
 /// could block the run.
 ScopedFile OpenForWriting(const char* path)
 {
     ScopedFile file(std::fopen(path, "w+b")); // does not wait: it opens both ends of a pipe
-    return file != nullptr && IsPipe(file.get()) ? nullptr : std::move(file);
+    return file != nullptr && FileStatus::Of(file.get()).IsPipe() ? nullptr : std::move(file);
 }
 
 } // namespace
@@ -46,7 +41,7 @@ bool WriteOutput(const char* path, std::string_view head, SharedText& body, cons
 
 void ReplaceOutput(const std::string& path, std::string_view head, SharedText& body, const OutputKind& kind)
 {
-    const std::string temporaryPath = path + ".tmp";
+    const std::string temporaryPath = TemporaryPathOf(path);
     const bool isReplaced = WriteOutput(temporaryPath.c_str(), head, body, kind) &&
                             std::rename(temporaryPath.c_str(), path.c_str()) == 0;
     if (isReplaced && head.empty())

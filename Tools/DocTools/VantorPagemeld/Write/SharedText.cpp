@@ -1,12 +1,13 @@
 #include "Tools/DocTools/VantorPagemeld/Write/SharedText.h"
 
+#include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
+
 #include <algorithm>
 #include <utility>
 
 #ifdef PAGEMELD_HAVE_FILE_CLONES
 #include <linux/fs.h>
 #include <sys/ioctl.h>
-#include <sys/stat.h>
 #endif
 
 SharedText::SharedText(TextBuffer text) : m_text(std::move(text)) {}
@@ -32,9 +33,8 @@ bool SharedText::CloneTo(std::FILE* file) const
     }
     // The original can have been cut short by a full disk. Or file is the original itself, by a link: opening
     // it has then emptied the original.
-    struct stat status = {};
-    return ::fstat(::fileno(file), &status) == 0 &&
-           static_cast<std::size_t>(status.st_size) == m_text.GetSize();
+    const FileStatus status = FileStatus::Of(file);
+    return status.Exists() && static_cast<std::size_t>(status.Details().st_size) == m_text.GetSize();
 }
 #else
 bool SharedText::CloneTo(std::FILE*) const

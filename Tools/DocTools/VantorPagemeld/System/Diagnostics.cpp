@@ -1,4 +1,4 @@
-#include "Tools/DocTools/VantorPagemeld/System/Messages.h"
+#include "Tools/DocTools/VantorPagemeld/System/Diagnostics.h"
 
 #include <csignal>
 #include <cstdarg>

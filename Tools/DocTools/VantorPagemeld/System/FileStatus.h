@@ -1,0 +1,38 @@
+#pragma once
+
+#include <cstdio>
+#include <string>
+
+#include <sys/stat.h>
+
+/// What the system tells of a file, directory or anything else that has a name.
+class FileStatus
+{
+public:
+    /// Of what is at path, after following links.
+    static FileStatus Of(const std::string& path);
+
+    /// Of what is at path itself, which may be a link.
+    static FileStatus OfEntry(const std::string& path);
+
+    static FileStatus Of(std::FILE* file);
+
+    /// Whether something is there. Otherwise every other question about it is answered by no.
+    [[nodiscard]] bool Exists() const { return m_error == 0; }
+
+    /// Why nothing is there: an errno such as ENOENT, or EACCES if a directory may hide it.
+    [[nodiscard]] int Error() const { return m_error; }
+
+    [[nodiscard]] bool IsDirectory() const { return S_ISDIR(m_status.st_mode); }
+    [[nodiscard]] bool IsRegularFile() const { return S_ISREG(m_status.st_mode); }
+    [[nodiscard]] bool IsPipe() const { return S_ISFIFO(m_status.st_mode); }
+
+    /// All else that the system tells; zeros if nothing is there.
+    [[nodiscard]] const struct stat& Details() const { return m_status; }
+
+private:
+    FileStatus() = default;
+
+    struct stat m_status = {};
+    int m_error = 0;
+};
