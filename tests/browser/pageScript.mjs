@@ -40,7 +40,8 @@ const pages = {
 fs.cpSync("examples", root, { recursive: true });
 const modules = ["acquire", "charts", "logbook"].flatMap((name) => [`${name}/Manual`, `${name}/ScriptReference`]);
 const producer = path.resolve("Tools/DocTools/PagemeldDocdata/pagemeld-docdata");
-execFileSync(producer, ["--toc", "index.html", "--root-title", toc.title, ...modules], { cwd: root, stdio: "ignore" });
+execFileSync(producer, ["--toc", "index.html", "--share", "Getting started", "--root-title", toc.title, ...modules],
+    { cwd: root, stdio: "ignore" });
 for (const [name, text] of Object.entries(pages)) {
     fs.mkdirSync(path.dirname(path.join(root, sea, name)), { recursive: true });
     fs.writeFileSync(path.join(root, sea, name), text);
