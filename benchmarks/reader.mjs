@@ -7,7 +7,7 @@ import { cpSync, mkdirSync, mkdtempSync, readFileSync, rmSync, statSync, writeFi
 import { tmpdir } from "node:os";
 import path from "node:path";
 import { fileURLToPath, pathToFileURL } from "node:url";
-import { Page } from "../tests/browser/chromium.mjs";
+import { openPage } from "../tests/browser/browsers.mjs";
 
 const [pagemeld, other] = process.argv.slice(2);
 const web = fileURLToPath(new URL("../web", import.meta.url));
@@ -120,7 +120,7 @@ async function measureLoading(page, base) {
     for (let round = -1; round < rounds; round++) { // the first one warms up
         for (const [kind, { load, shown }] of Object.entries(times)) {
             await page.goto("about:blank");
-            await page.ask("HeapProfiler.collectGarbage");
+            await chromium.send("HeapProfiler.collectGarbage");
             await page.goto(`${base}d1/${kind}.html`);
             round >= 0 && shown.push(await page.evaluate(whenShown(kind)));
             round >= 0 && load.push(await page.evaluate(loadTime));
@@ -201,7 +201,7 @@ async function measure(page) {
     const size = ["pagemeld.js", "pagemeld.css"].reduce((sum, name) => sum + statSync(path.join(web, name)).size, 0);
     const script = statSync(fileURLToPath(`${whole}docdata/global_index.js`)).size;
     const model = /^model name\s*: (.*)/m.exec(readFileSync("/proc/cpuinfo", "utf8"))?.[1];
-    console.log(`${model}; ${(await page.ask("Browser.getVersion")).product}; medians of ${rounds} rounds; ` +
+    console.log(`${model}; ${(await chromium.send("Browser.getVersion")).product}; medians of ${rounds} rounds; ` +
         `index script ${(script / 1e6).toFixed(1)} MB`);
     const rows = [
         [`page load over the bare page's ${ms(page1.bare)}`, "at most 50 ms", ms(page1.load), ms(old?.load)],
@@ -217,9 +217,10 @@ async function measure(page) {
     rows.forEach((row) => console.log(`| ${row.join(" | ")} |`));
 }
 
-const page = await Page.open();
+const page = await openPage("chromium");
+const chromium = await page.tab.createCDPSession();
 try {
-    await page.ask("Emulation.setDeviceMetricsOverride", { width: 1280, height: 800, deviceScaleFactor: 1, mobile: false });
+    await page.resize(1280, 800);
     await measure(page);
 } finally {
     await page.close();

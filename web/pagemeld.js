@@ -11,29 +11,36 @@
     const SLICE = 30; // ms of work without a pause
     const SETS = ["Manual", "ScriptReference"];
 
-    const fresh = document.documentElement.appendChild(create("iframe", {}));
-    const { Map, Set, URL } = fresh.contentWindow; // a page may redefine these
-    fresh.remove();
+    const resolve = createResolver();
     const tag = document.currentScript; // a later <base> did not change where it led
     const isBeforeBase = document.querySelector("base[href]")?.compareDocumentPosition(tag) & 2;
-    const ownAddress = isBeforeBase ? new URL(tag.getAttribute("src"), document.URL) : tag.src;
+    const ownAddress = isBeforeBase ? resolve(tag.getAttribute("src"), document.URL).href : tag.src;
     const shared = tag.dataset.docdata;
-    const docdata = shared ? new URL(shared.replace(/\/?$/, "/"), document.URL) : new URL(".", ownAddress);
-    const setFolder = new URL("..", docdata).href;
-    const docdataName = docdata.href.slice(setFolder.length);
+    const docdata = shared ? resolve(shared.replace(/\/?$/, "/"), document.URL).href : resolve(".", ownAddress).href;
+    const setFolder = resolve("..", docdata).href;
 
+    const docdataName = docdata.slice(setFolder.length);
+
+    const language = { lang: document.documentElement.lang }; // of what is not the view's own words
     const box = create("input", { type: "search", autocomplete: "off", spellcheck: "false" });
-    const filter = create("select", {}, create("option", { value: "" }, "All"));
-    const form = create("form", { role: "search" }, create("label", {}, "Search all modules ", box));
+    const filter = create("select", language, create("option", { value: "", lang: "en" }, "All"));
+    const form = create("form", { role: "search", "aria-label": "All modules" },
+        create("label", {}, "Search all modules ", box));
     const status = create("p", { role: "status" });
-    const results = create("ul", { class: "pagemeld-results" });
+    const results = create("ul", { class: "pagemeld-results", ...language });
     const more = create("button", { type: "button", hidden: "" }, "More results");
-    const finder = create("div", {}, form, status, results, more);
-    const contents = create("div", { class: "pagemeld-contents" });
-    const contentsButton = createButton("Contents", contents);
-    const view = create("div", { class: "pagemeld-view", hidden: "" },
-        finder, create("nav", { "aria-label": "Contents" }, contentsButton, contents));
+    const finder = create("div", { class: "pagemeld-finder" }, form, status, results, more);
+    const contents = create("div", { class: "pagemeld-contents", ...language });
+    const nav = create("nav", { "aria-label": "All modules" }, contents);
+    const view = create("div", { class: "pagemeld-view", lang: "en", role: "region", "aria-label": "All modules" },
+        finder, nav);
+    const opener = create("button", { type: "button", class: "pagemeld-open", "aria-keyshortcuts": "/", lang: "en" },
+        "Search all modules ", create("kbd", { "aria-hidden": "true" }, "/"));
+    const dialog = create("dialog", { id: "pagemeld", "aria-label": "All modules", lang: "en" });
 
+    const systemIsDark = matchMedia("(prefers-color-scheme: dark)");
+
+    let isDialogKey = false;
     const indexes = []; // of the sets that are loaded, the own one first
     let found = { pages: [] };
 
@@ -42,6 +49,25 @@
         Object.entries(attributes).forEach(([key, value]) => element.setAttribute(key, value));
         element.append(...children);
         return element;
+    }
+
+    // Resolves an address against another, in a document of its own: a page may redefine URL and have a <base>.
+    // The link that it returns is taken apart at once; the next call uses it again.
+    function createResolver() {
+        const inert = document.implementation.createHTMLDocument("");
+        const base = inert.head.appendChild(inert.createElement("base"));
+        const link = inert.createElement("a");
+        return (address, from) => {
+            base.href = from;
+            link.href = address;
+            return link;
+        };
+    }
+
+    // Does something at the first call, and returns the same at each.
+    function once(act) {
+        let result;
+        return () => (result ??= act());
     }
 
     const loaded = (element, parent) =>
@@ -74,12 +100,12 @@
     const encode = (path, special) => path.replace(special, encodeURIComponent);
     const prefixOf = (link, prefixes) => prefixes.find((prefix) => link.startsWith(prefix)) || "";
 
-    // A link is a path on disk, in which only "#" has a meaning. The outputs put the prefix before whole addresses
-    // too. "std::list.html" is not one, and "javascript:" must not run.
+    // A link is a path on disk, in which only "#" has a meaning: "File:a.html" and "javascript:" are names of files.
+    // The outputs put the prefix before whole addresses too.
     function addressOf(link, prefixes, folder = setFolder) {
         const prefix = prefixOf(link, prefixes);
         const rest = link.slice(prefix.length);
-        if (/^(?!javascript:)[a-z][a-z\d+.-]+:(?!:)/i.test(rest)) {
+        if (/^(https?|ftp|mailto):(?!:)/i.test(rest)) {
             return rest;
         }
         const end = `${rest}#`.indexOf("#");
@@ -91,7 +117,7 @@
         create("a", { href: addressOf(link, prefixes, folder), target: "_self" }, title.trim() || link);
 
     // The module directory: "charts" for ".../charts/Manual/".
-    const nameOf = (address, level) => decode(new URL(address).pathname.split("/").at(level) ?? "");
+    const nameOf = (address, level) => decode(resolve(address, docdata).pathname.split("/").at(level) ?? "");
 
     // Runs the index of a set and the search in a frame that stays: its functions are used. Null if the index did not
     // run. Makes way for the reader's events now and then.
@@ -99,8 +125,8 @@
         const frame = await openFrame();
         const { values, prefixes } = await runOutput(frame, `${folder}${docdataName}global_index.js`,
             ["pages", "info", "common", "searchIndex"], "Search is", complaint);
-        await loaded(create("script", { src: new URL("pagemeld-search.js", ownAddress) }), frame.contentDocument.head);
-        const { prepareIndex } = frame.contentWindow;
+        await loaded(create("script", { src: resolve("pagemeld-search.js", ownAddress).href }), frame.contentDocument.head);
+        const { prepareIndex, Map } = frame.contentWindow;
         if (!values || !prepareIndex) {
             frame.remove();
             return null;
@@ -173,11 +199,13 @@
         }
     }
 
+    const isFirst = (value, i, values) => values.indexOf(value) === i;
+
     // The results that are shown stay where they are; those of the index come after them.
     function join(index) {
         indexes.push(index);
         const { set, names } = index;
-        const modules = [...new Set(index.prefixes.map((prefix) => names.get(prefix)))].sort();
+        const modules = index.prefixes.map((prefix) => names.get(prefix)).filter(isFirst).sort();
         const options = modules.map((name) => create("option", { value: `${set}/${name}` }, name));
         filter.append(create("optgroup", { label: set }, create("option", { value: set }, `All of ${set}`), ...options));
         if (!filter.isConnected && (indexes.length > 1 || modules.length > 1)) {
@@ -192,12 +220,11 @@
 
     // The set being read, then the other one; data-sets names those that are searched.
     async function loadIndex() {
-        box.onfocus = null;
         status.textContent = "Loading the search index";
         const own = nameOf(setFolder, -2);
         const sets = (tag.dataset.sets ?? SETS.join(" ")).split(" ").filter((set) => set !== own && SETS.includes(own));
         for (const set of [own, ...sets]) {
-            const folder = set === own ? setFolder : new URL(`../${set}/`, setFolder).href;
+            const folder = set === own ? setFolder : resolve(`../${set}/`, setFolder).href;
             const index = await openIndex(folder, set === own ? status : create("p", {}));
             if (index) {
                 join(index);
@@ -205,24 +232,47 @@
         }
     }
 
-    // Writes the query into the address and leaves the rest to the page.
-    function keepQuery() {
-        const address = new URL(document.URL);
+    const needIndex = once(loadIndex);
+    const linksFound = () => [...results.querySelectorAll("a")];
+
+    // Writes the query of an open view into the address, and which module and link were chosen into the entry of the
+    // history, so that Back finds them. The rest of both is the page's.
+    function keepQuery(chosen) {
+        box.defaultValue = box.value; // to which WebKit resets the box after Back
+        const query = dialog.isConnected && !dialog.open ? "" : box.value.trim();
+        const address = resolve(document.URL, document.URL);
         const others = address.search.slice(1).split("&").filter((part) => part && !part.startsWith("pagemeld="));
-        const query = box.value.trim();
         address.search = others.concat(query ? "pagemeld=" + encodeURIComponent(query) : []).join("&");
-        window.history.replaceState(window.history.state, "", address);
+        const { state } = window.history;
+        const kept = { module: filter.value, shown: results.childElementCount, chosen };
+        window.history.replaceState(typeof state === "object" ? { ...state, pagemeld: kept } : state, "", address.href);
+    }
+
+    // Once the index is there: as it was when the reader left for a result.
+    async function restoreQuery(query) {
+        box.value = query;
+        await needIndex();
+        const { module = "", shown = 0, chosen } = window.history.state?.pagemeld ?? {};
+        if (box.value === query) {
+            filter.value = module;
+            update();
+            while (results.childElementCount < shown && !more.hidden) {
+                showMore();
+            }
+            linksFound().find(({ href }) => href === chosen)?.focus();
+        }
     }
 
     // A button that shows and hides a list, and calls fill before it shows an empty one.
     function createButton(title, list, fill = () => {}) {
-        const button = create("button", { type: "button" }, title);
+        const button = create("button", { type: "button", "aria-expanded": "false" }, title);
         button.onclick = () => {
-            list.hasChildNodes() || fill();
+            if (!list.hasChildNodes()) {
+                fill();
+            }
             list.hidden = !list.hidden;
             button.setAttribute("aria-expanded", !list.hidden);
         };
-        button.setAttribute("aria-expanded", false);
         list.hidden = true;
         return button;
     }
@@ -264,8 +314,12 @@
             const list = create("ul", {});
             const button = createButton(isLink ? "" : name, list,
                 () => list.append(...createEntries(children, way, prefixes)));
-            isLink && button.setAttribute("aria-label", `Below ${name.text}`);
-            way.slice(0, -1).includes(node) && button.click();
+            if (isLink) {
+                button.setAttribute("aria-label", `Below ${name.text}`);
+            }
+            if (way.slice(0, -1).includes(node)) {
+                button.click();
+            }
             return create("li", {}, button, isLink ? name : "", list);
         });
     }
@@ -281,73 +335,216 @@
                 findWay(toc.children, isPage) ?? [];
             const entries = createEntries(toc.children, way, prefixes);
             contents.append(create("p", {}, toc.title), create("ul", {}, ...entries));
-            const current = contents.querySelector("[aria-current]");
-            contents.scrollTop = current ? current.offsetTop - contents.clientHeight / 2 : 0;
+            showCurrent();
         }
     }
+
+    const needContents = once(loadContents);
+
+    function showCurrent() {
+        const current = contents.querySelector("[aria-current]");
+        contents.scrollTop = current ? current.offsetTop - contents.clientHeight / 2 : 0;
+    }
+
 
     const isPlain = (event) => !event.isComposing &&
         !["Control", "Alt", "Meta", "AltGraph"].some((key) => event.getModifierState(key));
 
+    const isTyped = (target) => target.isContentEditable || /^(input|textarea|select)$/.test(target.localName);
+
     // "/" leads to the box, unless it is typed text or the page uses it.
-    function onPageKey(event) {
-        const [target] = event.composedPath();
-        const isTyped = target.isContentEditable || /^(input|textarea|select)$/.test(target.localName);
-        if (event.key === "/" && !isTyped && !event.defaultPrevented && isPlain(event)) {
+    function onSlash(event) {
+        if (event.key === "/" && !isTyped(event.composedPath()[0]) && !event.defaultPrevented && isPlain(event)) {
             event.preventDefault();
-            box.focus();
-            box.select();
+            openView();
         }
     }
 
-    // Down and Up lead through the box and the results, Escape to the box, and clears it there.
-    function onFinderKey(event) {
-        const { key, target } = event;
-        const stops = [box, ...results.querySelectorAll("a"), ...(more.hidden ? [] : [more])];
-        const step = stops.includes(target) ? { ArrowDown: 1, ArrowUp: -1 }[key] : 0;
-        const next = key === "Escape" ? box : step && stops[stops.indexOf(target) + step];
-        if (next && !event.shiftKey && isPlain(event)) {
+    // Down and Up lead through the box and the results.
+    function onArrow(event) {
+        const stops = [box, ...linksFound(), ...(more.hidden ? [] : [more])];
+        const at = stops.indexOf(event.target);
+        const next = stops[at + { ArrowDown: 1, ArrowUp: -1 }[event.key]];
+        if (at >= 0 && next && !event.shiftKey && isPlain(event)) {
             event.preventDefault();
             next.focus();
-            if (next === target) {
-                box.value = "";
-                update();
+        }
+    }
+
+    // Escape closes the dialog. In a page's own place it leads to the box, and clears it there.
+    function onEscape(event) {
+        if (event.key !== "Escape" || !isPlain(event)) {
+            return;
+        }
+        event.preventDefault();
+        if (dialog.open) {
+            dialog.close();
+        } else if (event.target === box) {
+            box.value = "";
+            update();
+        } else {
+            box.focus();
+        }
+    }
+
+    // The page does not see the keys that are pressed while the dialog is open, nor how the last one is let go.
+    function onDialogKey(event) {
+        if (event.type === "keydown") {
+            isDialogKey = dialog.open;
+        }
+        if (isDialogKey) {
+            event.stopPropagation();
+        }
+        if (isDialogKey && event.type === "keydown") {
+            [onSlash, onArrow, onEscape].forEach((handle) => handle(event));
+        }
+    }
+
+    // A link within this page does not leave it, but the dialog.
+    function onLink(event) {
+        const link = event.target.closest("a");
+        if (link) {
+            keepQuery(link.href);
+            if (link.href.split("#")[0] === document.URL.split("#")[0] && dialog.open) {
+                dialog.close();
             }
         }
     }
 
     function listen() {
-        addEventListener("keydown", onPageKey);
-        finder.addEventListener("keydown", onFinderKey);
-        box.onfocus = loadIndex;
+        addEventListener("keydown", onSlash);
+        box.onfocus = needIndex;
         box.oninput = filter.onchange = update;
-        box.onblur = results.onclick = keepQuery;
+        box.onblur = () => keepQuery();
+        view.onclick = onLink;
         more.onclick = () => showMore().querySelector("a").focus();
-        form.onsubmit = () => { (results.querySelector("li:first-child [data-asked]") ?? results.querySelector("a"))?.click(); return false; };
+        form.onsubmit = (event) => {
+            event.preventDefault();
+            (results.querySelector("li:first-child [data-asked]") ?? results.querySelector("a"))?.click();
+        };
     }
 
-    // The first thing in the body, or in what fills the window by itself, as javadoc's pages do.
-    function createPlace() {
-        const place = create("div", { id: "pagemeld", class: "pagemeld-top" });
-        const filler = [...document.body.children].find((part) => getComputedStyle(part).position === "fixed" &&
-            part.clientWidth >= innerWidth && part.clientHeight >= innerHeight);
-        (filler ?? document.body).prepend(place);
-        return place;
+    function openView() {
+        if (dialog.isConnected && !dialog.open) {
+            matchPage();
+            holdPage(true);
+            dialog.showModal();
+            needIndex();
+            needContents();
+        }
+        box.focus();
+        box.select();
+    }
+
+    // The page keeps its place, and the room of its scroll bar, while it can't be scrolled. Where the root has no
+    // overflow of its own, that of the body is the window's, and would become the body's.
+    function holdPage(isHeld) {
+        const { documentElement: root, body } = document;
+        const isBodys = getComputedStyle(root).overflowX === "visible";
+        root.classList.toggle("pagemeld-bar", isHeld && innerWidth > root.clientWidth);
+        root.classList.toggle("pagemeld-held", isHeld);
+        body.classList.toggle("pagemeld-held", isHeld && isBodys);
+    }
+
+    // Light text is on a dark page. What the system says decides where the color is not given as red, green, and blue.
+    function matchPage() {
+        const { color } = getComputedStyle((dialog.isConnected ? opener : view).parentElement.parentElement);
+        const [red, green, blue] = /^rgb/.test(color) ? color.match(/[\d.]+/g) : [];
+        const isDark = blue === undefined ? systemIsDark.matches : 0.21 * red + 0.72 * green + 0.07 * blue > 127;
+        [view, opener].forEach((part) => part.classList.toggle("pagemeld-dark", isDark));
+    }
+
+    // Themes are switched by an attribute of the root or the body.
+    function watchPage() {
+        const observer = new MutationObserver(matchPage);
+        [document.documentElement, document.body].forEach((part) => observer.observe(part, { attributes: true }));
+        systemIsDark.onchange = matchPage;
+        matchPage();
+    }
+
+    // In a place of the page: contents that can be closed, and a way around both.
+    function fill(place) {
+        const button = createButton("Contents", contents);
+        const end = create("span", { tabindex: "-1" });
+        const skip = create("a", { href: "#pagemeld", class: "pagemeld-skip" }, "Skip search and contents");
+        skip.onclick = (event) => {
+            event.preventDefault();
+            end.focus();
+        };
+        view.prepend(skip);
+        nav.prepend(button);
+        place.append(view, end);
+        finder.addEventListener("keydown", onArrow);
+        finder.addEventListener("keydown", onEscape);
+        if (matchMedia("(min-width: 48em)").matches) {
+            button.click();
+        }
+        (window.requestIdleCallback ?? setTimeout)(needContents);
+    }
+
+    // Tabs choose one of the parts where there is no room for both.
+    function createTabs() {
+        const tabs = ["Search", "Contents"].map((name) => create("button", { type: "button", role: "tab" }, name));
+        const select = (chosen) => {
+            tabs.forEach((tab) => tab.setAttribute("aria-selected", tab === chosen));
+            view.classList.toggle("pagemeld-at-contents", chosen === tabs[1]);
+            showCurrent();
+        };
+        tabs.forEach((tab) => { tab.onclick = () => select(tab); });
+        select(tabs[0]);
+        return create("div", { role: "tablist", class: "pagemeld-tabs", "aria-label": "Parts" }, ...tabs);
+    }
+
+    // A button in a corner, and the dialog that it opens.
+    function createDialog() {
+        const close = create("button", { type: "button", class: "pagemeld-close", "aria-label": "Close" }, "\u00d7");
+        view.prepend(createTabs());
+        view.append(close);
+        dialog.append(view);
+        opener.dataset.corner = tag.dataset.corner ?? "";
+        document.body.append(create("div", { class: "pagemeld-corner", role: "region", "aria-label": "Search", lang: "en" },
+            opener, dialog));
+        let pressed = null; // a selection of text may end beside the view
+        dialog.onmousedown = ({ target }) => { pressed = target; };
+        dialog.onclick = ({ target }) => {
+            if (target === close || (target === dialog && pressed === dialog)) {
+                dialog.close();
+            }
+        };
+        dialog.onclose = () => {
+            holdPage(false);
+            keepQuery();
+        };
+        opener.onclick = openView;
+        ["keydown", "keypress", "keyup"].forEach((type) => addEventListener(type, onDialogKey, true));
     }
 
     async function start() {
         if (document.body?.localName !== "body") {
             return; // a frame set
         }
-        (document.getElementById("pagemeld") ?? createPlace()).append(view);
+        await loaded(create("link", { rel: "stylesheet", href: resolve("pagemeld.css", ownAddress).href }),
+            document.head ?? document.documentElement);
+        const place = document.getElementById("pagemeld");
+        if (place) {
+            fill(place);
+        } else {
+            createDialog();
+        }
         listen();
-        matchMedia("(min-width: 48em)").matches && contentsButton.click();
-        box.value = new URLSearchParams(location.search).get("pagemeld") ?? "";
-        box.value && loadIndex();
-        await loaded(create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress) }), view);
-        view.hidden = false;
-        (window.requestIdleCallback ?? setTimeout)(loadContents);
+        watchPage();
+        const query = new URLSearchParams(location.search).get("pagemeld");
+        if (query) {
+            restoreQuery(query);
+        }
+        if (query && !place) {
+            openView();
+        }
     }
 
-    document.readyState === "loading" ? addEventListener("DOMContentLoaded", start) : start();
+    if (document.readyState === "loading") {
+        addEventListener("DOMContentLoaded", start);
+    } else {
+        start();
+    }
 }());
