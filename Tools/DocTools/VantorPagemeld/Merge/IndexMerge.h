@@ -38,6 +38,8 @@ public:
         : m_combined(combined), m_largeObjects(largeObjects)
     {
     }
+    IndexMerge(const IndexMerge&) = delete;
+    IndexMerge& operator=(const IndexMerge&) = delete;
 
     /// Moves all of input except its common words, which are copied if there are none yet.
     void Append(rapidjson::Document& input);
