@@ -139,6 +139,7 @@ SCRIPT = [
     ("open.html", "<p>x", f"<p>x{TAG}"), ("html.html", "<p>x</html>", f"<p>x{TAG}</html>"),
     ("bytes.html", b"\xff\r\n</body>", b"\xff\r\n" + TAG.encode() + b"</body>"),
     ("wide.html", "\ufeff<p>\u010d</body>".encode("utf-16-le") + b"!", f"\ufeff<p>\u010d{WIDE_TAG}</body>".encode("utf-16-le") + b"!"),
+    ("based.html", "<base target=x><base href=y></body>", f"<base target=x>{TAG}<base href=y></body>"),
     ("deep/er/page.html", "</body>", TAG.replace('"doc', '"../../doc') + "</body>"),
     ("frames.html", "<frameset><frame src=x></frameset><noframes><body></body></noframes>", None),
     ("strict.xhtml", '<?xml version="1.0"?><html><body/></html>', None),

@@ -4,13 +4,16 @@ import os
 import re
 import shutil
 
-from markup import TOKEN, find_encoding
+from markup import find_encoding
 
 HERE = os.path.dirname(os.path.realpath(__file__))
 # Where the program is installed, and in the sources.
 WEB_DIRECTORIES = (os.path.join(HERE, "..", "web"), os.path.join(HERE, "..", "..", "..", "web"))
 TAG = re.compile(r"""<script\b[^>]*\bsrc\s*=\s*["']?[^"'>]*\bdocdata/pagemeld\.js\b[^>]*>\s*</script\s*>""", re.I)
 XHTML = re.compile(r"""\s*<\?xml\b|<html\b[^>]*\bxmlns\s*=""", re.I)
+# What decides on the place of the tag. Comments and scripts are matched whole, so that nothing in them counts.
+MARK = re.compile(r"<!--.*?(?:-->|\Z) | <script\b.*?(?:</script\s*>|\Z) | <(/body|/html|frameset|base(?=\s[^>]*\bhref))\b",
+                  re.S | re.I | re.X)
 
 
 def make_tag(path, encoding):
@@ -20,30 +23,30 @@ def make_tag(path, encoding):
     return f'<script src="{"../" * path.count("/")}docdata/pagemeld.js"{charset} defer="defer"></script>'
 
 
-def find_end(text, names):
-    """Returns where the end tag of the body begins, or else that of the page, or else the end of the text; None if the
-    page can't have a tag, because it is a frame set, or XHTML without an end tag of the body."""
-    if "frameset" in names:
+def find_place(text):
+    """Returns where the tag goes: before a <base>, after which its address would mean another file; or else before the
+    end tag of the body, or that of the page, or at the end. None if the page can't have a tag, because it is a frame
+    set, or XHTML without an end tag of the body."""
+    marks = {(mark[1] or "").lower(): mark.start() for mark in MARK.finditer(text)}
+    if "frameset" in marks:
         return None
-    if "/body" in names:
-        return names["/body"]
-    return None if XHTML.search(text[:2000]) else names.get("/html", len(text))
+    if "base" in marks:
+        return marks["base"]
+    if "/body" in marks:
+        return marks["/body"]
+    return None if XHTML.search(text[:2000]) else marks.get("/html", len(text))
 
 
 def put_tag(text, tag):
-    """Returns text with the tag before the end of its body, and without change if it has one or can't have it."""
-    names = {}
-    for token in TOKEN.finditer(text):
-        if TAG.fullmatch(token[0]):
-            return text
-        names[(token[2] or "").lower()] = token.start()
-    end = find_end(text, names)
-    return text if end is None else text[:end] + tag + text[end:]
+    """Returns text with the tag, and without change if it has one or can't have it."""
+    has_tag = "pagemeld.js" in text and any(TAG.fullmatch(mark[0]) for mark in MARK.finditer(text))
+    place = None if has_tag else find_place(text)
+    return text if place is None else text[:place] + tag + text[place:]
 
 
 def take_tags(text):
     """Returns text without tags of the page script."""
-    return TOKEN.sub(lambda token: "" if TAG.fullmatch(token[0]) else token[0], text)
+    return MARK.sub(lambda mark: "" if TAG.fullmatch(mark[0]) else mark[0], text)
 
 
 def change_page(data, change):
