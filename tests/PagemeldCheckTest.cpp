@@ -1,6 +1,7 @@
 #include "Tools/DocTools/PagemeldCheck/Report/Rules.h"
 #include "tests/support/Files.h"
 #include "tests/support/Placeholders.h"
+#include "tests/support/Repeated.h"
 #include "tests/support/RunProgram.h"
 
 #include <gtest/gtest.h>
@@ -585,10 +586,12 @@ TEST(PagemeldCheck, RefusesUnusableCommandLines)
     const std::pair<std::vector<std::string>, std::string> cases[] = {
         {{}, "no ROOT is given"},
         {{"-d", "a", "b"}, "give roots or --discover, not both"},
-        {{"-f", "xml", "a"}, "the format is \"text\" or \"json\""},
-        {{"-n", "", "a"}, "the limit is a number"},
-        {{"-n", "-1", "a"}, "the limit is a number"},
-        {{"-n", "9999999999999999999", "a"}, "the limit is a number"},
+        {{"-autopaths", "a"}, "-autopaths is an option of pagemeld; here it is --discover=DIR"},
+        {{"-f", "xml", "a"}, R"(the format is "text" or "json", not "xml")"},
+        {{"-n", "", "a"}, R"(the limit is a number of at most 18 digits, not "")"},
+        {{"-n", "-1", "a"}, R"(the limit is a number of at most 18 digits, not "-1")"},
+        {{"-n", "9999999999999999999", "a"},
+         R"(the limit is a number of at most 18 digits, not "9999999999999999999")"},
     };
     const TemporaryDirectory directory;
     for (const auto& [arguments, problem] : cases)
@@ -600,7 +603,47 @@ TEST(PagemeldCheck, RefusesUnusableCommandLines)
     EXPECT_EQ(2, unknown.status);
     EXPECT_EQ("", unknown.standardOutput);
     EXPECT_NE(std::string::npos, unknown.standardError.find("\n  no-modules"));
-    EXPECT_EQ(2, RunProgram("sh", {"-c", std::string(PAGEMELD_CHECK_PROGRAM) + " a >/dev/full"}).status);
+}
+
+TEST(PagemeldCheck, SaysWhyItCouldNotPrint)
+{
+    const std::string unwritten = "pagemeld-check: standard output can't be written\nstatus 2\n";
+    const std::pair<std::string, std::string> cases[] = {
+        {"{ CHECK a; echo status $? >&2; } >/dev/full", unwritten},
+        {"{ CHECK --help; echo status $? >&2; } >/dev/full", unwritten},
+        {"{ sleep 0.1; CHECK a; echo status $? >&2; } | true", "status 1\n"}, // nobody reads any more
+    };
+    for (const auto& [command, expected] : cases)
+    {
+        const ProgramResult result =
+            RunProgram("sh", {"-c", ReplaceAll(command, "CHECK", PAGEMELD_CHECK_PROGRAM)});
+        EXPECT_EQ(expected, result.standardError) << command;
+    }
+}
+
+TEST(PagemeldCheck, SaysThatMemoryRanOut)
+{
+#ifdef __SANITIZE_ADDRESS__
+    GTEST_SKIP() << "the sanitizer reserves more than any limit";
+#endif
+    const TemporaryDirectory directory;
+    WriteSoundModules(directory);
+    WriteFile(directory / "b/Manual/docdata/toc.json", Toc("", R"("x":[0)" + Repeated(",0", 500'000) + "]"));
+    int ended = 0;
+    for (int megabytes = 6, status = 2; status != 1; ++megabytes)
+    {
+        ASSERT_LT(megabytes, 100);
+        const ProgramResult result =
+            RunProgram("prlimit", {"--as=" + std::to_string(megabytes << 20), PAGEMELD_CHECK_PROGRAM,
+                                   directory / "a", directory / "b"});
+        status = result.status;
+        if (status != 127) // the loader's
+        {
+            EXPECT_EQ(status == 2 ? "pagemeld-check: out of memory\n" : "", result.standardError);
+            ended += status == 2 ? 1 : 0;
+        }
+    }
+    EXPECT_GT(ended, 5);
 }
 
 TEST(PagemeldCheck, ExplainsEveryRuleInHelpAndOnItsPage)

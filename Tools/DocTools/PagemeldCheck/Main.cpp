@@ -4,8 +4,10 @@
 #include "Tools/DocTools/PagemeldCheck/SetCheck.h"
 #include "Tools/DocTools/VantorPagemeld/System/Diagnostics.h"
 
+#include <cerrno>
 #include <cstdio>
 #include <cstdlib>
+#include <new>
 
 #include <unistd.h>
 
@@ -16,11 +18,29 @@ constexpr int kSound = 0;
 constexpr int kFaulty = 1;
 constexpr int kUnusable = 2;
 
-/// Prints a text on standard output. Returns the exit status.
+/// Called when memory runs out.
+[[noreturn]] void EndWithoutMemory()
+{
+    (void)std::fputs("pagemeld-check: out of memory\n", stderr);
+    std::_Exit(kUnusable);
+}
+
+/// Returns the exit status after all is printed: the one given, unless standard output can't be written. A
+/// reader that has seen enough and closes its pipe is no failure.
+int Finish(int status)
+{
+    if ((std::fflush(stdout) == 0 && std::ferror(stdout) == 0) || errno == EPIPE)
+    {
+        return status;
+    }
+    (void)std::fputs("pagemeld-check: standard output can't be written\n", stderr);
+    return kUnusable;
+}
+
 int Show(const std::string& text)
 {
     (void)std::fputs(text.c_str(), stdout);
-    return std::fflush(stdout) == 0 ? kSound : kUnusable;
+    return Finish(kSound);
 }
 
 int Explain(const std::string& id)
@@ -52,12 +72,7 @@ int Check(Options options)
         CheckSet(set.id, roots, options.checks, report);
     }
     report.Print(stdout, options.form, roots);
-    if (std::fflush(stdout) != 0 || std::ferror(stdout) != 0)
-    {
-        (void)std::fputs("pagemeld-check: standard output can't be written\n", stderr);
-        return kUnusable;
-    }
-    return report.HasErrors(options.form) ? kFaulty : kSound;
+    return Finish(report.HasErrors(options.form) ? kFaulty : kSound);
 }
 
 } // namespace
@@ -65,6 +80,7 @@ int Check(Options options)
 int main(int argc, char* argv[])
 {
     SecureStandardStreams();
+    std::set_new_handler(EndWithoutMemory);
     const std::optional<Options> options = ParseOptions(argc, argv);
     if (!options)
     {

@@ -1,11 +1,13 @@
 #include "Tools/DocTools/PagemeldCheck/Options.h"
 
+#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/PagemeldCheck/Report/Rules.h"
 
 #include <algorithm>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <string_view>
 
 #include <getopt.h>
 
@@ -90,7 +92,7 @@ std::string TakeOption(Options& options, int letter, const char* argument)
         options.form.isJson = std::strcmp(argument, "json") == 0;
         return options.form.isJson || std::strcmp(argument, "text") == 0
                    ? ""
-                   : "the format is \"text\" or \"json\"";
+                   : "the format is \"text\" or \"json\", not " + Quoted(argument, options.checks.quoteSize);
     case 'W':
         options.form.countsWarningsAsErrors = true;
         break;
@@ -98,7 +100,9 @@ std::string TakeOption(Options& options, int letter, const char* argument)
     {
         const std::optional<std::size_t> limit = ParseNumber(argument);
         options.checks.limit = limit.value_or(0);
-        return limit ? "" : "the limit is a number";
+        return limit ? ""
+                     : "the limit is a number of at most 18 digits, not " +
+                           Quoted(argument, options.checks.quoteSize);
     }
     case 'q':
         options.form.showsErrorsOnly = true;
@@ -128,6 +132,10 @@ std::string RuleLine(const RuleRow& rule)
 std::optional<Options> ParseOptions(int argc, char* argv[])
 {
     Options options;
+    if (std::find(argv, argv + argc, std::string_view("-autopaths")) != argv + argc)
+    {
+        return Refuse("-autopaths is an option of pagemeld; here it is --discover=DIR");
+    }
     for (int letter = 0; (letter = ::getopt_long(argc, argv, "d:tof:Wn:qe:hV", kLongOptions, nullptr)) != -1;)
     {
         if (letter == '?')

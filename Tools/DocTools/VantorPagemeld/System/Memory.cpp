@@ -79,6 +79,10 @@ void* EndIfNull(void* memory)
 {
     if (memory == nullptr)
     {
+        if (const std::new_handler end = std::get_new_handler())
+        {
+            end();
+        }
         throw std::bad_alloc();
     }
     return memory;
