@@ -1,4 +1,4 @@
-#include "Tools/DocTools/PagemeldCheck/Report/Rules.h"
+#include "Tools/DocTools/PagemeldCheck/Report/TextReport.h"
 #include "tests/support/Files.h"
 #include "tests/support/Placeholders.h"
 #include "tests/support/Repeated.h"
@@ -10,6 +10,7 @@
 #include <cctype>
 #include <chrono>
 #include <filesystem>
+#include <regex>
 #include <string>
 #include <thread>
 #include <utility>
@@ -417,6 +418,13 @@ status 1
 2 modules, 3 errors, 1 warning; missing from the search of Manual: b
 status 1
 )"},
+        {{"-n", "1", "-f", "json", "@/a", "@/b"},
+         {{"b/Manual/docdata/index.json", Index("1,2,3")}},
+         R"({"level":"error","rule":"structure","file":"@/b/Manual/docdata/index.json","line":1,"column":11,"offset":10,"pointer":"/pages/0","module":"@/b","set":"Manual","message":"page entry is 1, not [path, title]; \"b\" will be missing from the search of Manual"}
+{"level":"error","rule":"structure","file":"@/b/Manual/docdata/index.json","module":"@/b","set":"Manual","more":2,"message":"2 more of this rule; --limit=0 shows all"}
+{"summary":{"modules":2,"errors":3,"warnings":0,"notes":0,"missing":{"Manual":{"search":["@/b"],"contents":[]},"ScriptReference":{"search":[],"contents":[]}}}}
+status 1
+)"},
         {{"--quiet", "@/a", "@/b"},
          {{"b/Manual/docdata/index.json",
            Index("", R"("info":[],"common":{},"searchIndex":{"__proto__":[]})")},
@@ -470,22 +478,22 @@ status 1
 
 TEST(PagemeldCheck, ShowsHostileNamesEscapedAndSurvivesHostileTrees)
 {
-    const std::string name = "c\n\x1B[1m\xE9\xC2\x9B";
+    const std::string name = "c\n\x1B[1m\xE9\xC2\x9B\x7F";
     const CheckCase cases[] = {
         {{"@/" + name},
          {{name + "/Manual/docdata/toc.json", "7"}},
-         R"(@/c\n\x1B[1m\xE9\u009B/Manual/docdata/index.json: error: is missing beside toc.json; "c\n\x1B[1m\xE9\u009B" will be missing from the search of Manual [unreadable]
-@/c\n\x1B[1m\xE9\u009B/Manual/docdata/toc.json:1:1: error: node is 7, not an object; "c\n\x1B[1m\xE9\u009B" will be missing from the contents of Manual [structure]
+         R"(@/c\n\x1B[1m\xE9\u009B\x7F/Manual/docdata/index.json: error: is missing beside toc.json; "c\n\x1B[1m\xE9\u009B\x7F" will be missing from the search of Manual [unreadable]
+@/c\n\x1B[1m\xE9\u009B\x7F/Manual/docdata/toc.json:1:1: error: node is 7, not an object; "c\n\x1B[1m\xE9\u009B\x7F" will be missing from the contents of Manual [structure]
 Manual: error: no module has a sound index.json, and none a sound toc.json: nothing will be written, and earlier outputs stay [nothing-to-combine]
-1 module, 3 errors, 0 warnings; missing from the search of Manual: c\n\x1B[1m\xE9\u009B; from its contents: c\n\x1B[1m\xE9\u009B
+1 module, 3 errors, 0 warnings; missing from the search of Manual: c\n\x1B[1m\xE9\u009B\x7F; from its contents: c\n\x1B[1m\xE9\u009B\x7F
 status 1
 )"},
         {{"-f", "json", "@/" + name},
          {{name + "/Manual/docdata/toc.json", "7"}},
-         R"({"level":"error","rule":"unreadable","file":"@/c\n\u001B[1m\\xE9\u009B/Manual/docdata/index.json","module":"@/c\n\u001B[1m\\xE9\u009B","set":"Manual","message":"is missing beside toc.json; \"c\\n\\x1B[1m\\xE9\\u009B\" will be missing from the search of Manual"}
-{"level":"error","rule":"structure","file":"@/c\n\u001B[1m\\xE9\u009B/Manual/docdata/toc.json","line":1,"column":1,"offset":0,"pointer":"","module":"@/c\n\u001B[1m\\xE9\u009B","set":"Manual","message":"node is 7, not an object; \"c\\n\\x1B[1m\\xE9\\u009B\" will be missing from the contents of Manual"}
+         R"({"level":"error","rule":"unreadable","file":"@/c\n\u001B[1m\\xE9\u009B\u007F/Manual/docdata/index.json","module":"@/c\n\u001B[1m\\xE9\u009B\u007F","set":"Manual","message":"is missing beside toc.json; \"c\\n\\x1B[1m\\xE9\\u009B\\x7F\" will be missing from the search of Manual"}
+{"level":"error","rule":"structure","file":"@/c\n\u001B[1m\\xE9\u009B\u007F/Manual/docdata/toc.json","line":1,"column":1,"offset":0,"pointer":"","module":"@/c\n\u001B[1m\\xE9\u009B\u007F","set":"Manual","message":"node is 7, not an object; \"c\\n\\x1B[1m\\xE9\\u009B\\x7F\" will be missing from the contents of Manual"}
 {"level":"error","rule":"nothing-to-combine","set":"Manual","message":"no module has a sound index.json, and none a sound toc.json: nothing will be written, and earlier outputs stay"}
-{"summary":{"modules":1,"errors":3,"warnings":0,"notes":0,"missing":{"Manual":{"search":["@/c\n\u001B[1m\\xE9\u009B"],"contents":["@/c\n\u001B[1m\\xE9\u009B"]},"ScriptReference":{"search":[],"contents":[]}}}}
+{"summary":{"modules":1,"errors":3,"warnings":0,"notes":0,"missing":{"Manual":{"search":["@/c\n\u001B[1m\\xE9\u009B\u007F"],"contents":["@/c\n\u001B[1m\\xE9\u009B\u007F"]},"ScriptReference":{"search":[],"contents":[]}}}}
 status 1
 )"},
         {{"@/a/Manual/docdata/toc.json", "@/nowhere", ""},
@@ -644,6 +652,33 @@ TEST(PagemeldCheck, SaysThatMemoryRanOut)
         }
     }
     EXPECT_GT(ended, 5);
+}
+
+TEST(PagemeldCheck, FindingsOfEveryRuleMatchTheExpressionOfTheGuide)
+{
+    const std::string guide = ReadFile(CHECKING_PAGE);
+    const std::size_t start = guide.find("\n    ^") + 5;
+    const std::regex expression(guide.substr(start, guide.find('\n', start) - start));
+    for (const RuleRow& rule : AllRules())
+    {
+        Finding located = Finding::OfFile(rule.id, {0, DocSet::Manual, "a: b/c:7"}, "is [x]: [y]");
+        located.place = ValuePlace{5, 2, 3};
+        located.pointer = "/a: error: [x]";
+        const std::pair<Finding, std::vector<std::string>> cases[] = {
+            {located, {"a: b/c:7", "2", "3"}},
+            {Finding::OfRun(rule.id, "a", "is [x]: [y]"), {"a", "", ""}},
+            {Finding::OfSet(rule.id, DocSet::Manual, "is [x]: [y]"), {"Manual", "", ""}},
+        };
+        for (auto [finding, groups] : cases)
+        {
+            groups.insert(groups.end(), {NameOf(rule.level), "is [x]: [y]", rule.name});
+            const std::string line = TextLine(finding, false);
+            std::smatch match;
+            ASSERT_TRUE(std::regex_search(line, match, expression)) << line;
+            EXPECT_EQ(groups, std::vector<std::string>(match.begin() + 1, match.end())) << line;
+        }
+    }
+    EXPECT_FALSE(std::regex_search(TextSummary({3, {1, 0, 0}, {{{"b"}, {"a", "c"}}, {}}}), expression));
 }
 
 TEST(PagemeldCheck, ExplainsEveryRuleInHelpAndOnItsPage)

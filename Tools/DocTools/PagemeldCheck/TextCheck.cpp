@@ -153,9 +153,9 @@ private:
     FileFindings& m_findings;
 };
 
-void CheckNodes(TextCheck& check, const Value& children, const JsonPointer& pointer);
-
-void CheckNode(TextCheck& check, const Value& node, const JsonPointer& pointer)
+/// Never inlined: its many locals would enlarge the stack frame of the recursion, and a table of contents may
+/// be thousands of levels deep.
+[[gnu::noinline]] void CheckNode(TextCheck& check, const Value& node, const JsonPointer& pointer)
 {
     const Value& link = *FindMember(node, "link");
     check.CheckText(TextKind::Title, "title", *FindMember(node, "title"), {pointer, "title"});
@@ -167,14 +167,18 @@ void CheckNode(TextCheck& check, const Value& node, const JsonPointer& pointer)
     {
         check.CheckText(TextKind::Path, "link", link, {pointer, "link"}); // a NUL cuts "null\0x" to "null"
     }
-    CheckNodes(check, *FindMember(node, "children"), {pointer, "children"});
 }
 
-void CheckNodes(TextCheck& check, const Value& children, const JsonPointer& pointer)
+/// Looks at all entries below a node.
+void CheckChildren(TextCheck& check, const Value& node, const JsonPointer& pointer)
 {
+    const Value& children = *FindMember(node, "children");
+    const JsonPointer list(pointer, "children");
     for (rapidjson::SizeType i = 0; children.IsArray() && i < children.Size(); ++i)
     {
-        CheckNode(check, children[i], {pointer, i});
+        const JsonPointer child(list, i);
+        CheckNode(check, children[i], child);
+        CheckChildren(check, children[i], child);
     }
 }
 
@@ -209,5 +213,5 @@ void CheckTocTexts(const Value& toc, const FileScope& scope, FileFindings& findi
     {
         check.CheckTarget("link", link, {root, "link"});
     }
-    CheckNodes(check, *FindMember(toc, "children"), {root, "children"});
+    CheckChildren(check, toc, root);
 }

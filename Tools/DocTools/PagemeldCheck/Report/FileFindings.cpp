@@ -68,8 +68,10 @@ void FileFindings::AddCounts(Report& report) const
         if (limit != 0 && count > limit)
         {
             const std::size_t hidden = count - limit;
-            report.Add(Finding::OfFile(rule, m_scope.file,
-                                       std::to_string(hidden) + " more of this rule; --limit=0 shows all"));
+            Finding finding = Finding::OfFile(
+                rule, m_scope.file, std::to_string(hidden) + " more of this rule; --limit=0 shows all");
+            finding.more = hidden;
+            report.Add(std::move(finding));
             report.Count(rule, hidden - 1);
         }
     }

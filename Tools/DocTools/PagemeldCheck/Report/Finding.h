@@ -42,6 +42,7 @@ struct Finding
     std::string message;
     std::optional<ValuePlace> place = std::nullopt;
     std::optional<std::string> pointer = std::nullopt;
+    std::size_t more = 0; ///< findings that this one stands for, which are counted and not shown
 };
 
 /// The roots of modules that are missing from the search and from the contents of a set.

@@ -54,6 +54,16 @@ void WriteNames(JsonWriter& writer, const char* name, const std::vector<std::str
     writer.EndArray();
 }
 
+/// Returns JSON with the control character that the library's writer leaves as it is as an escape.
+std::string WithoutDelete(std::string json)
+{
+    for (std::size_t i = json.find('\x7F'); i != std::string::npos; i = json.find('\x7F', i))
+    {
+        json.replace(i, 1, "\\u007F");
+    }
+    return json;
+}
+
 } // namespace
 
 std::string JsonLine(const Finding& finding, const std::vector<std::string>& roots)
@@ -86,9 +96,13 @@ std::string JsonLine(const Finding& finding, const std::vector<std::string>& roo
     {
         WriteMember(writer, "set", NameOf(*finding.set));
     }
+    if (finding.more != 0)
+    {
+        WriteMember(writer, "more", finding.more);
+    }
     WriteMember(writer, "message", finding.message);
     writer.EndObject();
-    return buffer.GetString();
+    return WithoutDelete(buffer.GetString());
 }
 
 std::string JsonSummary(const Summary& summary)
@@ -116,5 +130,5 @@ std::string JsonSummary(const Summary& summary)
     writer.EndObject();
     writer.EndObject();
     writer.EndObject();
-    return buffer.GetString();
+    return WithoutDelete(buffer.GetString());
 }
