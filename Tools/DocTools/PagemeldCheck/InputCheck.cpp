@@ -3,6 +3,7 @@
 #include "Tools/DocTools/PagemeldCheck/Explain/FaultText.h"
 #include "Tools/DocTools/PagemeldCheck/Explain/ParseFailure.h"
 #include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
+#include "Tools/DocTools/PagemeldCheck/NameCheck.h"
 #include "Tools/DocTools/PagemeldCheck/Report/FileFindings.h"
 #include "Tools/DocTools/PagemeldCheck/TextCheck.h"
 #include "Tools/DocTools/VantorPagemeld/Check/IndexStructure.h"
@@ -73,6 +74,7 @@ public:
     bool CheckStructure()
     {
         bool isSound = true;
+        CheckTopMembers(m_document, m_scope.input, m_findings);
         const auto onFault = [&](const FoundFault& found)
         {
             isSound = false;
@@ -90,7 +92,7 @@ public:
     }
 
     /// Looks at the texts of a sound document. Returns what it holds.
-    InputFacts CheckTexts()
+    InputFacts CheckTexts(EarlierModules& earlier)
     {
         InputFacts facts;
         facts.state = InputFacts::State::Sound;
@@ -98,11 +100,14 @@ public:
         {
             facts.commonWords = NamesOf(*FindMember(m_document, "common"));
             CheckIndexTexts(m_document, m_scope, m_findings);
+            CheckWords(m_document, !earlier.hasCommonWords, m_scope, m_findings);
+            earlier.hasCommonWords |= !facts.commonWords.empty();
             return facts;
         }
         facts.rootLink = CStringOf(*FindMember(m_document, "link"));
         facts.rootTitle = CStringOf(*FindMember(m_document, "title"));
         CheckTocTexts(m_document, m_scope, m_findings);
+        earlier.contents.Merge(m_document, m_scope, m_findings);
         return facts;
     }
 
@@ -164,7 +169,8 @@ private:
 };
 
 /// Checks what was read, and returns what it holds.
-InputFacts CheckInputText(const InputText& text, const FileScope& scope, Report& report)
+InputFacts CheckInputText(const InputText& text, const FileScope& scope, EarlierModules& earlier,
+                          Report& report)
 {
     DocumentPool pool;
     rapidjson::Document document(&pool.allocator);
@@ -181,7 +187,7 @@ InputFacts CheckInputText(const InputText& text, const FileScope& scope, Report&
     }
     else if (check.CheckStructure())
     {
-        facts = check.CheckTexts();
+        facts = check.CheckTexts(earlier);
     }
     check.Findings().HandTo(report, text.bytes.get(), document);
     return facts;
@@ -189,12 +195,12 @@ InputFacts CheckInputText(const InputText& text, const FileScope& scope, Report&
 
 } // namespace
 
-InputFacts CheckInput(const FileScope& scope, Report& report)
+InputFacts CheckInput(const FileScope& scope, EarlierModules& earlier, Report& report)
 {
     const InputText text = ReadInputFile(scope.file.path.c_str());
     if (text.outcome == InputText::Outcome::Read)
     {
-        return CheckInputText(text, scope, report);
+        return CheckInputText(text, scope, earlier, report);
     }
     InputFacts facts;
     facts.state = InputFacts::State::Unreadable;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "Tools/DocTools/PagemeldCheck/MergedContents.h"
 #include "Tools/DocTools/PagemeldCheck/Report/Report.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 
@@ -30,9 +31,17 @@ struct InputFacts
     [[nodiscard]] EntryKey Root() const { return {rootLink.c_str(), rootTitle.c_str()}; }
 };
 
+/// What the modules that were checked before have brought to the set.
+struct EarlierModules
+{
+    bool hasCommonWords = false;
+    MergedContents contents;
+};
+
 /// Reads the file of the scope, reports everything that is wrong in it, and returns the outcome. A
-/// file that is missing or can't be read is left to the caller to report.
-InputFacts CheckInput(const FileScope& scope, Report& report);
+/// file that is missing or can't be read is left to the caller to report. Adds what it holds to that of
+/// earlier modules.
+InputFacts CheckInput(const FileScope& scope, EarlierModules& earlier, Report& report);
 
 /// Returns the places of the root's link and title of a toc.json that was sound when it was checked; nothing
 /// if it can't be read any more.

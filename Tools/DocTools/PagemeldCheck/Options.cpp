@@ -24,7 +24,8 @@ ROOT is a module as it would be given to pagemeld, as typed.
 
   -d, --discover=DIR   check what "pagemeld -autopaths DIR" would take; also
                        report what is passed over
-  -t, --targets        check that pages and contents lead to files that exist
+  -t, --targets        check that pages and contents lead to files that exist,
+                       and that pages have entries
   -o, --outputs        after a run: check that outputs are there, whole,
                        current and equal
   -f, --format=FORMAT  "text" (default), or "json": one object per line

@@ -31,9 +31,9 @@ bool IsThere(const std::string& path)
     return status.Exists() || status.Error() == EACCES;
 }
 
-InputFacts CheckFile(const FileScope& scope, Report& report)
+InputFacts CheckFile(const FileScope& scope, EarlierModules& earlier, Report& report)
 {
-    InputFacts facts = CheckInput(scope, report);
+    InputFacts facts = CheckInput(scope, earlier, report);
     if (facts.state == InputFacts::State::Unreadable && !IsThere(scope.file.path))
     {
         facts.state = InputFacts::State::Missing;
@@ -53,11 +53,11 @@ void ReportUnreadable(const FileScope& scope, const InputFacts& facts, Report& r
     }
 }
 
-void CheckModule(SetModule& module, Report& report)
+void CheckModule(SetModule& module, EarlierModules& earlier, Report& report)
 {
     for (const auto& input : kInputs)
     {
-        module.FactsOf(input.id) = CheckFile(module.ScopeOf(input.id), report);
+        module.FactsOf(input.id) = CheckFile(module.ScopeOf(input.id), earlier, report);
     }
     if (!module.HasFiles())
     {
@@ -132,11 +132,12 @@ void NoteMissing(const Modules& modules, MissingModules& missing)
 void CheckSet(DocSet set, const std::vector<std::string>& roots, const CheckOptions& options, Report& report)
 {
     Modules modules = ModulesOf(set, roots, options);
+    EarlierModules earlier;
     for (SetModule& module : modules)
     {
         if (module.hasDocdata)
         {
-            CheckModule(module, report);
+            CheckModule(module, earlier, report);
         }
     }
     CheckContentRoots(modules, report);

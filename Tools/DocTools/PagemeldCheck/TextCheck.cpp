@@ -3,9 +3,9 @@
 #include "Tools/DocTools/PagemeldCheck/Browse/ScriptLiteral.h"
 #include "Tools/DocTools/PagemeldCheck/Browse/WebPath.h"
 #include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
+#include "Tools/DocTools/PagemeldCheck/TargetCheck.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 #include "Tools/DocTools/VantorPagemeld/Render/TextBuffer.h"
-#include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
 
 namespace
 {
@@ -19,44 +19,30 @@ enum class TextKind
     Path,
 };
 
-bool IsFile(const std::string& path)
-{
-    const FileStatus status = FileStatus::Of(path);
-    return status.Exists() && !status.IsDirectory();
-}
-
-/// Whether a link leads to a file below the directory, without what begins with "#" or "?": as it is, or
-/// percent-decoded.
-bool LeadsToFile(const std::string& directory, const std::string& link)
-{
-    const std::string path = link.substr(0, link.find_first_of("#?"));
-    return IsFile(directory + "/" + path) || IsFile(directory + "/" + PercentDecoded(path));
-}
-
-/// Whether the link is an absolute URL. "std::list.html" is a file.
-bool IsAddress(std::string_view link)
-{
-    return HasScheme(link) && link.substr(link.find(':'), 2) != "::";
-}
-
 /// Looks at the texts of one file.
 class TextCheck
 {
 public:
     TextCheck(Output script, const FileScope& scope, FileFindings& findings)
-        : m_script(RowOf(kOutputs, script).name), m_scope(scope), m_findings(findings)
+        : m_script(RowOf(kOutputs, script).name),
+          m_scope(scope),
+          m_findings(findings),
+          m_targets(scope, findings)
     {
     }
 
-    /// pagePath is that of the page whose title this is; null for other texts.
-    void CheckText(TextKind kind, const char* name, const Value& text, const JsonPointer& pointer,
-                   const Value* pagePath = nullptr)
+    TargetCheck& Targets() { return m_targets; }
+
+    /// Returns what the script has for the text, if that is another one. pagePath is that of the page whose
+    /// title this is; null for other texts.
+    std::optional<std::string> CheckText(TextKind kind, const char* name, const Value& text,
+                                         const JsonPointer& pointer, const Value* pagePath = nullptr)
     {
         if (!NeedsLook(kind, BytesOf(text)))
         {
-            return;
+            return std::nullopt;
         }
-        const std::optional<std::string> value = ValueOfScriptLiteral(LiteralOf(kind, text));
+        std::optional<std::string> value = ValueOfScriptLiteral(LiteralOf(kind, text));
         const auto named = [&]
         {
             return std::string(name) + " " + Quote(BytesOf(text)) +
@@ -74,56 +60,33 @@ public:
                                   {
                                       return named() + " is " + Quote(*value) + " in " + m_script +
                                              (kind == TextKind::Title ? ": readers see that"
-                                                                      : ": the link is dead");
+                                                                      : ": readers are led there");
                                   });
         }
+        return value;
     }
 
     /// A page path, or a link below the root, which the scripts put a prefix before.
     void CheckLink(const char* name, const Value& link, const JsonPointer& pointer)
     {
-        CheckText(TextKind::Path, name, link, pointer);
-        if (IsAddress(BytesOf(link)))
+        const std::optional<std::string> other = CheckText(TextKind::Path, name, link, pointer);
+        const std::string_view path = other ? *other : BytesOf(link);
+        const bool isAddress = IsAddress(path);
+        if (isAddress || (IsDoubtful(path) && !m_scope.options.checksTargets))
         {
             m_findings.AddAtValue(Rule::PrefixedUrl, link, pointer,
                                   [&]
                                   {
                                       return std::string(name) + " " + Quote(BytesOf(link)) +
-                                             " gets the module's prefix, and is dead without the page script";
+                                             " gets the module's prefix, and is dead " +
+                                             (isAddress
+                                                  ? "without the page script"
+                                                  : "unless a file has that name, which --targets checks");
                                   });
         }
         else
         {
-            CheckTarget(name, link, pointer);
-        }
-    }
-
-    void CheckTarget(const char* name, const Value& link, const JsonPointer& pointer)
-    {
-        if (m_scope.options.checksTargets && !IsAddress(BytesOf(link)) &&
-            !LeadsToFile(m_scope.directory.Text(), CStringOf(link)))
-        {
-            m_findings.AddAtValue(Rule::MissingTarget, link, pointer,
-                                  [&] {
-                                      return std::string(name) + " " + Quote(BytesOf(link)) +
-                                             " leads to no file: the link is dead";
-                                  });
-        }
-    }
-
-    void CheckNames(const Value& object, const char* kind, const JsonPointer& pointer)
-    {
-        for (const auto& member : object.GetObject())
-        {
-            if (BytesOf(member.name) == "__proto__")
-            {
-                m_findings.AddAtValue(
-                    Rule::SpecialTerm, member.value, {pointer, BytesOf(member.name)},
-                    [&] {
-                        return std::string(kind) +
-                               " \"__proto__\" sets a prototype in the scripts: readers do not find it";
-                    });
-            }
+            m_targets.Check(name, link, pointer, path);
         }
     }
 
@@ -133,6 +96,12 @@ public:
     }
 
 private:
+    /// Whether a path may be the address of something outside. "std::list.html" is a file.
+    static bool IsDoubtful(std::string_view path)
+    {
+        return HasScheme(path) && path.substr(path.find(':'), 2) != "::";
+    }
+
     /// Cheap pre-check, false for nearly all texts.
     static bool NeedsLook(TextKind kind, std::string_view text)
     {
@@ -151,6 +120,7 @@ private:
     const char* m_script;
     const FileScope& m_scope;
     FileFindings& m_findings;
+    TargetCheck m_targets;
 };
 
 /// Never inlined: its many locals would enlarge the stack frame of the recursion, and a table of contents may
@@ -197,8 +167,7 @@ void CheckIndexTexts(const Value& index, const FileScope& scope, FileFindings& f
         check.CheckLink("page path", path, {page, 0U});
         check.CheckText(TextKind::Title, "title", pages[i][1], {page, 1U}, &path);
     }
-    check.CheckNames(*FindMember(index, "common"), "common word", {root, "common"});
-    check.CheckNames(*FindMember(index, "searchIndex"), "term", {root, "searchIndex"});
+    check.Targets().ReportUnreached();
 }
 
 void CheckTocTexts(const Value& toc, const FileScope& scope, FileFindings& findings)
@@ -208,10 +177,11 @@ void CheckTocTexts(const Value& toc, const FileScope& scope, FileFindings& findi
     const Value& link = *FindMember(toc, "link");
     // The root's link is escaped as a title is, and gets no prefix.
     check.CheckText(TextKind::Title, "title", *FindMember(toc, "title"), {root, "title"});
-    check.CheckText(TextKind::Title, "link", link, {root, "link"});
-    if (std::string_view(CStringOf(link)) != "null")
+    const std::optional<std::string> other = check.CheckText(TextKind::Title, "link", link, {root, "link"});
+    const std::string_view path = other ? *other : BytesOf(link);
+    if (path != "null" && !IsAddress(path))
     {
-        check.CheckTarget("link", link, {root, "link"});
+        check.Targets().Check("link", link, {root, "link"}, path);
     }
     CheckChildren(check, toc, root);
 }

@@ -144,6 +144,36 @@ bool HasScheme(std::string_view link)
     return IsLetter(cleaned.front()) && *end == ':';
 }
 
+bool IsAddress(std::string_view link)
+{
+    constexpr std::string_view kSchemes[] = {"http:", "https:", "ftp:", "mailto:"};
+    const auto isSameLetter = [](char a, char b) { return (IsLetter(a) ? a | 0x20 : a) == b; };
+    return std::any_of(std::begin(kSchemes), std::end(kSchemes),
+                       [&](std::string_view scheme)
+                       {
+                           const std::string_view start = link.substr(0, scheme.size());
+                           return std::equal(start.begin(), start.end(), scheme.begin(), scheme.end(),
+                                             isSameLetter);
+                       });
+}
+
+std::string PercentEncoded(std::string_view path)
+{
+    constexpr std::string_view kDigits = "0123456789ABCDEF";
+    std::string encoded;
+    for (const char c : path)
+    {
+        const auto byte = static_cast<unsigned char>(c);
+        if (byte > ' ' && c != '%' && c != '?' && c != '\\')
+        {
+            encoded += c;
+            continue;
+        }
+        encoded += {'%', kDigits[byte >> 4U], kDigits[byte & 0xFU]};
+    }
+    return encoded;
+}
+
 std::string PercentDecoded(std::string_view path)
 {
     std::string decoded;

@@ -37,6 +37,14 @@
 /// "+", "-" and ".", and a colon. A file name such as "std::list.html" is one too.
 [[nodiscard]] bool HasScheme(std::string_view link);
 
+/// Whether the page script takes the link for an address outside of the documentation: one of http, https,
+/// ftp and mailto, in any case. It takes all else for a path.
+[[nodiscard]] bool IsAddress(std::string_view link);
+
+/// Returns the path of a file as the page script asks for it: with "%" and two digits for each space, control
+/// character, "%", "?" and backslash.
+[[nodiscard]] std::string PercentEncoded(std::string_view path);
+
 /// Returns the path with the bytes that "%41" and the like stand for. A "%" without two hexadecimal digits
 /// after it stays.
 [[nodiscard]] std::string PercentDecoded(std::string_view path);

@@ -30,6 +30,9 @@ public:
         }
     }
 
+    /// Adds what is wrong with the file as a whole.
+    void Add(Rule rule, std::string message);
+
     /// Adds what is wrong at a byte of the text.
     void AddAtOffset(Rule rule, std::size_t offset, std::string message);
 

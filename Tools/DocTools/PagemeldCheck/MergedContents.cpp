@@ -1,0 +1,109 @@
+#include "Tools/DocTools/PagemeldCheck/MergedContents.h"
+
+#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
+#include "Tools/DocTools/VantorPagemeld/Merge/SipHash.h"
+#include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
+
+#include <cstring>
+#include <string_view>
+#include <utility>
+
+// Only one document is in memory at a time, and the merged tree would take as much as all of them. So an
+// entry is kept as a hash of the way to it. Two ways with the same 64 bits would be taken for one: with ten
+// million entries the odds are one to 400,000.
+//
+// A list that comes to an entry without one is taken over whole, twins and all. Later look-ups find the first
+// twin only, so nothing can be merged with what is below the others. Whatever comes to a list goes in one by
+// one.
+
+using rapidjson::Value;
+
+namespace
+{
+
+bool HasPage(const Value& node)
+{
+    return std::strcmp(CStringOf(*FindMember(node, "link")), "null") != 0;
+}
+
+} // namespace
+
+void MergedContents::Merge(const Value& toc, const FileScope& scope, FileFindings& findings)
+{
+    const Source source = {static_cast<std::uint32_t>(m_moduleNames.size()), scope, findings};
+    const std::uint64_t way = WayTo(0, toc);
+    const std::uint32_t root = m_entries.empty() ? Add(way, source.module) : Find(way);
+    if (root != PositionTable::kNotFound)
+    {
+        m_moduleNames.push_back(scope.moduleName);
+        MergeChildren(source, toc, JsonPointer(), root, false);
+    }
+}
+
+std::uint64_t MergedContents::WayTo(std::uint64_t parent, const Value& node)
+{
+    m_key.assign(reinterpret_cast<const char*>(&parent), sizeof parent);
+    m_key.append(CStringOf(*FindMember(node, "link"))).push_back('\0');
+    m_key.append(CStringOf(*FindMember(node, "title")));
+    return KeyedHash(m_key);
+}
+
+std::uint32_t MergedContents::Find(std::uint64_t way) const
+{
+    return m_positions.Find(way, [&](std::uint32_t position) { return m_entries[position].way == way; });
+}
+
+std::uint32_t MergedContents::Add(std::uint64_t way, std::uint32_t module)
+{
+    const auto position = static_cast<std::uint32_t>(m_entries.size());
+    m_entries.push_back({way, module, false});
+    m_positions.Add(way);
+    return position;
+}
+
+void MergedContents::MergeChildren(const Source& source, const Value& node, const JsonPointer& pointer,
+                                   std::uint32_t position, bool isHidden)
+{
+    const Value& children = *FindMember(node, "children");
+    if (!children.IsArray())
+    {
+        return;
+    }
+    const bool isTakenWhole = !std::exchange(m_entries[position].hasList, true);
+    const JsonPointer list(pointer, "children");
+    for (rapidjson::SizeType i = 0; i < children.Size(); ++i)
+    {
+        const JsonPointer child(list, i);
+        const std::uint64_t way = WayTo(m_entries[position].way, children[i]);
+        const std::uint32_t known = Find(way);
+        if (known == PositionTable::kNotFound)
+        {
+            MergeChildren(source, children[i], child, Add(way, source.module), isHidden);
+        }
+        else if (!isTakenWhole)
+        {
+            const Entry winner = m_entries[known];
+            const bool isFirstHidden = !isHidden && winner.module != source.module && HasPage(children[i]);
+            if (isFirstHidden)
+            {
+                Report(source, children[i], child, winner);
+            }
+            MergeChildren(source, children[i], child, known, isHidden || isFirstHidden);
+        }
+    }
+}
+
+void MergedContents::Report(const Source& source, const Value& node, const JsonPointer& pointer,
+                            const Entry& winner) const
+{
+    source.findings.AddAtValue(
+        Rule::ShadowedEntry, node, pointer,
+        [&]
+        {
+            const std::size_t quoteSize = source.scope.options.quoteSize;
+            const std::string& name = m_moduleNames[winner.module];
+            return name + " has the same entry, " + Quoted(BytesOf(*FindMember(node, "title")), quoteSize) +
+                   " with the link " + Quoted(BytesOf(*FindMember(node, "link")), quoteSize) +
+                   ": in the contents it leads to the page of " + name + ", and not to this module's";
+        });
+}

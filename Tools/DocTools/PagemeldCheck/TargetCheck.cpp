@@ -1,0 +1,127 @@
+#include "Tools/DocTools/PagemeldCheck/TargetCheck.h"
+
+#include "Tools/DocTools/PagemeldCheck/Browse/WebPath.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
+#include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
+#include "Tools/DocTools/VantorPagemeld/System/DirectoryListing.h"
+#include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
+
+#include <algorithm>
+#include <vector>
+
+// A path is the name of a file, in which only "#" has a meaning. Nothing in it is encoded: the page script
+// does that.
+
+namespace
+{
+
+/// Returns the name of the file that was meant, if the path was written as a part of a URL.
+std::string NameInUrl(std::string_view path)
+{
+    return PercentDecoded(path.substr(0, path.find_first_of("#?")));
+}
+
+bool IsFile(const FileStatus& status)
+{
+    return status.Exists() && !status.IsDirectory();
+}
+
+bool IsPage(std::string_view name)
+{
+    const std::string_view end = name.substr(std::min(name.rfind('.'), name.size()));
+    return end == ".html" || end == ".htm";
+}
+
+/// Calls visit with the path of every HTML file below a directory. Takes no hidden names and follows no links
+/// to directories.
+template <typename Visit>
+void VisitPages(const std::string& directory, const Visit& visit)
+{
+    std::vector<std::string> left = {directory};
+    while (!left.empty())
+    {
+        const std::string current = std::move(left.back());
+        left.pop_back();
+        for (const dirent* entry : SortedListing(current.c_str()))
+        {
+            const std::string path = current + "/" + entry->d_name;
+            if (entry->d_name[0] == '.')
+            {
+                continue;
+            }
+            if (IsDirectoryItself(*entry, path))
+            {
+                left.push_back(path);
+            }
+            else if (IsPage(entry->d_name))
+            {
+                visit(path);
+            }
+        }
+    }
+}
+
+} // namespace
+
+void TargetCheck::Check(const char* name, const rapidjson::Value& link, const JsonPointer& pointer,
+                        std::string_view path)
+{
+    if (!m_scope.options.checksTargets)
+    {
+        return;
+    }
+    const std::string file(path.substr(0, path.find('#')));
+    if (Reach(file))
+    {
+        return;
+    }
+    m_findings.AddAtValue(
+        Rule::MissingTarget, link, pointer,
+        [&]
+        {
+            const std::size_t quoteSize = m_scope.options.quoteSize;
+            const std::string meant = NameInUrl(path);
+            return std::string(name) + " " + Quoted(BytesOf(link), quoteSize) + " leads to no file: " +
+                   (meant != file && IsFile(FileStatus::Of(m_scope.directory.File(meant)))
+                        ? "the page script asks for " + Quoted(PercentEncoded(file), quoteSize) +
+                              "; the file is " + Quoted(meant, quoteSize)
+                        : "the link is dead");
+        });
+}
+
+void TargetCheck::ReportUnreached()
+{
+    if (!m_scope.options.checksTargets)
+    {
+        return;
+    }
+    std::string first;
+    std::size_t count = 0;
+    const std::string& directory = m_scope.directory.Text();
+    VisitPages(directory,
+               [&](const std::string& path)
+               {
+                   const FileStatus page = FileStatus::Of(path);
+                   if (m_reached.count({page.Details().st_dev, page.Details().st_ino}) == 0 && count++ == 0)
+                   {
+                       first = path.substr(directory.size() + 1);
+                   }
+               });
+    if (count > 0)
+    {
+        m_findings.Add(Rule::UnlistedPage,
+                       "pages of the set without an entry, which the search does not find: " +
+                           std::to_string(count) + ", first " + Quoted(first, m_scope.options.quoteSize));
+    }
+}
+
+/// Whether a file has the path below the set's directory.
+bool TargetCheck::Reach(const std::string& path)
+{
+    const FileStatus status = FileStatus::Of(m_scope.directory.File(path));
+    if (IsFile(status))
+    {
+        m_reached.emplace(status.Details().st_dev, status.Details().st_ino);
+    }
+    return IsFile(status);
+}

@@ -1,0 +1,33 @@
+#pragma once
+
+#include "Tools/DocTools/PagemeldCheck/Report/FileFindings.h"
+
+#include <set>
+#include <string>
+#include <string_view>
+#include <utility>
+
+#include <sys/types.h>
+
+/// Checks where the page paths and links of one file lead, if that is asked for.
+class TargetCheck
+{
+public:
+    TargetCheck(const FileScope& scope, FileFindings& findings) : m_scope(scope), m_findings(findings) {}
+
+    /// Checks a page path or link, called by name, that the scripts hold as path.
+    void Check(const char* name, const rapidjson::Value& link, const JsonPointer& pointer,
+               std::string_view path);
+
+    /// Counts the HTML files below the set's directory to which no path has led.
+    void ReportUnreached();
+
+private:
+    using FileId = std::pair<dev_t, ino_t>;
+
+    bool Reach(const std::string& path);
+
+    const FileScope& m_scope;
+    FileFindings& m_findings;
+    std::set<FileId> m_reached;
+};
