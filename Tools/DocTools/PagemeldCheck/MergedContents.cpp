@@ -26,6 +26,20 @@ bool HasPage(const Value& node)
     return std::strcmp(CStringOf(*FindMember(node, "link")), "null") != 0;
 }
 
+/// Returns the hash of a way that goes on with a text.
+std::uint64_t Extended(std::uint64_t way, const char* text)
+{
+    constexpr std::uint64_t kGoldenRatio = 0x9E3779B97F4A7C15; // in 64 bits, so that all of them spread
+    const std::uint64_t product = (way ^ KeyedHash(text)) * kGoldenRatio;
+    return product ^ product >> 32U;
+}
+
+std::uint64_t WayTo(std::uint64_t parent, const Value& node)
+{
+    return Extended(Extended(parent, CStringOf(*FindMember(node, "link"))),
+                    CStringOf(*FindMember(node, "title")));
+}
+
 } // namespace
 
 void MergedContents::Merge(const Value& toc, const FileScope& scope, FileFindings& findings)
@@ -38,14 +52,6 @@ void MergedContents::Merge(const Value& toc, const FileScope& scope, FileFinding
         m_moduleNames.push_back(scope.moduleName);
         MergeChildren(source, toc, JsonPointer(), root, false);
     }
-}
-
-std::uint64_t MergedContents::WayTo(std::uint64_t parent, const Value& node)
-{
-    m_key.assign(reinterpret_cast<const char*>(&parent), sizeof parent);
-    m_key.append(CStringOf(*FindMember(node, "link"))).push_back('\0');
-    m_key.append(CStringOf(*FindMember(node, "title")));
-    return KeyedHash(m_key);
 }
 
 std::uint32_t MergedContents::Find(std::uint64_t way) const

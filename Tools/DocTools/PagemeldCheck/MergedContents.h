@@ -36,7 +36,6 @@ private:
         FileFindings& findings;
     };
 
-    [[nodiscard]] std::uint64_t WayTo(std::uint64_t parent, const rapidjson::Value& node);
     [[nodiscard]] std::uint32_t Find(std::uint64_t way) const;
     std::uint32_t Add(std::uint64_t way, std::uint32_t module);
     void MergeChildren(const Source& source, const rapidjson::Value& node, const JsonPointer& pointer,
@@ -47,5 +46,4 @@ private:
     std::vector<std::string> m_moduleNames;
     std::vector<Entry> m_entries;
     PositionTable m_positions;
-    std::string m_key; ///< kept for its memory
 };

@@ -1,5 +1,6 @@
 #include "Tools/DocTools/PagemeldCheck/NameCheck.h"
 
+#include "Tools/DocTools/PagemeldCheck/ByteSet.h"
 #include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 
@@ -12,16 +13,12 @@ using rapidjson::Value;
 
 constexpr std::string_view kPrototype = "__proto__";
 
-/// Whether a page, which splits queries into words in lower case, can look the term up. Bytes above 0x7F pass
-/// as letters.
+/// Whether pages can look the term up, which split queries into words in lower case. Bytes above 0x7F pass as
+/// letters.
 bool IsWord(std::string_view term)
 {
-    return !term.empty() && std::all_of(term.begin(), term.end(),
-                                        [](char c)
-                                        {
-                                            return (c >= 'a' && c <= 'z') || (c >= '0' && c <= '9') ||
-                                                   c == '_' || static_cast<unsigned char>(c) > 0x7F;
-                                        });
+    static constexpr ByteSet kInWords = ByteSet("_").With('a', 'z').With('0', '9').With(0x80, 0xFF);
+    return !term.empty() && kInWords.HasAllOf(term);
 }
 
 void ReportPrototype(const std::string& kind, const Value& value, const JsonPointer& parent,

@@ -2,6 +2,7 @@
 
 #include "Tools/DocTools/PagemeldCheck/Browse/ScriptLiteral.h"
 #include "Tools/DocTools/PagemeldCheck/Browse/WebPath.h"
+#include "Tools/DocTools/PagemeldCheck/ByteSet.h"
 #include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/PagemeldCheck/TargetCheck.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
@@ -72,7 +73,7 @@ public:
         const std::optional<std::string> other = CheckText(TextKind::Path, name, link, pointer);
         const std::string_view path = other ? *other : BytesOf(link);
         const bool isAddress = IsAddress(path);
-        if (isAddress || (IsDoubtful(path) && !m_scope.options.checksTargets))
+        if (isAddress || (!m_scope.options.checksTargets && IsDoubtful(path)))
         {
             m_findings.AddAtValue(Rule::PrefixedUrl, link, pointer,
                                   [&]
@@ -105,9 +106,9 @@ private:
     /// Cheap pre-check, false for nearly all texts.
     static bool NeedsLook(TextKind kind, std::string_view text)
     {
-        constexpr std::string_view kSpecial("\\\n\r\0\"", 5);
-        return text.find_first_of(kSpecial.substr(0, kind == TextKind::Title ? 4 : 5)) !=
-               std::string_view::npos;
+        static constexpr ByteSet kInTitles(std::string_view("\\\n\r\0", 4));
+        static constexpr ByteSet kInPaths(std::string_view("\\\n\r\0\"", 5));
+        return (kind == TextKind::Title ? kInTitles : kInPaths).HasAnyOf(text);
     }
 
     static std::string LiteralOf(TextKind kind, const Value& text)

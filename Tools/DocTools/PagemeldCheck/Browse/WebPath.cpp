@@ -146,15 +146,16 @@ bool HasScheme(std::string_view link)
 
 bool IsAddress(std::string_view link)
 {
-    constexpr std::string_view kSchemes[] = {"http:", "https:", "ftp:", "mailto:"};
-    const auto isSameLetter = [](char a, char b) { return (IsLetter(a) ? a | 0x20 : a) == b; };
-    return std::any_of(std::begin(kSchemes), std::end(kSchemes),
-                       [&](std::string_view scheme)
-                       {
-                           const std::string_view start = link.substr(0, scheme.size());
-                           return std::equal(start.begin(), start.end(), scheme.begin(), scheme.end(),
-                                             isSameLetter);
-                       });
+    constexpr std::string_view kSchemes[] = {"http", "https", "ftp", "mailto"};
+    const std::size_t colon = link.find(':');
+    if (colon == std::string_view::npos)
+    {
+        return false;
+    }
+    std::string scheme(link.substr(0, colon));
+    std::transform(scheme.begin(), scheme.end(), scheme.begin(),
+                   [](char c) { return IsLetter(c) ? static_cast<char>(c | 0x20) : c; });
+    return std::find(std::begin(kSchemes), std::end(kSchemes), scheme) != std::end(kSchemes);
 }
 
 std::string PercentEncoded(std::string_view path)
