@@ -1,5 +1,6 @@
 #include "Tools/DocTools/PagemeldCheck/LinkCheck.h"
 
+#include "Tools/DocTools/PagemeldCheck/Browse/ScriptLiteral.h"
 #include "Tools/DocTools/PagemeldCheck/Browse/WebPath.h"
 #include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"
@@ -26,17 +27,39 @@ struct WrongLinks
 {
     std::size_t first = 0; ///< the first root that is not reached
     std::size_t count = 0;
-    std::string reached; ///< instead of the first; empty if it is not a directory at all
+    std::string reached;    ///< instead of the first; empty if it is not a directory at all
+    bool isHandled = false; ///< whether the page script, which encodes prefixes, gets to the first
 };
+
+/// Returns the prefix from one root to another as the scripts have it, or nothing if it breaks them.
+std::optional<std::string> PrefixInScripts(const RootPath& from, const RootPath& to)
+{
+    return ValueOfScriptLiteral("\"" + RelativePrefix(from.module.Text(), to.module.AsLinkTarget()) + "\"");
+}
+
+/// Returns the prefix as the page script asks for it.
+std::string EncodedPrefix(const std::string& prefix)
+{
+    std::string encoded;
+    for (const char c : PercentEncoded(prefix))
+    {
+        encoded += c == '#' ? std::string("%23") : std::string(1, c);
+    }
+    return encoded;
+}
 
 WrongLinks FindWrongLinksFromRoot(const std::vector<RootPath>& paths, std::size_t from)
 {
     WrongLinks wrong;
     for (std::size_t to = 0; to < paths.size(); ++to)
     {
-        const std::string prefix = RelativePrefix(paths[from].module.Text(), paths[to].module.AsLinkTarget());
-        const std::optional<std::string> reached = FollowLink(paths[from].module.Text(), prefix);
-        if (to == from || reached == paths[to].webPath)
+        const std::optional<std::string> prefix = PrefixInScripts(paths[from], paths[to]);
+        if (to == from || !prefix) // which is a fault of the other root
+        {
+            continue;
+        }
+        const std::optional<std::string> reached = FollowLink(paths[from].module.Text(), *prefix);
+        if (reached == paths[to].webPath)
         {
             continue;
         }
@@ -44,6 +67,8 @@ WrongLinks FindWrongLinksFromRoot(const std::vector<RootPath>& paths, std::size_
         {
             wrong.first = to;
             wrong.reached = reached.value_or("");
+            wrong.isHandled =
+                FollowLink(paths[from].module.Text(), EncodedPrefix(*prefix)) == paths[to].webPath;
         }
     }
     return wrong;
@@ -92,7 +117,8 @@ std::string DescribeWrongLinks(const std::vector<std::string>& roots, std::size_
     const std::string others = wrong.count > 1 ? " and " + std::to_string(wrong.count - 1) + " more" : "";
     const std::string lead =
         wrong.reached.empty() ? " will lead elsewhere" : " will lead to " + DisplayedWebPath(wrong.reached);
-    return "links to " + Visible(to) + others + lead + ": " + Remedy(roots[from], to);
+    return "links to " + Visible(to) + others + lead + (wrong.isHandled ? " without the page script" : "") +
+           ": " + Remedy(roots[from], to);
 }
 
 /// Returns the first root in whose scripts the prefix to another one breaks the string, or nothing.
@@ -100,8 +126,7 @@ std::optional<std::size_t> FindUnnamable(const std::vector<RootPath>& paths, std
 {
     for (std::size_t from = 0; from < paths.size(); ++from)
     {
-        const std::string prefix = RelativePrefix(paths[from].module.Text(), paths[to].module.AsLinkTarget());
-        if (prefix.find_first_of("\"\\\n\r") != std::string::npos)
+        if (!PrefixInScripts(paths[from], paths[to]))
         {
             return from;
         }

@@ -21,15 +21,16 @@ std::string NameInUrl(std::string_view path)
     return PercentDecoded(path.substr(0, path.find_first_of("#?")));
 }
 
-bool IsFile(const FileStatus& status)
-{
-    return status.Exists() && !status.IsDirectory();
-}
-
 bool IsPage(std::string_view name)
 {
     const std::string_view end = name.substr(std::min(name.rfind('.'), name.size()));
     return end == ".html" || end == ".htm";
+}
+
+std::pair<dev_t, ino_t> IdOf(const std::string& path)
+{
+    const FileStatus status = FileStatus::Of(path);
+    return {status.Details().st_dev, status.Details().st_ino};
 }
 
 /// Calls visit with the path of every HTML file below a directory. Takes no hidden names and follows no links
@@ -70,23 +71,12 @@ void TargetCheck::Check(const char* name, const rapidjson::Value& link, const Js
     {
         return;
     }
-    const std::string file(path.substr(0, path.find('#')));
-    if (Reach(file))
+    const std::string problem = ProblemOf(path);
+    if (!problem.empty())
     {
-        return;
+        m_findings.AddAtValue(Rule::MissingTarget, link, pointer,
+                              [&] { return std::string(name) + " " + Quote(BytesOf(link)) + " " + problem; });
     }
-    m_findings.AddAtValue(
-        Rule::MissingTarget, link, pointer,
-        [&]
-        {
-            const std::size_t quoteSize = m_scope.options.quoteSize;
-            const std::string meant = NameInUrl(path);
-            return std::string(name) + " " + Quoted(BytesOf(link), quoteSize) + " leads to no file: " +
-                   (meant != file && IsFile(FileStatus::Of(m_scope.directory.File(meant)))
-                        ? "the page script asks for " + Quoted(PercentEncoded(file), quoteSize) +
-                              "; the file is " + Quoted(meant, quoteSize)
-                        : "the link is dead");
-        });
 }
 
 void TargetCheck::ReportUnreached()
@@ -101,8 +91,7 @@ void TargetCheck::ReportUnreached()
     VisitPages(directory,
                [&](const std::string& path)
                {
-                   const FileStatus page = FileStatus::Of(path);
-                   if (m_reached.count({page.Details().st_dev, page.Details().st_ino}) == 0 && count++ == 0)
+                   if (m_reached.count(IdOf(path)) == 0 && count++ == 0)
                    {
                        first = path.substr(directory.size() + 1);
                    }
@@ -111,17 +100,47 @@ void TargetCheck::ReportUnreached()
     {
         m_findings.Add(Rule::UnlistedPage,
                        "pages of the set without an entry, which the search does not find: " +
-                           std::to_string(count) + ", first " + Quoted(first, m_scope.options.quoteSize));
+                           std::to_string(count) + ", first " + Quote(first));
     }
 }
 
-/// Whether a file has the path below the set's directory.
-bool TargetCheck::Reach(const std::string& path)
+/// Returns why readers don't get to a file by the path, or an empty text.
+std::string TargetCheck::ProblemOf(std::string_view path)
 {
-    const FileStatus status = FileStatus::Of(m_scope.directory.File(path));
-    if (IsFile(status))
+    const std::string file(path.substr(0, path.find('#')));
+    const std::string inUrl = NameInUrl(path);
+    if (Reach(file))
     {
-        m_reached.emplace(status.Details().st_dev, status.Details().st_ino);
+        return inUrl == file ? ""
+                             : "leads to " + Quote(inUrl) + " without the page script, which encodes names";
     }
-    return IsFile(status);
+    const std::string lost = "leads to no file: ";
+    if (IsFile(inUrl))
+    {
+        return lost + "the page script asks for " + Quote(PercentEncoded(file)) + "; the file is " +
+               Quote(inUrl);
+    }
+    return lost + (IsFile(path) ? "\"#\" ends its name; rename it" : "the link is dead");
+}
+
+bool TargetCheck::Reach(std::string_view name)
+{
+    const bool isFile = IsFile(name);
+    if (isFile)
+    {
+        m_reached.insert(IdOf(m_scope.directory.File(std::string(name))));
+    }
+    return isFile;
+}
+
+/// Whether a file has the name below the set's directory.
+bool TargetCheck::IsFile(std::string_view name) const
+{
+    const FileStatus status = FileStatus::Of(m_scope.directory.File(std::string(name)));
+    return status.Exists() && !status.IsDirectory();
+}
+
+std::string TargetCheck::Quote(std::string_view text) const
+{
+    return Quoted(text, m_scope.options.quoteSize);
 }

@@ -23,11 +23,12 @@ public:
     void ReportUnreached();
 
 private:
-    using FileId = std::pair<dev_t, ino_t>;
-
-    bool Reach(const std::string& path);
+    [[nodiscard]] std::string ProblemOf(std::string_view path);
+    [[nodiscard]] bool Reach(std::string_view name);
+    [[nodiscard]] bool IsFile(std::string_view name) const;
+    [[nodiscard]] std::string Quote(std::string_view text) const;
 
     const FileScope& m_scope;
     FileFindings& m_findings;
-    std::set<FileId> m_reached;
+    std::set<std::pair<dev_t, ino_t>> m_reached; ///< files, by device and number
 };
