@@ -118,4 +118,12 @@ TEST(WebPath, KnowsLinksWithAScheme)
     {
         EXPECT_FALSE(HasScheme(link)) << link;
     }
+    for (const char* link : {"http://h", "HttpS:h", "ftp:", "mailto:a@b"})
+    {
+        EXPECT_TRUE(IsAddress(link)) << link;
+    }
+    for (const char* link : {"", "http", "javascript:a", "File:a.html", " http://h", "x/http:", "httpS\x1A:"})
+    {
+        EXPECT_FALSE(IsAddress(link)) << link;
+    }
 }
