@@ -133,7 +133,7 @@
         }
         const names = new Map(["", ...prefixes].map((prefix) => [prefix, nameOf(addressOf(prefix, [prefix], folder), -3)]));
         const set = nameOf(folder, -2);
-        const steps = prepareIndex({ ...values, prefixes });
+        const steps = prepareIndex(values, prefixes);
         for (let end = performance.now() + SLICE, step; ;) {
             step = steps.next();
             if (step.done) {
@@ -152,14 +152,14 @@
     function createResult(page) {
         const { lookup } = page.weighed;
         const { folder, prefixes, set } = sourceOf(lookup);
-        const shown = indexes[0].search.describePage(page, found.details);
+        const shown = indexes[0].search.describePage(page, found.query);
         const linkTo = ({ link, title }) => createLink(link, title, prefixes, folder);
         const source = indexes.length > 1 ? `${moduleOf(lookup, page.page)}, ${set}` : moduleOf(lookup, page.page);
         const places = shown.places.map((place) => create("li", {}, linkTo(place)));
         const result = create("li", {}, linkTo(shown), " ", create("span", {}, source),
             create("p", {}, ...shown.pieces.map((piece, i) => (i % 2 === 1 ? create("mark", {}, piece) : piece))),
             places.length > 0 ? create("ul", {}, ...places) : "");
-        if (shown.isAsked) {
+        if (shown.isPlaceMeant) {
             result.querySelector("ul a").dataset.asked = "";
         }
         return result;
@@ -173,12 +173,12 @@
         return results.children[shown];
     }
 
-    function describeFound({ isCommonOnly, pages }) {
+    function describeFound({ query, pages }) {
         const count = pages.length;
         const whole = pages.filter(({ isWhole }) => isWhole).length;
         const rest = whole === count ? "" : `, ${whole || "none"} with all words`;
-        return isCommonOnly ? "Only common words, which are not searched for" : box.value.trim() === "" ? ""
-            : count === 0 ? "Nothing found" : (count === 1 ? "1 page found" : `${count} pages found`) + rest;
+        return query.keys.length === 0 ? ""
+            : count === 0 ? (query.isCommon ? "Only common words, which are not searched for" : "Nothing found") : (count === 1 ? "1 page found" : `${count} pages found`) + rest;
     }
 
     function accepts(lookup, page) {
