@@ -16,9 +16,9 @@ from pathlib import Path
 SOURCES = {
     "pagemeld": ["README.md", "docs/INTEGRATION.md", "docs/READER.md", "docs/FORMATS.md", "docs/MESSAGES.md",
                  "docs/ROBUSTNESS.md", "SECURITY.md", "docs/PERFORMANCE.md", "docs/ARCHITECTURE.md", "CONTRIBUTING.md",
-                 "docs/RELEASING.md", "CHANGELOG.md", "man/pagemeld.1", "man/pagemeld.5"],
+                 "docs/RELEASING.md", "CHANGELOG.md", "man/pagemeld.1", "man/pagemeld-docdata.1",
+                 "man/pagemeld.5"],
     "checker": ["docs/CHECKING.md", "docs/RULES.md", "man/pagemeld-check.1"],
-    "producer": ["man/pagemeld-docdata.1"],
     "runtime": ["docs/SELF-TESTS.md"],
 }
 PAGE = """<!DOCTYPE html>
