@@ -29,7 +29,7 @@ def make_parser():
     parser = argparse.ArgumentParser(
         prog=PROGRAM, usage="%(prog)s [OPTION]... SET_DIRECTORY...",
         description="Makes docdata/index.json and docdata/toc.json of documentation sets from their HTML pages.",
-        epilog='A set directory is called Manual or ScriptReference and lies in the directory of its module.')
+        epilog="A set directory is called Manual or ScriptReference and lies in the directory of its module.")
     parser.add_argument("set_directories", metavar="SET_DIRECTORY", nargs="+", help=argparse.SUPPRESS)
     add = parser.add_argument
     add("--page-script", action="store_true", help="put the page script into every page and into docdata")
@@ -41,7 +41,8 @@ def make_parser():
     add("--exclude", metavar="PATTERN", action="append", default=[],
         help="leave out pages whose path in the set matches; may be repeated")
     add("--title", metavar="TITLE", default="", help="name of the module in the contents; default: of its start page")
-    add("--root-title", metavar="TITLE", default="", help="title of all contents; default: the name of the set directory")
+    add("--root-title", metavar="TITLE", default="",
+        help="title of all contents; default: the name of the set directory")
     add("--root-link", metavar="PAGE", default="index.html", help="start page of each set; default: %(default)s")
     add("--jobs", metavar="NUMBER", type=int, default=len(os.sched_getaffinity(0)),
         help="processes; default: the processors")

@@ -89,9 +89,9 @@ def make_docdata(directory, options):
     if not pages:
         return False
     titles = choose_titles(pages, options.root_link, directory)
-    root = {"link": options.root_link, "title": make_title(options.root_title or os.path.basename(directory), directory)}
+    root_title = make_title(options.root_title or os.path.basename(directory), directory)
     module = make_module_entry(directory, titles, options)
-    contents = make_contents(root, module, list_rows(directory, titles, options), options.shared_groups)
+    contents = make_contents({"link": options.root_link, "title": root_title}, module, list_rows(directory, titles, options), options.shared_groups)
     index = make_index(pages, titles)
     write_docdata(os.path.join(directory, "docdata"), index, contents, options)
     say(f"{directory}: {len(titles)} pages, {len(index.entries) - len(titles)} places, {len(index.texts)} texts, "

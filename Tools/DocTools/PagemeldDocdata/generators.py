@@ -13,9 +13,9 @@ PARTS = {
     ("span", "permalink"): SKIP, ("span", "overload"): SKIP, ("span", "arrow"): SKIP, ("span", "icon"): SKIP,
     ("ul", "tablist"): SKIP, ("div", "navpath"): SKIP, ("tr", "inherit"): SKIP, ("address", "footer"): SKIP,
     ("div", "ingroups"): SKIP, ("div", "memtemplate"): SKIP, ("td", "memItemLeft"): UNUSED,
-    ("td", "memTemplParams"): UNUSED, ("td", "memTemplItemLeft"): UNUSED, ("div", "fragment"): LISTING, ("div", "title"): "h1", ("div", "textblock"): TEXT, ("td", "mdescRight"): TEXT,
-    ("td", "fieldname"): "h6", ("td", "memItemRight"): MEMBER, ("td", "memTemplItemRight"): MEMBER,
-    ("td", "inherit_header"): MEMBER,
+    ("td", "memTemplParams"): UNUSED, ("td", "memTemplItemLeft"): UNUSED, ("div", "fragment"): LISTING,
+    ("div", "title"): "h1", ("div", "textblock"): TEXT, ("td", "mdescRight"): TEXT, ("td", "fieldname"): "h6",
+    ("td", "memItemRight"): MEMBER, ("td", "memTemplItemRight"): MEMBER, ("td", "inherit_header"): MEMBER,
     # Sphinx
     ("a", "headerlink"): SKIP, ("span", "viewcode-link"): SKIP, ("div", "sphinxsidebar"): SKIP, ("dt", "sig"): "h6",
     ("span", "descname"): NAME, ("span", "descclassname"): NAME, ("code", "descname"): NAME,

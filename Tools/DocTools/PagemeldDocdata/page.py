@@ -48,7 +48,7 @@ class Page(NamedTuple):
 
 
 def find_words(text):
-    """Returns the set of terms of a text. One is left out, because in a script it sets a prototype instead of a member."""
+    """Returns the set of terms of a text, without the one that sets the prototype of an object in a script."""
     text = text.lower()
     return set((ASCII_WORD if text.isascii() else WORD).findall(text)) - COMMON.keys() - {"__proto__"}
 
@@ -95,7 +95,8 @@ class OpenSection:
         lead = self.lead or (self.texts.pop(0) if self.texts else "")
         words = find_words(self.heading) | find_plain_words(lead)
         more_words = find_plain_words(" ".join(self.texts)) - words
-        return Section(self.level, self.anchor, self.heading, self.name, shorten(lead), " ".join(words), " ".join(more_words))
+        return Section(self.level, self.anchor, self.heading, self.name, shorten(lead), " ".join(words),
+                       " ".join(more_words))
 
 
 class PageReader:
@@ -192,7 +193,7 @@ class PageReader:
             self.section.add(first_line(listing))
 
     def end_block(self):
-        """Puts the text since the last boundary where it belongs. An anchor before text does not lead to what follows."""
+        """Puts the text since the last boundary where it belongs. An anchor before text leads to nothing later."""
         block, self.block = self.block, ""
         if not self.data:
             return
@@ -216,7 +217,8 @@ class PageReader:
         elif len(self.sections) == 1 and not self.section.heading and self.is_of_page(block, text):
             self.section = self.sections[0] = OpenSection(0, "", text, text)
         else:
-            self.section = OpenSection(LEVELS[block], anchor, text, find_name(text, squeeze("".join(self.names)), block))
+            name = find_name(text, squeeze("".join(self.names)), block)
+            self.section = OpenSection(LEVELS[block], anchor, text, name)
             if block != MEMBER or anchor:  # a row that links to a section of its own is not read
                 self.sections.append(self.section)
         self.anchor = self.row_anchor = ""

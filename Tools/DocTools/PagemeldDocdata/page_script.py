@@ -1,5 +1,4 @@
 """Puts the tag of the page script into pages, and the script beside the outputs."""
-import glob
 import os
 import re
 import shutil
@@ -12,13 +11,13 @@ WEB_DIRECTORIES = (os.path.join(HERE, "..", "web"), os.path.join(HERE, "..", "..
 TAG = re.compile(r"""<script\b[^>]*\bsrc\s*=\s*["']?[^"'>]*\bdocdata/pagemeld\.js\b[^>]*>\s*</script\s*>""", re.I)
 XHTML = re.compile(r"""\s*<\?xml\b|<html\b[^>]*\bxmlns\s*=""", re.I)
 # What decides on the place of the tag. Comments and scripts are matched whole, so that nothing in them counts.
-MARK = re.compile(r"<!--.*?(?:-->|\Z) | <script\b.*?(?:</script\s*>|\Z) | <(/body|/html|frameset|base(?=\s[^>]*\bhref))\b",
-                  re.S | re.I | re.X)
+MARK = re.compile(r"""<!--.*?(?:-->|\Z) | <script\b.*?(?:</script\s*>|\Z)
+                      | <(/body|/html|frameset|base(?=\s[^>]*\bhref))\b""", re.S | re.I | re.X)
 
 
 def make_tag(path, encoding):
-    """Returns the tag for the page at path. It is sound in HTML and in XHTML; without charset a page in UTF-16 would have
-    the script read as UTF-16."""
+    """Returns the tag for the page at path, sound in HTML and XHTML. Without charset, browsers would read the script of a
+    page in UTF-16 as UTF-16."""
     charset = ' charset="utf-8"' if encoding.startswith("utf-16") else ""
     return f'<script src="{"../" * path.count("/")}docdata/pagemeld.js"{charset} defer="defer"></script>'
 
@@ -88,7 +87,7 @@ def remove_from_page(directory, path):
 
 def list_web_files():
     directory = next(filter(os.path.isdir, WEB_DIRECTORIES))
-    return [file for kind in ("*.js", "*.css") for file in sorted(glob.glob(os.path.join(glob.escape(directory), kind)))]
+    return [entry.path for entry in os.scandir(directory) if entry.name.endswith((".js", ".css"))]
 
 
 def copy_script(docdata):

@@ -58,7 +58,8 @@ class IndexMaker:
         return len(self.entries) - 1
 
     def is_place(self, section):
-        return section.anchor and section.heading not in self.repeated_headings and not UNWRITABLE.search(section.anchor)
+        anchor = section.anchor
+        return anchor and section.heading not in self.repeated_headings and not UNWRITABLE.search(anchor)
 
     def add_section(self, entry, title, section):
         """Adds the text of a section. A heading without text, such as "Member Function Documentation", is left out, but
