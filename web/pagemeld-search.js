@@ -188,7 +188,7 @@ function compareTitle({ lookup, words }, unit, { letters, ending, sequence, rari
     return 1.5 * shared / Math.max(1, keys.length) * held + 0.5 * shared / sequence.length;
 }
 
-// The pages that hold half of the query's rarity. One that lacks words loses the more, the rarer they are. Of equal
+// The pages that hold half of the rarity that any page holds. One that lacks words loses the more, the rarer they are. Of equal
 // pages, those of the own module come first.
 function scorePages(weighed, { rarity, rarest, total }, accepts) {
     const { lookup, lookup: { owners } } = weighed;
@@ -203,12 +203,13 @@ function scorePages(weighed, { rarity, rarest, total }, accepts) {
         }
     });
     units.forEach((score, unit) => { best[owners[unit]] = Math.max(best[owners[unit]], score); });
-    const isFound = (page, unit) => page === unit && held[page] >= 0.5 && accepts(lookup, page);
+    const least = held.reduce((most, share) => Math.max(most, share), 0) / 2;
+    const isFound = (page, unit) => page === unit && held[page] > 0 && held[page] >= least && accepts(lookup, page);
     weighed.scores = units;
     return Array.from(owners.filter(isFound), (page) => {
         const factor = Math.exp(-lost[page]);
         const score = (pages[page] + best[page]) * factor + (lookup.prefixes[page] === "" ? 1e-6 : 0);
-        return { weighed, page, factor, score, isWhole: held[page] > 0.999 };
+        return { weighed, page, factor, score, isWhole: held[page] > 0.999 && !rarity.includes(0) };
     });
 }
 
@@ -231,7 +232,8 @@ function describeQuery(text, words, weighed) {
     const keys = words.map(({ key }) => key);
     const countHeld = ({ pages }) => pages.reduce((count, weight) => count + (weight > 0 ? 1 : 0), 0);
     const pageCount = sum(weighed.map(({ lookup }) => lookup.pageCount));
-    const rarity = words.map((_, i) => Math.log(1 + pageCount / (1 + sum(weighed.map((each) => countHeld(each.words[i]))))));
+    const held = words.map((_, i) => sum(weighed.map((each) => countHeld(each.words[i]))));
+    const rarity = held.map((count) => (count > 0 ? Math.log(1 + pageCount / count) : 0));
     const sequence = keysOf(text).map((key) => keys.indexOf(key)).filter((number) => number >= 0);
     const isCommon = keys.every((key) => Object.hasOwn(weighed[0].lookup.common, key));
     return { keys, rarity, sequence, isCommon, total: sum(rarity), rarest: Math.log(1 + pageCount),
