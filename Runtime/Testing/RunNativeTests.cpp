@@ -63,15 +63,10 @@ std::unique_ptr<NativeTestReporter> CreateReporter(const TestFilter& filter)
     return reporter;
 }
 
-/// Makes a reporter known to the log handler, until the run ends: normally or by an exception of a test.
-class KnownReporter
+/// Ends with the run, even if a test ends the run by an exception.
+struct KnownReporter
 {
-public:
-    explicit KnownReporter(NativeTestReporter& reporter) { Testing::g_TestReporter = &reporter; }
     ~KnownReporter() { Testing::g_TestReporter = nullptr; }
-
-    KnownReporter(const KnownReporter&) = delete;
-    KnownReporter& operator=(const KnownReporter&) = delete;
 };
 
 /// There is nothing to do between tests on this platform.
@@ -113,7 +108,8 @@ int RunNativeTests(TestFilter& filter, UnitTest::TestList& tests)
     tests.ForEach(longest);
 
     const std::unique_ptr<NativeTestReporter> reporter = CreateReporter(filter);
-    const KnownReporter known(*reporter);
+    const KnownReporter known;
+    Testing::g_TestReporter = reporter.get();
     reporter->longestSuiteNameLength = longest.longestSuiteNameLength;
     reporter->longestTestNameLength = longest.longestTestNameLength;
     reporter->intraTestHandler = PlatformSpecificIntraTestHandler;

@@ -6,26 +6,12 @@
 #include <optional>
 #include <string_view>
 
+// The script is an object literal whose links are expressions, so no JSON writer can write it.
+
 namespace
 {
 
 constexpr std::string_view kLinkOfGroup = "null";
-
-void AppendIndent(TextBuffer& script, int indent, const TocScriptLayout& layout)
-{
-    for (int i = 0; layout.indentation && i < indent; ++i)
-    {
-        AppendText(script, " ");
-    }
-}
-
-void AppendLineBreak(TextBuffer& script, const TocScriptLayout& layout)
-{
-    if (layout.lineBreaks)
-    {
-        AppendText(script, "\n");
-    }
-}
 
 /// Returns the node's module: its first "module" member that is a 32-bit integer. A member of another type
 /// can come from an input file and is skipped.
@@ -41,122 +27,162 @@ std::optional<int> FindModule(const rapidjson::Value& node)
     return std::nullopt;
 }
 
-void AppendLink(TextBuffer& script, const rapidjson::Value& node, const TocScriptLayout& layout)
+/// Appends to a script in one layout.
+class Writer
 {
-    const char* link = CStringOf(node["link"]);
-    const std::optional<int> module = FindModule(node);
-    if (!module)
-    {
-        AppendTocString(script, link, ",", 0, layout.lineBreaks, layout);
-        return;
-    }
-    if (link != kLinkOfGroup)
-    {
-        AppendPrefixVariable(script, *module);
-        AppendText(script, "+");
-    }
-    AppendPathLiteral(script, link);
-    AppendText(script, ",");
-    AppendLineBreak(script, layout);
-}
+public:
+    Writer(TextBuffer& script, const TocScriptLayout& layout) : m_script(script), m_layout(layout) {}
 
-void AppendChildren(TextBuffer& script, const rapidjson::Value& children, int indent,
-                    const TocScriptLayout& layout)
-{
-    if (children.IsNull())
+    void AppendToc(const rapidjson::Value& toc)
     {
-        AppendText(script, "null");
-    }
-    else
-    {
-        AppendText(script, "[");
-        AppendLineBreak(script, layout);
-        AppendTocValue(script, children, indent + 2, layout);
-        AppendIndent(script, indent + 1, layout);
-        AppendText(script, "]");
-    }
-    AppendLineBreak(script, layout);
-}
-
-/// Appends a node up to its children. Never inlined: its many locals would enlarge the stack frame of the
-/// recursion, and a table of contents may be thousands of levels deep.
-[[gnu::noinline]] void AppendNodeStart(TextBuffer& script, const rapidjson::Value& node, int indent,
-                                       const TocScriptLayout& layout)
-{
-    AppendIndent(script, indent, layout);
-    AppendText(script, "{");
-    AppendLineBreak(script, layout);
-    AppendTocString(script, "link", ": ", indent + 1, false, layout);
-    AppendLink(script, node, layout);
-    AppendTocString(script, "title", ": ", indent + 1, false, layout);
-    AppendTocString(script, CStringOf(node["title"]), ",", 0, layout.lineBreaks, layout);
-    AppendTocString(script, "children", ": ", indent + 1, false, layout);
-}
-
-void AppendNode(TextBuffer& script, const rapidjson::Value& node, int indent, const TocScriptLayout& layout)
-{
-    AppendNodeStart(script, node, indent, layout);
-    AppendChildren(script, node["children"], indent, layout);
-    AppendIndent(script, indent, layout);
-    AppendText(script, "}");
-    AppendLineBreak(script, layout);
-}
-
-void AppendTocNodes(TextBuffer& script, const rapidjson::Value& list, int indent,
-                    const TocScriptLayout& layout)
-{
-    for (rapidjson::SizeType i = 0; i < list.Size(); ++i)
-    {
-        AppendTocValue(script, list[i], indent + 2, layout);
-        if (i + 1 < list.Size())
+        AppendText(m_script, "toc = {\n");
+        AppendString("link", ": ", 1, false);
+        AppendString(CStringOf(toc["link"]), ",", 0, m_layout.lineBreaks);
+        AppendString("title", ": ", 1, false);
+        AppendString(CStringOf(toc["title"]), ",", 0, m_layout.lineBreaks);
+        // The root always shows a list, even for null; nodes below it show null as it is.
+        AppendString("children", ": [", 1, m_layout.lineBreaks);
+        if (const rapidjson::Value* children = FindMember(toc, "children"))
         {
-            AppendIndent(script, indent + 2, layout);
-            AppendText(script, ",");
-            AppendLineBreak(script, layout);
+            AppendValue(*children, 2);
+        }
+        AppendText(m_script, "]};\n");
+    }
+
+    void AppendValue(const rapidjson::Value& value, int indent)
+    {
+        if (value.IsObject())
+        {
+            AppendNode(value, indent);
+        }
+        else if (value.IsArray())
+        {
+            AppendList(value, indent);
         }
     }
-}
+
+    void AppendString(const char* text, const char* extra, int indent, bool newLine)
+    {
+        AppendIndent(indent);
+        AppendTitleLiteral(m_script, text);
+        AppendText(m_script, extra);
+        if (newLine)
+        {
+            AppendText(m_script, "\n");
+        }
+    }
+
+private:
+    void AppendNode(const rapidjson::Value& node, int indent)
+    {
+        AppendNodeStart(node, indent);
+        AppendChildren(node["children"], indent);
+        AppendIndent(indent);
+        AppendText(m_script, "}");
+        AppendLineBreak();
+    }
+
+    /// Appends a node up to its children. Never inlined: its many locals would enlarge the stack frame of the
+    /// recursion, and a table of contents may be thousands of levels deep.
+    [[gnu::noinline]] void AppendNodeStart(const rapidjson::Value& node, int indent)
+    {
+        AppendIndent(indent);
+        AppendText(m_script, "{");
+        AppendLineBreak();
+        AppendString("link", ": ", indent + 1, false);
+        AppendLink(node);
+        AppendString("title", ": ", indent + 1, false);
+        AppendString(CStringOf(node["title"]), ",", 0, m_layout.lineBreaks);
+        AppendString("children", ": ", indent + 1, false);
+    }
+
+    void AppendLink(const rapidjson::Value& node)
+    {
+        const char* const link = CStringOf(node["link"]);
+        const std::optional<int> module = FindModule(node);
+        if (!module)
+        {
+            AppendString(link, ",", 0, m_layout.lineBreaks);
+            return;
+        }
+        if (link != kLinkOfGroup)
+        {
+            AppendPrefixVariable(m_script, *module);
+            AppendText(m_script, "+");
+        }
+        AppendPathLiteral(m_script, link);
+        AppendText(m_script, ",");
+        AppendLineBreak();
+    }
+
+    void AppendChildren(const rapidjson::Value& children, int indent)
+    {
+        if (children.IsNull())
+        {
+            AppendText(m_script, "null");
+        }
+        else
+        {
+            AppendText(m_script, "[");
+            AppendLineBreak();
+            AppendValue(children, indent + 2);
+            AppendIndent(indent + 1);
+            AppendText(m_script, "]");
+        }
+        AppendLineBreak();
+    }
+
+    void AppendList(const rapidjson::Value& list, int indent)
+    {
+        for (rapidjson::SizeType i = 0; i < list.Size(); ++i)
+        {
+            AppendValue(list[i], indent + 2);
+            if (i + 1 < list.Size())
+            {
+                AppendIndent(indent + 2);
+                AppendText(m_script, ",");
+                AppendLineBreak();
+            }
+        }
+    }
+
+    void AppendIndent(int indent)
+    {
+        for (int i = 0; m_layout.indentation && i < indent; ++i)
+        {
+            AppendText(m_script, " ");
+        }
+    }
+
+    void AppendLineBreak()
+    {
+        if (m_layout.lineBreaks)
+        {
+            AppendText(m_script, "\n");
+        }
+    }
+
+    TextBuffer& m_script;
+    const TocScriptLayout& m_layout;
+};
 
 } // namespace
 
 TextBuffer RenderTocScript(const rapidjson::Value& toc, const TocScriptLayout& layout)
 {
     TextBuffer script;
-    AppendText(script, "toc = {\n");
-    AppendTocString(script, "link", ": ", 1, false, layout);
-    AppendTocString(script, CStringOf(toc["link"]), ",", 0, layout.lineBreaks, layout);
-    AppendTocString(script, "title", ": ", 1, false, layout);
-    AppendTocString(script, CStringOf(toc["title"]), ",", 0, layout.lineBreaks, layout);
-    AppendTocString(script, "children", ": [", 1, layout.lineBreaks, layout);
-    if (const rapidjson::Value* children = FindMember(toc, "children"))
-    {
-        AppendTocValue(script, *children, 2, layout);
-    }
-    AppendText(script, "]};\n");
+    Writer(script, layout).AppendToc(toc);
     return script;
 }
 
 void AppendTocValue(TextBuffer& script, const rapidjson::Value& value, int indent,
                     const TocScriptLayout& layout)
 {
-    if (value.IsObject())
-    {
-        AppendNode(script, value, indent, layout);
-    }
-    else if (value.IsArray())
-    {
-        AppendTocNodes(script, value, indent, layout);
-    }
+    Writer(script, layout).AppendValue(value, indent);
 }
 
 void AppendTocString(TextBuffer& script, const char* text, const char* extra, int indent, bool newLine,
                      const TocScriptLayout& layout)
 {
-    AppendIndent(script, indent, layout);
-    AppendTitleLiteral(script, text);
-    AppendText(script, extra);
-    if (newLine)
-    {
-        AppendText(script, "\n");
-    }
+    Writer(script, layout).AppendString(text, extra, indent, newLine);
 }

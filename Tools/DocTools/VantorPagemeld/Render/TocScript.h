@@ -19,8 +19,10 @@ struct TocScriptLayout
 
 /// Appends one node, or the nodes of one list, at a depth of indent spaces; nothing for any other value.
 ///
-/// The link of a node that has a module is written after the module's prefix variable, with nothing escaped,
-/// unless it is "null"; other links and all titles have their double quotes escaped. This is intentional.
+/// The forms of a link differ intentionally:
+/// - of a node that has a module: after the module's prefix variable, with nothing escaped
+/// - the same, but "null": without a prefix
+/// - of a node that has none: with its double quotes escaped, as in all titles
 void AppendTocValue(TextBuffer& script, const rapidjson::Value& value, int indent,
                     const TocScriptLayout& layout);
 
