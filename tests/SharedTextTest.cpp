@@ -46,7 +46,7 @@ int Clone(int file, unsigned long request, int original)
         return Fail(s_refusal);
     }
     std::string bytes(static_cast<std::size_t>(status.st_size), '\0');
-    const ssize_t size = status.st_size;
+    const auto size = static_cast<ssize_t>(bytes.size());
     if (::pread(original, bytes.data(), bytes.size(), 0) != size ||
         ::pwrite(file, bytes.data(), bytes.size(), 0) != size)
     {

@@ -10,7 +10,9 @@
 #ifndef PAGEMELD_CALLS_REAL_MALLOC
 extern "C"
 {
+    // NOLINTBEGIN(readability-redundant-declaration): they add the labels
     decltype(std::malloc) malloc __asm__("PagemeldMallocOrEnd");
     decltype(std::realloc) realloc __asm__("PagemeldReallocOrEnd");
+    // NOLINTEND(readability-redundant-declaration)
 }
 #endif
