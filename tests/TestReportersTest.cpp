@@ -74,7 +74,7 @@ TEST(NativeTestReporter, KeepsTheStateOfTheRunningTest)
     EXPECT_TRUE(reporter.testStarted && reporter.testInProgress && !reporter.currentTestFailed);
     EXPECT_TRUE(reporter.hasAttributeOfType3 && reporter.hasAttributeOfType8);
     EXPECT_FALSE(reporter.hasAttributeOfType7);
-    reporter.ReportTestProperty(details, "name", TestProperty(5L));
+    reporter.ReportTestProperty(details, "name", TestProperty(5LL));
     reporter.MarkCurrentTestAsFailure();
     reporter.ReportFailure(details, "wrong");
     EXPECT_STREQ("Test", reporter.currentTest.testName);
