@@ -77,17 +77,23 @@ def check(parser, arguments):
         parser.error("--page-script and --remove exclude each other")
 
 
+def succeeds(work, directory, options):
+    """Does the work on a set directory. Returns whether it could be done, and says why not."""
+    try:
+        if work(os.path.abspath(directory), options):
+            return True
+        say(f"error: {directory} has no pages")
+    except OSError as error:
+        say(f"error: {error}")
+    return False
+
+
 def main():
     parser = make_parser()
     arguments = parser.parse_args()
     check(parser, arguments)
     options = SetOptions(arguments.root_link, arguments.root_title, arguments.title, arguments.toc, arguments.share,
                          arguments.exclude, arguments.page_script, max(arguments.jobs, 1))
-    status = 0
-    for directory in map(os.path.abspath, arguments.set_directories):
-        if arguments.remove:
-            remove_page_script(directory, arguments.exclude)
-        elif not make_docdata(directory, options):
-            say(f"error: {directory} has no pages")
-            status = 1
-    sys.exit(status)
+    work = remove_page_script if arguments.remove else make_docdata
+    results = [succeeds(work, directory, options) for directory in arguments.set_directories]
+    sys.exit(0 if all(results) else 1)

@@ -91,8 +91,8 @@ class ListReader:
 
 
 def resolve(address, base, paths):
-    """Returns path and fragment of an address in the page base. The path is empty if it leads out of the set, or nowhere,
-    as the "#" of menus."""
+    """Returns path and fragment of an address in the page base. The path is empty if it leads out of the set, or to
+    nothing, as the "#" of menus."""
     if address.strip() == "#":
         return "", ""
     place, _, fragment = address.strip().partition("#")
@@ -140,8 +140,8 @@ def list_directories(titles, start):
 
 
 def take_nodes(rows, above):
-    """Takes rows from the end of the list while they are deeper than above, and returns their tree. Drops those without a
-    link or children. What is below a row without title, as in mdBook's lists, goes below the row before."""
+    """Takes rows from the end of the list while they are deeper than above, and returns their tree. Drops those without
+    a link or children. What is below a row without title, as in mdBook's lists, goes below the row before."""
     nodes = []
     while rows and rows[-1].depth > above:
         depth, link, title = rows.pop()

@@ -65,6 +65,14 @@ def make_module_entry(directory, titles, options):
             "title": make_title(name if is_generic(title) else title, directory)}
 
 
+def make_set_contents(directory, titles, options):
+    """Returns the value of toc.json. All modules need the same root."""
+    title = options.root_title or os.path.basename(directory)
+    root = {"link": options.root_link, "title": make_title(title, directory)}
+    module = make_module_entry(directory, titles, options)
+    return make_contents(root, module, list_rows(directory, titles, options), options.shared_groups)
+
+
 def write_file(file, write):
     """Writes a file by a temporary one, so that it is there whole or as it was."""
     with open(file + ".tmp", "w", encoding="utf-8", newline="\n") as stream:
@@ -89,9 +97,7 @@ def make_docdata(directory, options):
     if not pages:
         return False
     titles = choose_titles(pages, options.root_link, directory)
-    root_title = make_title(options.root_title or os.path.basename(directory), directory)
-    module = make_module_entry(directory, titles, options)
-    contents = make_contents({"link": options.root_link, "title": root_title}, module, list_rows(directory, titles, options), options.shared_groups)
+    contents = make_set_contents(directory, titles, options)
     index = make_index(pages, titles)
     write_docdata(os.path.join(directory, "docdata"), index, contents, options)
     say(f"{directory}: {len(titles)} pages, {len(index.entries) - len(titles)} places, {len(index.texts)} texts, "
@@ -99,10 +105,12 @@ def make_docdata(directory, options):
     return True
 
 
-def remove_page_script(directory, excluded):
-    """Takes the tag of the page script out of the pages of a set directory, and the script out of its docdata."""
-    paths = list_paths(directory, excluded)
+def remove_page_script(directory, options):
+    """Takes the tag of the page script out of the pages of a set directory, and the script out of its docdata. Returns
+    whether the directory has pages."""
+    paths = list_paths(directory, options.excluded)
     for path in paths:
         remove_from_page(directory, path)
     remove_script(os.path.join(directory, "docdata"))
     say(f"{directory}: {len(paths)} pages without the page script")
+    return bool(paths)

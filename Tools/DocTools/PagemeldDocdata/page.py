@@ -2,23 +2,15 @@
 anchor if one leads there."""
 import functools
 import re
-import unicodedata
 from typing import NamedTuple
 
 from generators import LISTING, MEMBER, NAME, PARTS, SKIP, SKIPPED_ROLES, SKIPPED_TAGS, TEXT, UNUSED
 from markup import TAG, TOKEN, first_line, read_attributes, squeeze
+from words import find_plain_words, find_words
 
-COMMON = dict.fromkeys("a an and are as at be by for from has in is it its of on one or that the to with".split(), 1)
-# Queries are split into runs of letters, marks, digits and "_". \w matches all of these except the marks.
-MARKS = "".join(c for c in map(chr, [*range(0x300, 0x1F000), *range(0xE0100, 0xE01F0)])
-                if unicodedata.category(c)[0] == "M")
-WORD = re.compile(f"[\\w{MARKS}]+")
-ASCII_WORD = re.compile(r"\w+", re.A)
-LONG_NUMBER = re.compile(r"\d{5,}")
-NUMBER = re.compile(r"^[\dA-Z]+(\.\d+)*\.?\s+")
+NUMBER = re.compile(r"^[\dA-Z]+(\.\d+)*\.?\s+")  # of a section, before its name
 MAIN = "main"
 MARKED = re.compile(r"\b(?:id|class|name|role)\s*=", re.I)
-LONGEST_WORD = 40
 SHOWN_LENGTH = 300
 
 TITLE = re.compile(r"<title[^>]*>(.*?)</title", re.S | re.I)
@@ -29,6 +21,7 @@ KINDS = {**{name: name for name in ("h1", "h2", "h3", "h4", "h5", "h6", "dt", "t
 BLOCKS = KINDS.keys() | set(
     "article aside blockquote body caption center dd details div dl figure form header hr li main ol section summary "
     "table tbody td th thead tr ul".split())
+READ_WITHOUT_ATTRIBUTES = BLOCKS | SKIPPED_TAGS | {"br"}
 
 
 class Section(NamedTuple):
@@ -45,17 +38,6 @@ class Page(NamedTuple):
     title: str
     heading: str  # the main one
     sections: list  # the first is the beginning of the page
-
-
-def find_words(text):
-    """Returns the set of terms of a text, without the one that sets the prototype of an object in a script."""
-    text = text.lower()
-    return set((ASCII_WORD if text.isascii() else WORD).findall(text)) - COMMON.keys() - {"__proto__"}
-
-
-def find_plain_words(text):
-    """Returns the terms of a text that readers may ask for."""
-    return {word for word in find_words(text) if len(word) <= LONGEST_WORD and not LONG_NUMBER.fullmatch(word)}
 
 
 def shorten(text):
@@ -133,7 +115,7 @@ class PageReader:
                 break
             if name[0] == "/":
                 self.end(name[1:])
-            elif self.part or attributes or name in BLOCKS or name in SKIPPED_TAGS or name == "br":
+            elif attributes or name in READ_WITHOUT_ATTRIBUTES or self.part:
                 self.start(name, attributes)
         else:
             self.data.append(html[position:])
@@ -146,6 +128,7 @@ class PageReader:
             return
         part, anchor = read_traits(name, attributes)
         if part == MAIN:
+            self.end_block()
             self.start_over()
         if part in (SKIP, LISTING, NAME):
             self.part, self.part_tag, self.part_depth, self.part_start = part, name, 1, len(self.data)

@@ -62,8 +62,8 @@ class Task(NamedTuple):
 
 
 def try_page(task):
-    """Returns the page in a file, packed, or what is wrong with the file. Puts the tag of the page script into the file if
-    the task says so."""
+    """Returns the page in a file, packed, or what is wrong with the file. Puts the tag of the page script into the file
+    if the task says so."""
     try:
         with open(os.path.join(task.directory, task.path), "rb") as stream:
             data = stream.read()

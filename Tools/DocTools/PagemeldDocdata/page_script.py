@@ -16,8 +16,8 @@ MARK = re.compile(r"""<!--.*?(?:-->|\Z) | <script\b.*?(?:</script\s*>|\Z)
 
 
 def make_tag(path, encoding):
-    """Returns the tag for the page at path, sound in HTML and XHTML. Without charset, browsers would read the script of a
-    page in UTF-16 as UTF-16."""
+    """Returns the tag for the page at path, sound in HTML and XHTML. Without charset, browsers would read the script of
+    a page in UTF-16 as UTF-16."""
     charset = ' charset="utf-8"' if encoding.startswith("utf-16") else ""
     return f'<script src="{"../" * path.count("/")}docdata/pagemeld.js"{charset} defer="defer"></script>'
 

@@ -5,8 +5,8 @@ import json
 import re
 from array import array
 
-from page import COMMON, find_words
 from titles import replace_unwritable
+from words import COMMON, find_words
 
 # The scripts escape nothing in paths.
 UNWRITABLE = re.compile('["\\\\\0-\x1f\x7f\ud800-\udfff]')
