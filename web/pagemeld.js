@@ -427,7 +427,7 @@
     function openView() {
         if (dialog.isConnected && !dialog.open) {
             matchPage();
-            holdPage(true);
+            holdPage();
             dialog.showModal();
             needIndex();
             needContents();
@@ -436,15 +436,21 @@
         box.select();
     }
 
-    // The page keeps its place, and the room of its scroll bar, while it can't be scrolled. Where the root has no
-    // overflow of its own, that of the body is the window's, and would become the body's.
-    function holdPage(isHeld) {
+    // The page keeps its place while it can't be scrolled; where it would not, because a browser does not keep the room
+    // of the scroll bar, it can. Where the root has no overflow of its own, that of the body is the window's, and would
+    // become the body's.
+    function holdPage() {
         const { documentElement: root, body } = document;
-        const isBodys = getComputedStyle(root).overflowX === "visible";
-        root.classList.toggle("pagemeld-bar", isHeld && innerWidth > root.clientWidth);
-        root.classList.toggle("pagemeld-held", isHeld);
-        body.classList.toggle("pagemeld-held", isHeld && isBodys);
+        const width = root.clientWidth;
+        const held = getComputedStyle(root).overflowX === "visible" ? [root, body] : [root];
+        held.forEach((part) => part.classList.add("pagemeld-held"));
+        if (root.clientWidth !== width) {
+            releasePage();
+        }
     }
+
+    const releasePage = () =>
+        document.querySelectorAll(".pagemeld-held").forEach((part) => { part.classList.remove("pagemeld-held"); });
 
     // Light text is on a dark page. What the system says decides where the color is not given as red, green, and blue.
     function matchPage() {
@@ -512,7 +518,7 @@
             }
         };
         dialog.onclose = () => {
-            holdPage(false);
+            releasePage();
             keepQuery();
         };
         opener.onclick = openView;
@@ -523,9 +529,13 @@
         if (document.body?.localName !== "body") {
             return; // a frame set
         }
+        const place = document.getElementById("pagemeld");
+        const query = new URLSearchParams(location.search).get("pagemeld");
+        if (!place && !query && document.readyState !== "complete") {
+            await new Promise((done) => addEventListener("load", done)); // which a style sheet would put off
+        }
         await loaded(create("link", { rel: "stylesheet", href: resolve("pagemeld.css", ownAddress).href }),
             document.head ?? document.documentElement);
-        const place = document.getElementById("pagemeld");
         if (place) {
             fill(place);
         } else {
@@ -533,7 +543,6 @@
         }
         listen();
         watchPage();
-        const query = new URLSearchParams(location.search).get("pagemeld");
         if (query) {
             restoreQuery(query);
         }
