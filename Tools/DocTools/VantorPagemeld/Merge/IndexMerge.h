@@ -38,8 +38,6 @@ public:
         : m_combined(combined), m_largeObjects(largeObjects)
     {
     }
-    IndexMerge(const IndexMerge&) = delete;
-    IndexMerge& operator=(const IndexMerge&) = delete;
 
     IndexMerge(const IndexMerge&) = delete;
     IndexMerge& operator=(const IndexMerge&) = delete;
