@@ -441,10 +441,10 @@
     // become the body's.
     function holdPage() {
         const { documentElement: root, body } = document;
-        const width = root.clientWidth;
+        const width = root.offsetWidth;
         const held = getComputedStyle(root).overflowX === "visible" ? [root, body] : [root];
         held.forEach((part) => part.classList.add("pagemeld-held"));
-        if (root.clientWidth !== width) {
+        if (root.offsetWidth !== width) {
             releasePage();
         }
     }
