@@ -69,6 +69,10 @@ def convert_manual_page(source, build):
     content = run("mandoc", "-Thtml", "-O", "fragment,man=%N.%S", build / f"man/man{section}/{name}.{section}")
     _, _, body = content.partition("</table>\n")  # a table with the name comes first, one with the date last
     body, _, _ = body.rpartition('<table class="foot">')
+    # Emphasised words and members of files have anchors too, as options do. They would be places for the search.
+    for anchor in re.findall('<a class="permalink" href="#([^"]*)"><i ', body):
+        body = body.replace(f' id="{anchor}"', "").replace(f' href="#{anchor}"', "")
+    body = re.sub('<dt id="[^"]*"><var ', "<dt><var ", body)
     sections = re.sub("<(/?)h1", r"<\1h2", body)
     return f"<h1>{name}({section})</h1>\n{sections}"
 
