@@ -52,6 +52,7 @@ function* prepareIndex({ pages, info, common, searchIndex }, allPrefixes) {
         unitOfText: new Int32Array(info.length),
         places: new Map(), textsOf: new Map(), // by unit of a page: its units, the page first; its texts
         named: new Map(), listed: new Map(), // by key: units whose title has it; texts
+        near: new Map(), // keys by their first two letters
         forms: new Map(), mistyped: new Map(), // by word, as they are asked for
     };
     const { titles, owners, listed, named } = lookup;
@@ -72,11 +73,16 @@ function* prepareIndex({ pages, info, common, searchIndex }, allPrefixes) {
         yield;
     }
     for (const term of Object.keys(searchIndex)) {
-        const others = listed.get(fold(term));
-        listed.set(fold(term), others ? others.concat(searchIndex[term]) : searchIndex[term]);
+        const key = fold(term);
+        const others = listed.get(key);
+        listed.set(key, others ? others.concat(searchIndex[term]) : searchIndex[term]);
         yield;
     }
-    const keys = [...new Set([...listed.keys(), ...named.keys()])];
+    const keys = [...listed.keys(), ...[...named.keys()].filter((key) => !listed.has(key))];
+    for (const key of keys) {
+        push(lookup.near, key.slice(0, 2), key);
+        yield;
+    }
     return { ...lookup, keys, owners: Int32Array.from(owners), pageCount: units.size };
 }
 
@@ -100,11 +106,16 @@ function weighForm(key, word, isOpen) {
     return share === 1 ? 1 : Math.max(isInflected ? 0.8 * share : 0, isBegun ? (isOpen ? 0.5 : 0.3) + 0.3 * share : 0);
 }
 
-function findForms({ keys }, { key: word, isOpen }) {
-    const near = keys.filter((key) => key.startsWith(word.slice(0, 2)));
+function findForms({ keys, near }, { key: word, isOpen }) {
+    const alike = word.length > 1 ? near.get(word.slice(0, 2)) ?? [] : keys.filter((key) => key.startsWith(word));
     const forms = new Map(isUnspaced(word) ? keys.filter((key) => key.includes(word)).map((key) => [key, 0.8]) : []);
-    near.forEach((key) => forms.set(key, Math.max(forms.get(key) ?? 0, weighForm(key, word, isOpen))));
-    return [...forms].filter(([, weight]) => weight > 0);
+    for (const key of alike) {
+        const weight = weighForm(key, word, isOpen);
+        if (weight > (forms.get(key) ?? 0)) {
+            forms.set(key, weight);
+        }
+    }
+    return forms;
 }
 
 // Whether a number of edits at most (a letter added, left out, replaced, or swapped with the next) makes the rest of a
@@ -143,12 +154,13 @@ function weighWord({ lookup: { listed, named, owners, lengths, unitOfText }, tex
     };
     for (const [key, weight] of newForms) {
         forms.set(key, Math.max(weight, forms.get(key) ?? 0));
-        named.get(key)?.forEach((unit) =>
-            raise(unit, weight, (owners[unit] === unit ? TITLE : HEADING) * (0.7 + 0.3 / lengths[unit])));
-        listed.get(key)?.forEach((text) => {
+        for (const unit of named.get(key) ?? []) {
+            raise(unit, weight, (owners[unit] === unit ? TITLE : HEADING) * (0.7 + 0.3 / lengths[unit]));
+        }
+        for (const text of listed.get(key) ?? []) {
             texts[text] |= 1 << number;
             raise(unitOfText[text], weight, TEXT);
-        });
+        }
     }
 }
 
@@ -230,7 +242,7 @@ function compareTitles(result, query) {
 // What is known of a query once its words are weighed.
 function describeQuery(text, words, weighed) {
     const keys = words.map(({ key }) => key);
-    const countHeld = ({ pages }) => pages.reduce((count, weight) => count + (weight > 0 ? 1 : 0), 0);
+    const countHeld = ({ pages }) => pages.filter((weight) => weight > 0).length;
     const pageCount = sum(weighed.map(({ lookup }) => lookup.pageCount));
     const held = words.map((_, i) => sum(weighed.map((each) => countHeld(each.words[i]))));
     const rarity = held.map((count) => (count > 0 ? Math.log(1 + pageCount / count) : 0));
