@@ -50,8 +50,8 @@ enum class Rule
 struct RuleRow
 {
     Rule id;
-    const char* name;
     Level level;
+    const char* name;
     const char* meaning;     ///< one line: when it holds
     const char* consequence; ///< what it does to readers or to the run
     const char* remedy;      ///< how to fix it
