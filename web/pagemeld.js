@@ -406,7 +406,7 @@
         if (link) {
             keepQuery(link.href);
             if (link.href.split("#")[0] === document.URL.split("#")[0] && dialog.open) {
-                dialog.close();
+                setTimeout(() => { dialog.close(); }); // writing the address now would stop the browser on its way
             }
         }
     }

@@ -50,6 +50,7 @@ const pages = {
     "far/off/based.html": `${tag}<base href="http://invalid.invalid/" target="_blank"><p>x</p>${place}`,
     "far/off/shared.html": `<script src="../../shared/pagemeld.js" defer data-docdata="../../docdata"></script><p>x</p>${place}`,
     "far/off/policy.html": `<meta http-equiv="Content-Security-Policy" content="script-src 'self'">${tag}<p>x</p>`,
+    "far/off/own place.html": themePage("own place", { css: "" }, tag).replace("<main>", `${place}<main>`),
     "far/off/frames.html": `${tag}<frameset><frame src="about:blank"></frameset>`,
     "docdata/index.json": JSON.stringify(index), "docdata/toc.json": JSON.stringify(toc), "../../favicon.ico": "",
     "../ScriptReference/docdata/index.json": "", "50% of? all.html": "", "File:x.html": "",
@@ -74,6 +75,7 @@ export function makeSite(pagemeld) {
         fs.cpSync("web", path.join(root, directory), { recursive: true }));
     execFileSync(path.resolve(pagemeld), ["-autopaths", root], { stdio: "ignore" });
     fs.writeFileSync(path.join(root, "telemetry/Manual/docdata/global_index.js"), "pages = [");
-    fs.rmSync(path.join(root, "telemetry/Manual/docdata/global_toc.js"));
+    ["Manual/docdata/global_toc.js", "ScriptReference/docdata/global_index.js"].forEach((output) =>
+        fs.rmSync(path.join(root, "telemetry", output)));
     return root;
 }
