@@ -36,11 +36,15 @@ def find_place(text):
     return None if XHTML.search(text[:2000]) else marks.get("/html", len(text))
 
 
+def has_tag(text):
+    return "pagemeld.js" in text and any(TAG.fullmatch(mark[0]) for mark in MARK.finditer(text))
+
+
 def put_tag(text, tag):
-    """Returns text with the tag, and without change if it has one or can't have it."""
-    has_tag = "pagemeld.js" in text and any(TAG.fullmatch(mark[0]) for mark in MARK.finditer(text))
-    place = None if has_tag else find_place(text)
-    return text if place is None else text[:place] + tag + text[place:]
+    """Returns text with the tag, and without change if it has one or can't have it, as in a script without an end."""
+    place = None if has_tag(text) else find_place(text)
+    changed = text if place is None else text[:place] + tag + text[place:]
+    return changed if has_tag(changed) else text
 
 
 def take_tags(text):
