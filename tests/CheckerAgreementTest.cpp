@@ -214,3 +214,36 @@ TEST(CheckerAgreement, PredictsWhichModulesARunMerges)
     EXPECT_EQ(std::vector<std::string>(scripts.size(), "evaluates"),
               AnswersOfNode(kEvaluatesInNode, scripts));
 }
+
+TEST(CheckerAgreement, TellsWhenOutputsAreNotThoseOfARun)
+{
+    const char* const changes[] = {
+        "mkdir up && mv second up",
+        "rm -r third",
+        "mv first fourth",
+        "cp -r first fourth",
+        "rm -r second/Manual/docdata/index.json second/Manual/docdata/toc.json",
+        "rm */Manual/docdata/index.json */Manual/docdata/toc.json",
+        "sed -i '/^var p1/d' third/Manual/docdata/global_index.js",
+        "sed -i 's/^var p0.*/var p0 = \"nonsense\";/' first/Manual/docdata/global_toc.js",
+        "truncate -s -9 second/Manual/docdata/global_index.json",
+        "truncate -s 100 third/Manual/docdata/global_toc.js",
+        "touch first/Manual/docdata/toc.json",
+    };
+    const std::string check = std::string(PAGEMELD_CHECK_PROGRAM) + " --outputs --discover=.";
+    for (const char* change : changes)
+    {
+        const TemporaryDirectory directory;
+        for (const std::string& name : kModules)
+        {
+            WriteFile(directory / name + "/Manual/docdata/index.json",
+                      R"({"pages":[["page.html","Page"]],"info":[],"common":{},"searchIndex":{}})");
+            WriteFile(directory / name + "/Manual/docdata/toc.json",
+                      R"({"link":"toc","title":"toc","children":[]})");
+        }
+        const std::string run = "cd '" + (directory / "") + "' && " + PAGEMELD_PROGRAM + " -autopaths . && ";
+        EXPECT_EQ(0, RunProgram("sh", {"-c", run + check}).status) << change;
+        EXPECT_EQ(1, RunProgram("sh", {"-c", run + "sleep 0.02 && " + change + " && " + check}).status)
+            << change;
+    }
+}

@@ -16,6 +16,7 @@
 #include <utility>
 #include <vector>
 
+#include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -31,8 +32,10 @@ namespace fs = std::filesystem;
 const std::string kGone = "(gone)";
 const std::string kDirectory = "(directory)";
 const std::string kPipe = "(pipe)";
+const std::string kDevice = "(link to /dev/null)";
 const std::string kLink = "(link to) ";
 const std::string kOld = "(as it is, but old)";
+const std::string kFuture = "(as it is, but of the year 2100)";
 const std::string kCombined = "(outputs in both modules)";
 
 struct Change
@@ -65,11 +68,21 @@ void Apply(const TemporaryDirectory& directory, const Change& change)
         fs::last_write_time(path, fs::file_time_type::clock::now() - std::chrono::hours(1));
         return;
     }
+    if (change.content == kFuture)
+    {
+        constexpr timespec kTimes[] = {{0, UTIME_OMIT}, {4102444800, 0}};
+        EXPECT_EQ(0, ::utimensat(AT_FDCWD, path.c_str(), kTimes, 0));
+        return;
+    }
     fs::create_directories(fs::path(path).parent_path());
     fs::remove(path);
     if (change.content == kDirectory)
     {
         fs::create_directory(path);
+    }
+    else if (change.content == kDevice)
+    {
+        fs::create_symlink("/dev/null", path);
     }
     else if (change.content == kPipe)
     {
@@ -126,7 +139,15 @@ status 0
 )"},
         {{"--discover=@/a"},
          {},
-         R"(@/a: error: no directory below it has Manual/docdata: nothing will be combined [no-modules]
+         R"(@/a: error: is a module itself: give it as a root: nothing will be combined [no-modules]
+0 modules, 1 error, 0 warnings
+status 1
+)"},
+        {{"-d", "@/nowhere"}, {}, R"(@/nowhere: error: is missing: nothing will be combined [no-modules]
+0 modules, 1 error, 0 warnings
+status 1
+)"},
+        {{"-d", "@/a/Manual/docdata/toc.json"}, {}, R"(@/a/Manual/docdata/toc.json: error: is not a directory: nothing will be combined [no-modules]
 0 modules, 1 error, 0 warnings
 status 1
 )"},
@@ -136,6 +157,14 @@ status 1
 1 module, 1 error, 0 warnings
 status 1
 )"},
+        {{"@/a", "@/c"},
+         {{"c", kDirectory}, {"c/Manual", kLink + "a/Manual"}, {"c/ScriptReference", kLink + "a/Manual"}},
+         R"(@/a/ScriptReference/docdata: error: is missing: the run ends here with status 255, and leaves 1 later module unwritten [output-blocked]
+@/c: error: Manual/docdata is the same directory as @/a/Manual/docdata: the outputs of one replace those of the other [duplicate-root]
+@/c: error: ScriptReference/docdata is the same directory as @/a/Manual/docdata: the outputs of one replace those of the other [duplicate-root]
+2 modules, 3 errors, 0 warnings
+status 1
+)"},
         {{"@/a", "@/b", "@/b"},
          {},
          R"(@/b: error: is the same directory as @/b: its pages will be in the search twice [duplicate-root]
@@ -143,16 +172,29 @@ status 1
 status 1
 )"},
         {{"-d", "@"},
-         {{"c/.h/Manual/docdata", kDirectory},
+         {{"c/.h/ScriptReference/docdata", kDirectory},
           {"c/.i/Manual", kDirectory},
-          {"c/l", kLink + "a"},
+          {"c/l", kLink + "a"}, // which is found under its own name
           {"c/m", kLink + "a/Manual"},
+          {"c/n", kLink + "c/.o"},
+          {"c/.o/p/Manual/docdata", kDirectory},
           {"c/r/ScriptReference/docdata", kDirectory},
-          {"c/s/ScriptReference", kDirectory}},
-         R"(@/c/.h: warning: a hidden module is not taken: its pages will be missing [passed-over]
-@/c/l: warning: a link to a module is not followed: its pages will be missing [passed-over]
+          {"c/s/ScriptReference", kDirectory},
+          {"c/t/manual/docdata/index.json", ""},
+          {"c/u/Manual/page.html", ""},
+          {"c/v/docdata/toc.json", ""},
+          {"c/w/Manual/docdata", kDirectory},
+          {"c/w/x/y/Manual/docdata", kDirectory},
+          {"c/w/x/y/z/Manual/docdata", kDirectory}},
+         R"(@/c/w/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+@/c/.h: warning: a hidden module is not taken: its pages will be missing [passed-over]
+@/c/n: warning: a link to a directory of modules is not followed: their pages will be missing [passed-over]
 @/c/r: warning: has ScriptReference/docdata but no Manual/docdata, so it is not taken: its pages will be missing [passed-over]
-2 modules, 0 errors, 3 warnings
+@/c/t/manual: warning: is not spelled Manual, so it is not taken: its pages will be missing [passed-over]
+@/c/u/Manual: warning: has pages but no docdata, so it is not taken: its pages will be missing [passed-over]
+@/c/v: warning: has docdata itself, which belongs one level deeper, into a directory Manual: its pages will be missing [passed-over]
+@/c/w/x/y: warning: a module inside @/c/w is not looked for: its pages will be missing [passed-over]
+3 modules, 0 errors, 7 warnings
 status 0
 )"},
         {{"@/a", "@/b", "@/c"},
@@ -160,42 +202,82 @@ status 0
           {"b/Manual/docdata/global_toc.json.tmp", kPipe},
           {"b/Manual/docdata/global_index.js.tmp", kDirectory},
           {"a/Manual/docdata/global_index.js.tmp", "x"},
+          {"a/Manual/docdata/global_toc.js.tmp", kLink + "a/new"}, // which can be made
+          {"b/Manual/docdata/global_index.json.tmp", kLink + "nowhere/new"},
+          {"c/Manual/docdata/global_index.js.tmp", kLink + "c/Manual/docdata/global_index.js.tmp"},
+          {"c/Manual/docdata/global_toc.js.tmp", kDevice},
           {"a/Manual/docdata/global_toc.js", kLink + "b"}, // the rename replaces it
           {"a/ScriptReference/docdata/index.json", Index(R"(["p.html","P"])")},
           {"a/ScriptReference/docdata/toc.json", Toc("")},
           {"b/ScriptReference/docdata", "a file"}},
          R"(@/b/Manual/docdata/global_index.js.tmp: error: a directory is in the place of the temporary file: the run ends here with status 255, and leaves 1 later module and ScriptReference unwritten [output-blocked]
+@/b/Manual/docdata/global_index.json.tmp: error: a link to where no file can be made is in the place of the temporary file: the run keeps the old output [output-blocked]
 @/b/Manual/docdata/global_toc.js: error: a directory is in the place of the output: the new one stays as .tmp [output-blocked]
 @/b/Manual/docdata/global_toc.json.tmp: error: a pipe is in the place of the temporary file: the run keeps the old output [output-blocked]
-@/b/ScriptReference/docdata: error: is not a directory: the run ends here with status 255, and leaves 1 later module unwritten [output-blocked]
-@/c/Manual/docdata: error: is missing: the run ends here with status 255, and leaves ScriptReference unwritten [output-blocked]
-@/c/ScriptReference/docdata: error: is missing: the run ends here with status 255 [output-blocked]
-3 modules, 6 errors, 0 warnings
+@/b/ScriptReference/docdata: error: is not a directory: a run that came so far would end here with status 255 [output-blocked]
+@/c/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+@/c/Manual/docdata/global_index.js.tmp: error: a link that leads back to itself is in the place of the temporary file: a run that came so far would end here with status 255 [output-blocked]
+@/c/Manual/docdata/global_toc.js.tmp: error: a device is in the place of the temporary file: the run writes into it, and it becomes the output: readers get nothing [output-blocked]
+@/c/ScriptReference/docdata: error: is missing: a run that came so far would end here with status 255 [output-blocked]
+3 modules, 8 errors, 0 warnings
 status 1
 )"},
-        {{"docs/m1", "docs/m12", "docs/m2/", R"(docs/a\d)", R"(docs/x"y)"},
-         {},
-         R"(docs/m1: error: neither Manual/docdata nor ScriptReference/docdata is found in it, nor in any other root: nothing will be combined [no-modules]
-docs/m1: error: links to docs/a\d will lead to docs/ad/Manual: rename the directory [wrong-link-path]
-docs/m12: error: links to docs/m1 and 1 more will lead to docs/m12/Manual: one name begins with the other: rename one [wrong-link-path]
-docs/m2/: error: links to docs/m1 and 2 more will lead to m1/Manual: give the roots without a slash at the end [wrong-link-path]
-docs/x"y: error: a quote, backslash or line break in the path breaks both scripts of docs/m1: rename the directory [wrong-link-path]
-5 modules, 5 errors, 0 warnings
+        {{"@/n/m1", "@/n/m12", "@/n/m2/", R"(@/n/a\d)", R"(@/n/x"y)", "@/n/\xE9"},
+         {{"n/m1/Manual/docdata/index.json", Index("")},
+          {"n/m1/Manual/docdata/toc.json", Toc("")},
+          {"n/m12/Manual/docdata", kDirectory},
+          {"n/m2/Manual/docdata", kDirectory},
+          {R"(n/a\d/Manual/docdata)", kDirectory},
+          {"n/x\"y/Manual/docdata", kDirectory},
+          {"n/\xE9/Manual/docdata", kDirectory}},
+         R"(@/n/m1: error: links to @/n/a\d and 1 more will lead to @/n/ad/Manual: rename the directory [wrong-link-path]
+@/n/m12: error: links to @/n/m1 and 2 more will lead to @/n/m12/Manual: one name begins with the other: rename one [wrong-link-path]
+@/n/m12/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+@/n/m2/: error: links to @/n/m1 and 3 more will lead to @/m1/Manual: give the roots without a slash at the end [wrong-link-path]
+@/n/m2//Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+@/n/a\d: error: links to @/n/\xE9 will lead elsewhere: rename the directory [wrong-link-path]
+@/n/a\d/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+@/n/x"y: error: a quote, backslash or line break in the path breaks both scripts of @/n/m1: rename the directory [wrong-link-path]
+@/n/x"y/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+@/n/\xE9: error: links to @/n/a\d will lead to @/n/ad/Manual: rename the directory [wrong-link-path]
+@/n/\xE9/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+6 modules, 6 errors, 0 warnings
 status 1
 )"},
-        {{"docs/a", "docs/b%41", "docs/c#"},
-         {},
-         R"(docs/a: error: neither Manual/docdata nor ScriptReference/docdata is found in it, nor in any other root: nothing will be combined [no-modules]
-docs/a: error: links to docs/b%41 and 1 more will lead to docs/bA/Manual without the page script: rename the directory [wrong-link-path]
-docs/b%41: error: links to docs/c# will lead to docs/c without the page script: rename the directory [wrong-link-path]
-docs/c#: error: links to docs/b%41 will lead to docs/bA/Manual without the page script: rename the directory [wrong-link-path]
-3 modules, 4 errors, 0 warnings
+        {{"@/a", "@/b%41", "@/c#"},
+         {{"b%41/Manual/docdata", kDirectory}, {"c#/Manual/docdata", kDirectory}},
+         R"(@/a: error: links to @/b%41 and 1 more will lead to @/bA/Manual without the page script: rename the directory [wrong-link-path]
+@/b%41: error: links to @/c# will lead to @/c without the page script: rename the directory [wrong-link-path]
+@/b%41/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+@/c#: error: links to @/b%41 will lead to @/bA/Manual without the page script: rename the directory [wrong-link-path]
+@/c#/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+3 modules, 3 errors, 0 warnings
 status 1
 )"},
-        {{"/m1", "/m2"},
-         {},
-         R"(/m1: error: neither Manual/docdata nor ScriptReference/docdata is found in it, nor in any other root: nothing will be combined [no-modules]
+        {{"@/n/./a", "@/n/b"},
+         {{"n/a/Manual/docdata", kDirectory}, {"n/b/Manual/docdata", kDirectory}},
+         R"(@/n/./a: error: links to @/n/b will lead to @/b/Manual: give the roots without "/./", "/../" and "//" [wrong-link-path]
+@/n/./a/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+@/n/b/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
 2 modules, 1 error, 0 warnings
+status 1
+)"},
+        {{"@/a", "@/a/ScriptReference-1"}, // one name begins with the other, in one of the sets
+         {{"a/ScriptReference/docdata", kDirectory},
+          {"a/ScriptReference-1/Manual/docdata", kDirectory},
+          {"a/ScriptReference-1/ScriptReference/docdata", kDirectory}},
+         R"(@/a/ScriptReference/docdata: note: has neither index.json nor toc.json: the module adds nothing to ScriptReference [set-empty]
+@/a/ScriptReference-1: error: links to @/a will lead to @/a/ScriptReference-1: one name begins with the other: rename one [wrong-link-path]
+@/a/ScriptReference-1/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+@/a/ScriptReference-1/ScriptReference/docdata: note: has neither index.json nor toc.json: the module adds nothing to ScriptReference [set-empty]
+2 modules, 1 error, 0 warnings
+status 1
+)"},
+        {{"@/m1", "@/m2", "@/a"},
+         {},
+         R"(@/m1: error: does not exist: a run ends with status 255 where it comes to its outputs, and later modules stay unwritten [missing-root]
+@/m2: error: does not exist: a run ends with status 255 where it comes to its outputs, and later modules stay unwritten [missing-root]
+3 modules, 2 errors, 0 warnings
 status 1
 )"},
         {{"@/a", "@/b", "@/c"},
@@ -203,9 +285,9 @@ status 1
           {"b/Manual/docdata/index.json", kGone},
           {"c/Manual/docdata/index.json", Index(R"(["p.html","P"])")},
           {"c/Manual/docdata/toc.json", kLink + "nowhere"}},
-         R"(@/a/Manual/docdata/toc.json: error: can't be read; "a" will be missing from the contents of Manual [unreadable]
+         R"(@/a/Manual/docdata/toc.json: error: is a directory, not a file; "a" will be missing from the contents of Manual [unreadable]
 @/b/Manual/docdata/index.json: error: is missing beside toc.json; "b" will be missing from the search of Manual [unreadable]
-@/c/Manual/docdata/toc.json: error: can't be read; "c" will be missing from the contents of Manual [unreadable]
+@/c/Manual/docdata/toc.json: error: is a link to what does not exist; "c" will be missing from the contents of Manual [unreadable]
 3 modules, 3 errors, 0 warnings; missing from the search of Manual: b; from its contents: a, c
 status 1
 )"},
@@ -449,6 +531,29 @@ status 0
 status 0
 )"},
         {{"--outputs", "@/a", "@/b"},
+         {{"", kCombined},
+          {"a/Manual/docdata/index.json", kGone},
+          {"a/Manual/docdata/toc.json", kGone},
+          {"b/Manual/docdata/index.json", kGone},
+          {"b/Manual/docdata/toc.json", kGone}},
+         R"(@/a/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+@/b/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+Manual: error: no module has an index.json or a toc.json, but outputs of an earlier run are there: they stay, and readers see them [nothing-to-combine]
+2 modules, 1 error, 0 warnings
+status 1
+)"},
+        {{"--outputs", "@/a", "@/b"}, {{"", kCombined}, {"a/Manual/docdata/toc.json", kFuture}}, R"(@/a/Manual/docdata/global_index.js: error: is older than @/a/Manual/docdata/toc.json, which is dated in the future, 2100-01-01 00:00:00 UTC: correct that date, or every output will be older [output-stale]
+@/a/Manual/docdata/global_index.json: error: is older than @/a/Manual/docdata/toc.json, which is dated in the future, 2100-01-01 00:00:00 UTC: correct that date, or every output will be older [output-stale]
+@/a/Manual/docdata/global_toc.js: error: is older than @/a/Manual/docdata/toc.json, which is dated in the future, 2100-01-01 00:00:00 UTC: correct that date, or every output will be older [output-stale]
+@/a/Manual/docdata/global_toc.json: error: is older than @/a/Manual/docdata/toc.json, which is dated in the future, 2100-01-01 00:00:00 UTC: correct that date, or every output will be older [output-stale]
+@/b/Manual/docdata/global_index.js: error: is older than @/a/Manual/docdata/toc.json, which is dated in the future, 2100-01-01 00:00:00 UTC: correct that date, or every output will be older [output-stale]
+@/b/Manual/docdata/global_index.json: error: is older than @/a/Manual/docdata/toc.json, which is dated in the future, 2100-01-01 00:00:00 UTC: correct that date, or every output will be older [output-stale]
+@/b/Manual/docdata/global_toc.js: error: is older than @/a/Manual/docdata/toc.json, which is dated in the future, 2100-01-01 00:00:00 UTC: correct that date, or every output will be older [output-stale]
+@/b/Manual/docdata/global_toc.json: error: is older than @/a/Manual/docdata/toc.json, which is dated in the future, 2100-01-01 00:00:00 UTC: correct that date, or every output will be older [output-stale]
+2 modules, 8 errors, 0 warnings
+status 1
+)"},
+        {{"--outputs", "@/a", "@/b"},
          {{"", kCombined}},
          R"(2 modules, 0 errors, 0 warnings
 status 0
@@ -464,8 +569,8 @@ status 0
           {"b/Manual/docdata/global_index.js", kOld}},
          R"(@/a/Manual/docdata/global_index.js: error: is cut short or broken: readers of the module can't use it [output-broken]
 @/a/Manual/docdata/global_index.json: error: is cut short or broken: readers of the module can't use it [output-broken]
-@/a/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module can't use it [output-missing]
-@/b/Manual/docdata/global_index.js: error: is older than an input of the set: readers see an earlier build [output-stale]
+@/a/Manual/docdata/global_toc.js: error: is missing: readers of the module can't use it [output-missing]
+@/b/Manual/docdata/global_index.js: error: is older than @/b/Manual/docdata/toc.json: readers see an earlier build [output-stale]
 @/b/Manual/docdata/global_toc.js: error: is cut short or broken: readers of the module can't use it [output-broken]
 @/b/Manual/docdata/global_toc.js.tmp: error: a temporary file is left over: a run was ended, and the output beside it may be old [leftover]
 @/b/Manual/docdata/global_toc.json: error: has other content than in @/a: a run ended early, and readers find different things [output-differs]
@@ -561,7 +666,9 @@ status 1
         {{"@/a/Manual/docdata/toc.json", "@/nowhere", ""},
          {},
          R"(@/a/Manual/docdata/toc.json: error: neither Manual/docdata nor ScriptReference/docdata is found in it, nor in any other root: nothing will be combined [no-modules]
-3 modules, 1 error, 0 warnings
+@/nowhere: error: does not exist: a run ends with status 255 where it comes to its outputs, and later modules stay unwritten [missing-root]
+error: does not exist: a run ends with status 255 where it comes to its outputs, and later modules stay unwritten [missing-root]
+3 modules, 3 errors, 0 warnings
 status 1
 )"},
         {{"-d", "@/c"},
@@ -574,18 +681,18 @@ status 1
          {{"a/Manual/docdata/index.json", kLink + "a/Manual/docdata/index.json"},
           {"b/Manual/docdata/toc.json", kPipe},
           {"b/Manual/docdata/global_toc.js", kDirectory}},
-         R"(@/a/Manual/docdata/global_index.js: error: is not there, or can't be read: readers of the module can't use it [output-missing]
-@/a/Manual/docdata/global_index.json: error: is not there, or can't be read: readers of the module can't use it [output-missing]
-@/a/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module can't use it [output-missing]
-@/a/Manual/docdata/global_toc.json: error: is not there, or can't be read: readers of the module can't use it [output-missing]
-@/a/Manual/docdata/index.json: error: can't be read; "a" will be missing from the search of Manual [unreadable]
+         R"(@/a/Manual/docdata/global_index.js: error: is missing: readers of the module can't use it [output-missing]
+@/a/Manual/docdata/global_index.json: error: is missing: readers of the module can't use it [output-missing]
+@/a/Manual/docdata/global_toc.js: error: is missing: readers of the module can't use it [output-missing]
+@/a/Manual/docdata/global_toc.json: error: is missing: readers of the module can't use it [output-missing]
+@/a/Manual/docdata/index.json: error: is a link that leads back to itself; "a" will be missing from the search of Manual [unreadable]
 @/a/Manual/docdata/toc.json:1:9: warning: link "toc" leads to no file: the link is dead [missing-target] /link
-@/b/Manual/docdata/global_index.js: error: is not there, or can't be read: readers of the module can't use it [output-missing]
-@/b/Manual/docdata/global_index.json: error: is not there, or can't be read: readers of the module can't use it [output-missing]
+@/b/Manual/docdata/global_index.js: error: is missing: readers of the module can't use it [output-missing]
+@/b/Manual/docdata/global_index.json: error: is missing: readers of the module can't use it [output-missing]
 @/b/Manual/docdata/global_toc.js: error: a directory is in the place of the output: the new one stays as .tmp [output-blocked]
-@/b/Manual/docdata/global_toc.js: error: is not there, or can't be read: readers of the module can't use it [output-missing]
-@/b/Manual/docdata/global_toc.json: error: is not there, or can't be read: readers of the module can't use it [output-missing]
-@/b/Manual/docdata/toc.json: error: can't be read; "b" will be missing from the contents of Manual [unreadable]
+@/b/Manual/docdata/global_toc.js: error: is a directory, not a file: readers of the module can't use it [output-missing]
+@/b/Manual/docdata/global_toc.json: error: is missing: readers of the module can't use it [output-missing]
+@/b/Manual/docdata/toc.json: error: is a pipe, not a file; "b" will be missing from the contents of Manual [unreadable]
 2 modules, 11 errors, 1 warning; missing from the search of Manual: a; from its contents: b
 status 1
 )"},
@@ -602,6 +709,8 @@ TEST(PagemeldCheck, ReportsWhatAUserMayNotReadOrWrite)
     WriteSoundModules(directory);
     fs::permissions(directory / "a/Manual/docdata/index.json", fs::perms::none);
     fs::permissions(directory / "a/Manual/docdata", fs::perms::owner_read | fs::perms::owner_exec);
+    WriteFile(directory / "b/Manual/docdata/global_index.js.tmp", "");
+    fs::permissions(directory / "b/Manual/docdata/global_index.js.tmp", fs::perms::owner_read);
     fs::create_directories(directory / "c/Manual/docdata");
     fs::permissions(directory / "c/Manual/docdata", fs::perms::none);
     std::vector<std::string> command = {PAGEMELD_CHECK_PROGRAM, directory / "a", directory / "b",
@@ -614,12 +723,13 @@ TEST(PagemeldCheck, ReportsWhatAUserMayNotReadOrWrite)
     fs::permissions(directory / "c/Manual/docdata", fs::perms::owner_all);
     EXPECT_EQ(1, result.status);
     EXPECT_EQ(
-        R"(@/a/Manual/docdata: error: can't be written to: the run ends here with status 255, and leaves 2 later modules and ScriptReference unwritten [output-blocked]
-@/a/Manual/docdata/index.json: error: can't be read; "a" will be missing from the search of Manual [unreadable]
-@/c/Manual/docdata: error: can't be written to: the run ends here with status 255, and leaves ScriptReference unwritten [output-blocked]
-@/c/Manual/docdata/index.json: error: can't be read; "c" will be missing from the search of Manual [unreadable]
-@/c/Manual/docdata/toc.json: error: can't be read; "c" will be missing from the contents of Manual [unreadable]
-3 modules, 5 errors, 0 warnings; missing from the search of Manual: a, c; from its contents: c
+        R"(@/a/Manual/docdata: error: can't be written to: permission denied: the run ends here with status 255, and leaves 2 later modules unwritten [output-blocked]
+@/a/Manual/docdata/index.json: error: can't be read: permission denied; "a" will be missing from the search of Manual [unreadable]
+@/b/Manual/docdata/global_index.js.tmp: error: a file that can't be read and written is in the place of the temporary file: a run that came so far would end here with status 255 [output-blocked]
+@/c/Manual/docdata: error: can't be written to: permission denied: a run that came so far would end here with status 255 [output-blocked]
+@/c/Manual/docdata/index.json: error: can't be reached: permission denied; "c" will be missing from the search of Manual [unreadable]
+@/c/Manual/docdata/toc.json: error: can't be reached: permission denied; "c" will be missing from the contents of Manual [unreadable]
+3 modules, 6 errors, 0 warnings; missing from the search of Manual: a, c; from its contents: c
 )",
         WithPlaceholders(result.standardOutput, directory));
 }

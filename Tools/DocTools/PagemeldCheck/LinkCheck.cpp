@@ -3,6 +3,7 @@
 #include "Tools/DocTools/PagemeldCheck/Browse/ScriptLiteral.h"
 #include "Tools/DocTools/PagemeldCheck/Browse/WebPath.h"
 #include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
+#include "Tools/DocTools/PagemeldCheck/RootCheck.h"
 #include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"
 
 #include <algorithm>
@@ -10,31 +11,54 @@
 namespace
 {
 
-/// One root as the scripts and the web see it, by the links of Manual.
-struct RootPath
+/// The directory of a root's set as the scripts and the web see it.
+struct SetPath
 {
-    explicit RootPath(const std::string& root)
-        : module(root, DocSet::Manual), webPath(WebPathOf(module.Text()))
+    SetPath(std::size_t rootPosition, const std::string& root, DocSet set)
+        : position(rootPosition),
+          module(root, set),
+          target(module.AsLinkTarget()),
+          isPlain(IsPlain(module.Text()))
     {
     }
 
+    /// Whether every name in the path is itself in a URL and in a script, and no step can be left out.
+    static bool IsPlain(const std::string& path)
+    {
+        const std::string steps = "/" + path + "/";
+        return std::none_of(path.begin(), path.end(), [](char c) { return c >= '\0' && c <= ' '; }) &&
+               path.find_first_of("%#?:\"\\") == std::string::npos &&
+               FindInvalidUtf8(path) == std::string::npos && steps.find("/./") == std::string::npos &&
+               steps.find("/../") == std::string::npos && path.find("//") == std::string::npos;
+    }
+
+    std::size_t position;
     ModulePath module;
-    std::string webPath;
+    std::string target;
+    bool isPlain;
 };
 
-/// Where the links from a root lead, if it is not where they should.
-struct WrongLinks
+/// Whether the prefix from one plain path to another is right for what RelativePrefix is: "../" for every
+/// step after the last '/' that both share, then the rest. Never true for a wrong one. It is wrong only if
+/// they share no '/', or if a name in "to" is the beginning of the other's: the walk then ends within that
+/// name.
+bool IsPlainlyRight(const SetPath& from, const SetPath& to)
 {
-    std::size_t first = 0; ///< the first root that is not reached
-    std::size_t count = 0;
-    std::string reached;    ///< instead of the first; empty if it is not a directory at all
-    bool isHandled = false; ///< whether the page script, which encodes prefixes, gets to the first
-};
+    if (!from.isPlain || !to.isPlain)
+    {
+        return false;
+    }
+    const std::string& source = from.module.Text();
+    const auto difference = std::mismatch(source.begin(), source.end(), to.target.begin(), to.target.end());
+    const bool endsWithinName =
+        difference.first != source.end() && difference.second != to.target.end() && *difference.second == '/';
+    return !endsWithinName && std::find(source.begin(), difference.first, '/') != difference.first;
+}
 
-/// Returns the prefix from one root to another as the scripts have it, or nothing if it breaks them.
-std::optional<std::string> PrefixInScripts(const RootPath& from, const RootPath& to)
+/// Returns the prefix from one set directory to another as the scripts have it, or nothing if it breaks them.
+std::optional<std::string> PrefixInScripts(const SetPath& from, const SetPath& to)
 {
-    return ValueOfScriptLiteral("\"" + RelativePrefix(from.module.Text(), to.module.AsLinkTarget()) + "\"");
+    return ValueOfScriptLiteral("\"" + RelativePrefix(from.module.Text(), to.target) + "\"");
 }
 
 /// Returns the prefix as the page script asks for it.
@@ -48,27 +72,41 @@ std::string EncodedPrefix(const std::string& prefix)
     return encoded;
 }
 
-WrongLinks FindWrongLinksFromRoot(const std::vector<RootPath>& paths, std::size_t from)
+/// Returns where the prefix leads, in the form of WebPathOf, or nothing if no directory can be named so: a
+/// script is text, so it can't hold a name that is not UTF-8.
+std::optional<std::string> FollowPrefix(const SetPath& from, const std::string& prefix)
+{
+    return FindInvalidUtf8(prefix) == std::string::npos ? FollowLink(from.module.Text(), prefix)
+                                                        : std::nullopt;
+}
+
+/// Where the links from a root lead, if it is not where they should.
+struct WrongLinks
+{
+    std::size_t first = 0; ///< the position of the first root that is not reached
+    std::size_t count = 0;
+    std::string reached;    ///< instead of the first; empty if it is not a directory at all
+    bool isHandled = false; ///< whether the page script, which encodes prefixes, gets to the first
+};
+
+WrongLinks FindWrongLinks(const std::vector<SetPath>& paths, const SetPath& from)
 {
     WrongLinks wrong;
-    for (std::size_t to = 0; to < paths.size(); ++to)
+    for (const SetPath& to : paths)
     {
-        const std::optional<std::string> prefix = PrefixInScripts(paths[from], paths[to]);
-        if (to == from || !prefix) // which is a fault of the other root
+        if (to.position == from.position || IsPlainlyRight(from, to))
         {
             continue;
         }
-        const std::optional<std::string> reached = FollowLink(paths[from].module.Text(), *prefix);
-        if (reached == paths[to].webPath)
+        const std::optional<std::string> prefix = PrefixInScripts(from, to);
+        const std::string target = WebPathOf(to.module.Text());
+        const std::optional<std::string> reached =
+            prefix ? FollowPrefix(from, *prefix) : target; // the other's fault
+        if (reached != target && wrong.count++ == 0)
         {
-            continue;
-        }
-        if (wrong.count++ == 0)
-        {
-            wrong.first = to;
+            wrong.first = to.position;
             wrong.reached = reached.value_or("");
-            wrong.isHandled =
-                FollowLink(paths[from].module.Text(), EncodedPrefix(*prefix)) == paths[to].webPath;
+            wrong.isHandled = FollowPrefix(from, EncodedPrefix(*prefix)) == target;
         }
     }
     return wrong;
@@ -96,6 +134,13 @@ bool IsBeginning(const std::string& a, const std::string& b)
     return a.compare(0, length, b, 0, length) == 0;
 }
 
+/// Whether the path has a step that leads nowhere, or back.
+bool HasEmptySteps(const std::string& root)
+{
+    return ("/" + root).find("/./") != std::string::npos || root.find("/../") != std::string::npos ||
+           root.find("//") != std::string::npos;
+}
+
 std::string Remedy(const std::string& from, const std::string& to)
 {
     if (EndsInSlash(from) || EndsInSlash(to))
@@ -106,7 +151,12 @@ std::string Remedy(const std::string& from, const std::string& to)
     {
         return "one name begins with the other: rename one";
     }
-    const bool isSpecial = to.find_first_of("%#?\\\n\r\t") != std::string::npos;
+    const bool isSpecial =
+        to.find_first_of("%#?\"\\\n\r\t") != std::string::npos || FindInvalidUtf8(to) != std::string::npos;
+    if (!isSpecial && (HasEmptySteps(from) || HasEmptySteps(to)))
+    {
+        return "give the roots without \"/./\", \"/../\" and \"//\"";
+    }
     return isSpecial || (from[0] == '/' && to[0] == '/') ? "rename the directory" : "give absolute paths";
 }
 
@@ -121,39 +171,60 @@ std::string DescribeWrongLinks(const std::vector<std::string>& roots, std::size_
            ": " + Remedy(roots[from], to);
 }
 
-/// Returns the first root in whose scripts the prefix to another one breaks the string, or nothing.
-std::optional<std::size_t> FindUnnamable(const std::vector<RootPath>& paths, std::size_t to)
+/// Returns the first set directory in whose scripts the prefix to another one breaks the string, or null.
+const SetPath* FindBroken(const std::vector<SetPath>& paths, const SetPath& to)
 {
-    for (std::size_t from = 0; from < paths.size(); ++from)
+    if (to.isPlain)
     {
-        if (!PrefixInScripts(paths[from], paths[to]))
+        return nullptr;
+    }
+    const auto broken = std::find_if(paths.begin(), paths.end(),
+                                     [&](const SetPath& from) { return !PrefixInScripts(from, to); });
+    return broken == paths.end() ? nullptr : &*broken;
+}
+
+/// Returns what is wrong with the links from or to one set directory, or an empty text.
+std::string FindFault(const std::vector<std::string>& roots, const std::vector<SetPath>& paths,
+                      const SetPath& path)
+{
+    if (const SetPath* const from = FindBroken(paths, path))
+    {
+        return "a quote, backslash or line break in the path breaks both scripts of " +
+               Visible(roots[from->position]) + ": rename the directory";
+    }
+    const WrongLinks wrong = FindWrongLinks(paths, path);
+    return wrong.count == 0 ? "" : DescribeWrongLinks(roots, path.position, wrong);
+}
+
+std::vector<SetPath> PathsOf(DocSet set, const std::vector<std::string>& roots)
+{
+    std::vector<SetPath> paths;
+    for (std::size_t i = 0; i < roots.size(); ++i)
+    {
+        if (HasSet(roots[i], set))
         {
-            return from;
+            paths.emplace_back(i, roots[i], set);
         }
     }
-    return std::nullopt;
+    return paths;
 }
 
 } // namespace
 
 void CheckLinks(const std::vector<std::string>& roots, Report& report)
 {
-    const std::vector<RootPath> paths(roots.begin(), roots.end());
-    for (std::size_t i = 0; i < roots.size(); ++i)
+    std::vector<bool> isReported(roots.size());
+    for (const auto& set : kDocSets)
     {
-        if (const std::optional<std::size_t> from = FindUnnamable(paths, i))
+        const std::vector<SetPath> paths = PathsOf(set.id, roots);
+        for (const SetPath& path : paths)
         {
-            report.Add(
-                Finding::OfRoot(Rule::WrongLinkPath, i, roots[i],
-                                "a quote, backslash or line break in the path breaks both scripts of " +
-                                    Visible(roots[*from]) + ": rename the directory"));
-            continue;
-        }
-        const WrongLinks wrong = FindWrongLinksFromRoot(paths, i);
-        if (wrong.count > 0)
-        {
-            report.Add(
-                Finding::OfRoot(Rule::WrongLinkPath, i, roots[i], DescribeWrongLinks(roots, i, wrong)));
+            const std::string fault = isReported[path.position] ? "" : FindFault(roots, paths, path);
+            if (!fault.empty())
+            {
+                isReported[path.position] = true;
+                report.Add(Finding::OfRoot(Rule::WrongLinkPath, path.position, roots[path.position], fault));
+            }
         }
     }
 }

@@ -1,3 +1,4 @@
+#include "Tools/DocTools/PagemeldCheck/DiscoveryCheck.h"
 #include "Tools/DocTools/PagemeldCheck/LinkCheck.h"
 #include "Tools/DocTools/PagemeldCheck/Options.h"
 #include "Tools/DocTools/PagemeldCheck/RootCheck.h"
@@ -60,16 +61,14 @@ int Check(Options options)
     options.checks.quoteSize = options.form.isJson ? SIZE_MAX : options.checks.quoteSize;
     options.form.isColored = !options.form.isJson && IsColored();
     Report report;
-    std::vector<std::string> roots = options.roots;
-    if (options.discover)
-    {
-        DiscoverRoots(*options.discover, roots, report);
-    }
+    const std::vector<std::string> roots =
+        options.discover ? DiscoverRoots(*options.discover, report) : options.roots;
     CheckRoots(roots, report);
     CheckLinks(roots, report);
+    bool runEnds = false;
     for (const auto& set : kDocSets)
     {
-        CheckSet(set.id, roots, options.checks, report);
+        runEnds = CheckSet(set.id, roots, options.checks, runEnds, report);
     }
     report.Print(stdout, options.form, roots);
     return Finish(report.HasErrors(options.form) ? kFaulty : kSound);

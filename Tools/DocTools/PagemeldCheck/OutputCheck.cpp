@@ -1,10 +1,16 @@
 #include "Tools/DocTools/PagemeldCheck/OutputCheck.h"
 
+#include "Tools/DocTools/PagemeldCheck/Explain/FileProblem.h"
+#include "Tools/DocTools/PagemeldCheck/OutputText.h"
 #include "Tools/DocTools/VantorPagemeld/Read/InputFile.h"
-#include "Tools/DocTools/VantorPagemeld/Read/JsonReader.h"
+#include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"
 
 #include <algorithm>
+#include <array>
+#include <ctime>
 #include <functional>
+#include <iterator>
+#include <map>
 #include <optional>
 #include <string_view>
 #include <tuple>
@@ -12,81 +18,72 @@
 namespace
 {
 
-/// What shows that a script is whole. Its end alone does not: a line in the middle can end in the same way,
-/// so a script that was cut there would pass. Only a whole one has the last part too.
-struct ScriptMarks
+/// An input of the set, and when it was last changed.
+struct DatedInput
 {
-    std::string_view bodyStart; ///< after the prefix lines
-    std::string_view lastPart;  ///< where its last statement or line begins
-    std::string_view bodyEnd;
+    std::string path;
+    timespec time = {};
 };
-
-constexpr ScriptMarks kIndexScript = {"pages = [\n", "\nsearchIndex = {", "};\n"};
-constexpr ScriptMarks kTocScript = {"toc = {\n", "\n\"link\": ", "]};\n"};
-
-std::optional<std::string_view> JsonBody(const char* text, std::string_view whole)
-{
-    rapidjson::Document document;
-    return ParseJson(text, document).IsError() ? std::nullopt : std::optional(whole);
-}
-
-std::optional<std::string_view> ScriptBody(const ScriptMarks& marks, std::string_view whole)
-{
-    const bool hasPrefixes = whole.substr(0, marks.bodyStart.size()) != marks.bodyStart;
-    const std::size_t lineEnd = hasPrefixes ? whole.find("\n" + std::string(marks.bodyStart)) : 0;
-    if (lineEnd == std::string_view::npos)
-    {
-        return std::nullopt;
-    }
-    const std::string_view body = whole.substr(lineEnd + (hasPrefixes ? 1 : 0));
-    const bool isWhole = body.find(marks.lastPart) != std::string_view::npos &&
-                         body.substr(body.size() - marks.bodyEnd.size()) == marks.bodyEnd;
-    return isWhole ? std::optional(body) : std::nullopt;
-}
-
-/// Returns what all modules' copies share, or nothing if the output is not whole.
-std::optional<std::string_view> BodyOf(Output output, const InputText& text)
-{
-    const std::string_view whole(text.bytes.get(), text.bytesRead);
-    switch (output)
-    {
-    case Output::IndexScript:
-        return ScriptBody(kIndexScript, whole);
-    case Output::TocScript:
-        return ScriptBody(kTocScript, whole);
-    case Output::IndexJson:
-    case Output::TocJson:
-    case Output::Count:
-        break;
-    }
-    return JsonBody(text.bytes.get(), whole);
-}
 
 bool IsEarlier(const timespec& a, const timespec& b)
 {
     return std::tie(a.tv_sec, a.tv_nsec) < std::tie(b.tv_sec, b.tv_nsec);
 }
 
-timespec NewestInput(const std::vector<SetModule>& modules)
+DatedInput NewestInput(const std::vector<SetModule>& modules)
 {
-    timespec newest = {};
+    DatedInput newest;
     for (const SetModule& module : modules)
     {
         for (const auto& input : kInputs)
         {
-            const FileStatus status = FileStatus::Of(module.path.PathOf(input.id));
-            newest = std::max(newest, status.Details().st_mtim, IsEarlier);
+            const std::string path = module.path.PathOf(input.id);
+            const timespec time = FileStatus::Of(path).Details().st_mtim;
+            newest = IsEarlier(newest.time, time) ? DatedInput{path, time} : newest;
         }
     }
     return newest;
 }
 
-/// Compares the copies of one output with the inputs, and with the first whole copy.
+std::string DescribeStale(const DatedInput& newest)
+{
+    const std::string older = "is older than " + Visible(newest.path);
+    if (newest.time.tv_sec <= std::time(nullptr))
+    {
+        return older + ": readers see an earlier build";
+    }
+    std::array<char, 32> date = {};
+    (void)std::strftime(date.data(), date.size(), "%Y-%m-%d %H:%M:%S UTC", std::gmtime(&newest.time.tv_sec));
+    return older + ", which is dated in the future, " + date.data() +
+           ": correct that date, or every output will be older";
+}
+
+/// Returns the modules that a run merges into an output, as the combiner numbers them.
+std::map<int, std::string> MergedModules(const OutputRow& output, const std::vector<SetModule>& modules)
+{
+    const bool isIndex = output.id == Output::IndexJson || output.id == Output::IndexScript;
+    std::map<int, std::string> merged;
+    for (const SetModule& module : modules)
+    {
+        if ((isIndex ? module.index : module.toc).IsSound())
+        {
+            merged.emplace(static_cast<int>(merged.size()), module.path.AsLinkTarget());
+        }
+    }
+    return merged;
+}
+
+/// Compares the copies of one output with what a run would write, as far as that is known without merging:
+/// with its prefix lines, with the first whole copy and with the dates of the inputs.
 class CopyCheck
 {
 public:
-    CopyCheck(Output output, const timespec& newestInput, Report& report)
-        : m_output(RowOf(kOutputs, output)), m_newestInput(newestInput), m_report(report)
+    CopyCheck(const OutputRow& output, const std::vector<SetModule>& modules, const DatedInput& newestInput,
+              Report& report)
+        : m_output(output),
+          m_merged(MergedModules(output, modules)),
+          m_newestInput(newestInput),
+          m_report(report)
     {
     }
 
@@ -96,65 +93,97 @@ public:
         const InputText text = ReadInputFile(file.path.c_str());
         if (text.outcome != InputText::Outcome::Read)
         {
-            m_report.Add(
-                Finding::OfFile(Rule::OutputMissing, file,
-                                "is not there, or can't be read: readers of the module can't use it"));
+            Add(Rule::OutputMissing, file,
+                DescribeUnreadable(file.path) + ": readers of the module can't use it");
             return;
         }
-        if (IsStale(file.path))
+        const std::string_view whole(text.bytes.get(), text.bytesRead);
+        const std::size_t start = FindBody(m_output, whole);
+        if (start == std::string_view::npos || !IsWholeCopy(whole.substr(start)))
         {
-            m_report.Add(Finding::OfFile(Rule::OutputStale, file,
-                                         "is older than an input of the set: readers see an earlier build"));
-        }
-        if (const std::optional<std::string_view> body = BodyOf(m_output.id, text))
-        {
-            CompareWithFirst(file, module.root, *body);
+            Add(Rule::OutputBroken, file, "is cut short or broken: readers of the module can't use it");
             return;
         }
-        m_report.Add(Finding::OfFile(Rule::OutputBroken, file,
-                                     "is cut short or broken: readers of the module can't use it"));
+        Compare(module, file, whole.substr(0, start), whole.substr(start));
     }
 
 private:
-    [[nodiscard]] bool IsStale(const std::string& path) const
+    /// What tells bodies apart.
+    struct Fingerprint
     {
-        const FileStatus status = FileStatus::Of(path);
-        return status.Exists() && IsEarlier(status.Details().st_mtim, m_newestInput);
+        explicit Fingerprint(std::string_view body)
+            : size(body.size()), hash(std::hash<std::string_view>()(body))
+        {
+        }
+
+        friend bool operator==(const Fingerprint& a, const Fingerprint& b)
+        {
+            return a.size == b.size && a.hash == b.hash;
+        }
+
+        std::size_t size;
+        std::size_t hash;
+    };
+
+    /// A copy that is the same as a whole one is whole. So only the first JSON text is parsed.
+    [[nodiscard]] bool IsWholeCopy(std::string_view body) const
+    {
+        return m_first == Fingerprint(body) || IsWholeBody(m_output, body);
     }
 
-    void CompareWithFirst(const ModuleFile& file, const std::string& root, std::string_view body)
+    void Compare(const SetModule& module, const ModuleFile& file, std::string_view head,
+                 std::string_view body)
     {
-        const std::size_t hash = std::hash<std::string_view>()(body);
-        if (m_firstRoot.empty())
+        if (!m_first)
         {
-            m_firstRoot = Visible(root);
-            m_firstSize = body.size();
-            m_firstHash = hash;
+            m_first.emplace(body);
+            m_firstRoot = Visible(module.root);
         }
-        else if (m_firstSize != body.size() || m_firstHash != hash)
+        if (head != ExpectedHead(module))
         {
-            m_report.Add(Finding::OfFile(Rule::OutputDiffers, file,
-                                         "has other content than in " + m_firstRoot +
-                                             ": a run ended early, and readers find different things"));
+            Add(Rule::WrongPrefixes, file,
+                "its links were made for other modules, or for other names or places of them: run pagemeld "
+                "again");
         }
+        else if (!(m_first == Fingerprint(body)))
+        {
+            Add(Rule::OutputDiffers, file,
+                "has other content than in " + m_firstRoot +
+                    ": a run ended early, and readers find different things");
+        }
+        else if (IsEarlier(FileStatus::Of(file.path).Details().st_mtim, m_newestInput.time))
+        {
+            Add(Rule::OutputStale, file, DescribeStale(m_newestInput));
+        }
+    }
+
+    [[nodiscard]] std::string ExpectedHead(const SetModule& module) const
+    {
+        return m_output.form == OutputRow::Form::Script ? RenderPrefixLines(module.path.Text(), m_merged)
+                                                        : "";
+    }
+
+    void Add(Rule rule, const ModuleFile& file, std::string message)
+    {
+        m_report.Add(Finding::OfFile(rule, file, std::move(message)));
     }
 
     const OutputRow& m_output;
-    const timespec& m_newestInput;
+    const std::map<int, std::string> m_merged;
+    const DatedInput& m_newestInput;
     Report& m_report;
-    std::string m_firstRoot; ///< of the first whole copy; empty as long as there is none
-    std::size_t m_firstSize = 0;
-    std::size_t m_firstHash = 0;
+    std::optional<Fingerprint> m_first; ///< of the first whole copy
+    std::string m_firstRoot;
 };
 
 } // namespace
 
 void CheckOutputs(const std::vector<SetModule>& modules, Report& report)
 {
-    const timespec newestInput = NewestInput(modules);
+    const DatedInput newestInput = NewestInput(modules);
     for (const OutputRow& output : kOutputs)
     {
-        CopyCheck check(output.id, newestInput, report);
+        CopyCheck check(output, modules, newestInput, report);
         for (const SetModule& module : modules)
         {
             if (module.hasDocdata) // otherwise output-blocked reports it
@@ -163,6 +192,18 @@ void CheckOutputs(const std::vector<SetModule>& modules, Report& report)
             }
         }
     }
+}
+
+bool HasOutputs(const std::vector<SetModule>& modules)
+{
+    return std::any_of(modules.begin(), modules.end(),
+                       [](const SetModule& module)
+                       {
+                           return std::any_of(std::begin(kOutputs), std::end(kOutputs),
+                                              [&](const OutputRow& output) {
+                                                  return FileStatus::Of(module.path.PathOf(output)).Exists();
+                                              });
+                       });
 }
 
 void CheckLeftovers(const std::vector<SetModule>& modules, Report& report)

@@ -5,9 +5,12 @@
 #include <string>
 #include <vector>
 
-/// Appends the modules that "pagemeld -autopaths DIRECTORY" would take to roots, and reports what it passes
-/// over, or that there are none.
-void DiscoverRoots(const std::string& directory, std::vector<std::string>& roots, Report& report);
+/// Whether a root has a set: pagemeld reads and writes its docdata directory only.
+[[nodiscard]] bool HasSet(const std::string& root, DocSet set);
 
-/// Reports if none of the roots is a module, and roots that are the same directory.
+/// Whether a root has any set.
+[[nodiscard]] bool IsModule(const std::string& root);
+
+/// Reports roots that do not exist, if none of the roots is a module, and roots or sets that are the same
+/// directory.
 void CheckRoots(const std::vector<std::string>& roots, Report& report);

@@ -1,6 +1,7 @@
 #include "Tools/DocTools/PagemeldCheck/SetCheck.h"
 
 #include "Tools/DocTools/PagemeldCheck/ContentsCheck.h"
+#include "Tools/DocTools/PagemeldCheck/Explain/FileProblem.h"
 #include "Tools/DocTools/PagemeldCheck/OutputCheck.h"
 #include "Tools/DocTools/PagemeldCheck/SetModule.h"
 #include "Tools/DocTools/PagemeldCheck/WriteCheck.h"
@@ -47,8 +48,8 @@ void ReportUnreadable(const FileScope& scope, const InputFacts& facts, Report& r
     if (isMissing || facts.state == InputFacts::State::Unreadable)
     {
         const Input other = scope.input == Input::Index ? Input::Toc : Input::Index;
-        const std::string reason =
-            isMissing ? std::string("is missing beside ") + NameOf(other) : "can't be read";
+        const std::string reason = isMissing ? std::string("is missing beside ") + NameOf(other)
+                                             : DescribeUnreadable(scope.file.path);
         report.Add(Finding::OfFile(Rule::Unreadable, scope.file, reason + "; " + scope.Loss()));
     }
 }
@@ -100,7 +101,15 @@ bool CheckWhetherWritten(DocSet set, const Modules& modules, Report& report)
     const auto has = [&](auto test) { return std::any_of(modules.begin(), modules.end(), test); };
     const bool hasIndex = has([](const SetModule& module) { return module.index.IsSound(); });
     const bool hasToc = has([](const SetModule& module) { return module.toc.IsSound(); });
-    if (has([](const SetModule& module) { return module.HasFiles(); }) && !(hasIndex && hasToc))
+    const bool hasFiles = has([](const SetModule& module) { return module.HasFiles(); });
+    if (!hasFiles && HasOutputs(modules))
+    {
+        report.Add(
+            Finding::OfSet(Rule::NothingToCombine, set,
+                           "no module has an index.json or a toc.json, but outputs of an earlier run are "
+                           "there: they stay, and readers see them"));
+    }
+    if (hasFiles && !(hasIndex && hasToc))
     {
         report.Add(Finding::OfSet(Rule::NothingToCombine, set,
                                   std::string("no module has ") +
@@ -129,7 +138,8 @@ void NoteMissing(const Modules& modules, MissingModules& missing)
 
 } // namespace
 
-void CheckSet(DocSet set, const std::vector<std::string>& roots, const CheckOptions& options, Report& report)
+bool CheckSet(DocSet set, const std::vector<std::string>& roots, const CheckOptions& options, bool runEnds,
+              Report& report)
 {
     Modules modules = ModulesOf(set, roots, options);
     EarlierModules earlier;
@@ -143,10 +153,7 @@ void CheckSet(DocSet set, const std::vector<std::string>& roots, const CheckOpti
     CheckContentRoots(modules, report);
     CheckCommonWords(set, modules, report);
     const bool isWritten = CheckWhetherWritten(set, modules, report);
-    if (isWritten)
-    {
-        CheckWritable(modules, report);
-    }
+    runEnds = isWritten ? CheckWritable(modules, runEnds, report) : runEnds;
     if (isWritten && options.checksOutputs)
     {
         CheckOutputs(modules, report);
@@ -156,4 +163,5 @@ void CheckSet(DocSet set, const std::vector<std::string>& roots, const CheckOpti
         CheckLeftovers(modules, report);
     }
     NoteMissing(modules, report.MissingOf(set));
+    return runEnds;
 }

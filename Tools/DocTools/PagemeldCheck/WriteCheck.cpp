@@ -1,75 +1,132 @@
 #include "Tools/DocTools/PagemeldCheck/WriteCheck.h"
 
-#include <fcntl.h>
-#include <unistd.h>
+#include "Tools/DocTools/PagemeldCheck/Explain/FileProblem.h"
+#include "Tools/DocTools/PagemeldCheck/RootCheck.h"
+
+#include <algorithm>
 
 namespace
 {
 
-std::string EndOfRun(std::size_t laterModules, DocSet set)
+/// Whether any of the modules has a directory for the outputs of the set after this one.
+bool IsSetAfter(const std::vector<SetModule>& modules)
 {
-    std::string unwritten = laterModules == 0 ? "" : Counted(laterModules, "later module");
-    if (set == DocSet::Manual)
-    {
-        unwritten += (unwritten.empty() ? "" : " and ") + std::string(NameOf(DocSet::ScriptReference));
-    }
-    return "the run ends here with status 255" +
-           (unwritten.empty() ? "" : ", and leaves " + unwritten + " unwritten");
+    return modules.front().docdata.set == DocSet::Manual &&
+           std::any_of(modules.begin(), modules.end(),
+                       [](const SetModule& module) { return HasSet(module.root, DocSet::ScriptReference); });
 }
 
-/// Returns why nothing can be written into the directory, or an empty text.
-std::string ProblemOf(const std::string& docdata)
+/// The places of the outputs of one set, in the order in which a run comes to them.
+class WriteCheck
 {
-    const FileStatus status = FileStatus::Of(docdata);
-    if (!status.Exists())
+public:
+    WriteCheck(const std::vector<SetModule>& modules, bool runEnds, Report& report)
+        : m_modules(modules), m_runEnds(runEnds), m_report(report)
     {
-        return "is missing";
     }
-    if (!status.IsDirectory())
-    {
-        return "is not a directory";
-    }
-    return ::faccessat(AT_FDCWD, docdata.c_str(), W_OK | X_OK, AT_EACCESS) == 0 ? "" : "can't be written to";
-}
 
-void CheckPlace(const SetModule& module, const OutputRow& output, const std::string& endOfRun, Report& report)
-{
-    const ModuleFile file = module.File(output);
-    const ModuleFile temporary = module.File(TemporaryPathOf(file.path));
-    const FileStatus status = FileStatus::Of(temporary.path);
-    // A link to a directory is not an obstacle: the rename replaces it.
-    if (FileStatus::OfEntry(file.path).IsDirectory())
+    bool Run()
     {
-        report.Add(Finding::OfFile(Rule::OutputBlocked, file,
-                                   "a directory is in the place of the output: the new one stays as .tmp"));
+        for (const SetModule& module : m_modules)
+        {
+            CheckModule(module);
+        }
+        return m_runEnds;
     }
-    if (status.IsDirectory() || status.IsPipe())
+
+private:
+    void CheckModule(const SetModule& module)
     {
-        const bool endsRun = output.ifUnopened == OutputRow::IfUnopened::EndRun;
-        const std::string what = status.IsDirectory() ? "a directory" : "a pipe";
-        report.Add(Finding::OfFile(Rule::OutputBlocked, temporary,
-                                   what + " is in the place of the temporary file: " +
-                                       (endsRun ? endOfRun : "the run keeps the old output")));
+        const std::string problem = DescribeUnwritableDirectory(module.docdata.path);
+        if (!module.Exists())
+        {
+            m_runEnds = true;
+        }
+        else if (!problem.empty())
+        {
+            Add(module.docdata, problem + ": " + EndOfRun(module));
+        }
+        else
+        {
+            for (const OutputRow& output : kOutputs)
+            {
+                CheckOutput(module, output);
+                CheckTemporary(module, output);
+            }
+        }
     }
-}
+
+    void CheckOutput(const SetModule& module, const OutputRow& output)
+    {
+        const ModuleFile file = module.File(output);
+        // A link to a directory is not an obstacle: the rename replaces it.
+        if (FileStatus::OfEntry(file.path).IsDirectory())
+        {
+            Add(file, "a directory is in the place of the output: the new one stays as .tmp");
+        }
+        else if (IsReservedForOwner(module.docdata.path, file.path))
+        {
+            Add(file,
+                "the output of another user in a sticky directory can't be replaced: the new one stays as "
+                ".tmp");
+        }
+    }
+
+    void CheckTemporary(const SetModule& module, const OutputRow& output)
+    {
+        const ModuleFile file = module.File(TemporaryPathOf(module.path.PathOf(output)));
+        const std::string obstacle = DescribeObstacle(file.path);
+        if (!obstacle.empty())
+        {
+            const bool endsRun = output.ifUnopened == OutputRow::IfUnopened::EndRun;
+            Add(file, obstacle + " is in the place of the temporary file: " +
+                          (endsRun ? EndOfRun(module) : "the run keeps the old output"));
+        }
+        else if (FileStatus::Of(file.path).IsDevice())
+        {
+            Add(file,
+                "a device is in the place of the temporary file: the run writes into it, and it becomes the "
+                "output: readers get nothing");
+        }
+        else if (IsReservedForOwner(module.docdata.path, file.path))
+        {
+            Add(file,
+                "the temporary file of another user in a sticky directory can't be renamed: the run keeps "
+                "the old output");
+        }
+    }
+
+    /// Returns what follows where the run ends, or would end if it came that far.
+    std::string EndOfRun(const SetModule& module)
+    {
+        if (m_runEnds)
+        {
+            return "a run that came so far would end here with status 255";
+        }
+        m_runEnds = true;
+        const std::size_t laterModules = m_modules.size() - 1 - module.docdata.module;
+        std::string unwritten = laterModules == 0 ? "" : Counted(laterModules, "later module");
+        if (IsSetAfter(m_modules))
+        {
+            unwritten += (unwritten.empty() ? "" : " and ") + std::string(NameOf(DocSet::ScriptReference));
+        }
+        return "the run ends here with status 255" +
+               (unwritten.empty() ? "" : ", and leaves " + unwritten + " unwritten");
+    }
+
+    void Add(const ModuleFile& file, std::string message)
+    {
+        m_report.Add(Finding::OfFile(Rule::OutputBlocked, file, std::move(message)));
+    }
+
+    const std::vector<SetModule>& m_modules;
+    bool m_runEnds;
+    Report& m_report;
+};
 
 } // namespace
 
-void CheckWritable(const std::vector<SetModule>& modules, Report& report)
+bool CheckWritable(const std::vector<SetModule>& modules, bool runEnds, Report& report)
 {
-    for (const SetModule& module : modules)
-    {
-        const ModuleFile& docdata = module.docdata;
-        const std::string endOfRun = EndOfRun(modules.size() - 1 - docdata.module, docdata.set);
-        const std::string problem = ProblemOf(docdata.path);
-        if (!problem.empty())
-        {
-            report.Add(Finding::OfFile(Rule::OutputBlocked, docdata, problem + ": " + endOfRun));
-            continue;
-        }
-        for (const OutputRow& output : kOutputs)
-        {
-            CheckPlace(module, output, endOfRun, report);
-        }
-    }
+    return WriteCheck(modules, runEnds, report).Run();
 }

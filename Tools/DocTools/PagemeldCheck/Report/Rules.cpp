@@ -13,10 +13,13 @@ constexpr RuleRow kRules[] = {
      "Nothing is combined; earlier outputs stay, and the run ends with status 0.",
      "A module is the directory above Manual/docdata and ScriptReference/docdata. Give the modules, or with "
      "--discover a directory above them."},
-    {Rule::DuplicateRoot, Level::Error, "duplicate-root", "two roots are the same directory",
-     "The module's pages are in the search twice, and its links in the contents may be those of "
-     "either name.",
-     "Give each module once."},
+    {Rule::MissingRoot, Level::Error, "missing-root", "a root does not exist",
+     "The run ends with status 255 where it comes to its outputs, and later modules stay unwritten.",
+     "Correct the path, or leave it out."},
+    {Rule::DuplicateRoot, Level::Error, "duplicate-root", "two roots or sets are the same directory",
+     "Pages are in the search twice, links may be those of either name, and the outputs of one replace those "
+     "of the other.",
+     "Give each module once, and each set a directory of its own."},
     {Rule::PassedOver, Level::Warning, "passed-over",
      "a directory looks like a module, but --discover does not take it",
      "The module is missing from search and contents, and receives no outputs.",
@@ -105,6 +108,10 @@ constexpr RuleRow kRules[] = {
     {Rule::OutputBroken, Level::Error, "output-broken", "--outputs: an output is cut short or not JSON",
      "Readers of the module can't search, or see no contents.",
      "Free space on the disk and run pagemeld again."},
+    {Rule::WrongPrefixes, Level::Error, "wrong-prefixes",
+     "--outputs: a script's links were made for other modules, or for other names or places of them",
+     "Links lead to the wrong module or nowhere, and modules that came later are not found.",
+     "Run pagemeld again, with the same roots as here."},
     {Rule::OutputDiffers, Level::Error, "output-differs",
      "--outputs: an output has other content than in the first module",
      "Readers of different modules find different things: a run ended early.",

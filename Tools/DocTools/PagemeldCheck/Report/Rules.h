@@ -15,6 +15,7 @@ enum class Level
 enum class Rule
 {
     NoModules,
+    MissingRoot,
     DuplicateRoot,
     PassedOver,
     OutputBlocked,
@@ -40,6 +41,7 @@ enum class Rule
     UnlistedPage,
     OutputMissing,
     OutputBroken,
+    WrongPrefixes,
     OutputDiffers,
     OutputStale,
     Leftover,

@@ -39,9 +39,6 @@ public:
     {
     }
 
-    IndexMerge(const IndexMerge&) = delete;
-    IndexMerge& operator=(const IndexMerge&) = delete;
-
     /// Moves all of input except its common words, which are copied if there are none yet.
     void Append(rapidjson::Document& input);
 

@@ -14,6 +14,7 @@ public:
     SortedListing(const SortedListing&) = delete;
     SortedListing& operator=(const SortedListing&) = delete;
 
+    [[nodiscard]] bool Failed() const { return m_count < 0; }
     [[nodiscard]] dirent* const* begin() const { return m_entries; }
     [[nodiscard]] dirent* const* end() const { return m_count > 0 ? m_entries + m_count : m_entries; }
 

@@ -26,6 +26,9 @@ public:
     [[nodiscard]] bool IsDirectory() const { return S_ISDIR(m_status.st_mode); }
     [[nodiscard]] bool IsRegularFile() const { return S_ISREG(m_status.st_mode); }
     [[nodiscard]] bool IsPipe() const { return S_ISFIFO(m_status.st_mode); }
+    [[nodiscard]] bool IsSocket() const { return S_ISSOCK(m_status.st_mode); }
+    [[nodiscard]] bool IsLink() const { return S_ISLNK(m_status.st_mode); }
+    [[nodiscard]] bool IsDevice() const { return S_ISCHR(m_status.st_mode) || S_ISBLK(m_status.st_mode); }
 
     /// All else that the system tells; zeros if nothing is there.
     [[nodiscard]] const struct stat& Details() const { return m_status; }
