@@ -37,7 +37,7 @@ core::string LogFailures(const std::vector<NativeTestReporter::Failure>& failure
 /// Converts through a signed number: converting a negative float to an unsigned number is undefined.
 unsigned long long ToMicroseconds(float seconds)
 {
-    return static_cast<unsigned long long>(static_cast<long long>(seconds * 1'000'000));
+    return static_cast<unsigned long long>(static_cast<long long>(ToSmallerUnit(seconds, 1'000'000)));
 }
 
 unsigned long long MillisecondsSinceUnixEpoch()

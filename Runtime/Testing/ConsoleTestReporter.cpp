@@ -25,13 +25,13 @@ float ClampPrintedDuration(const TestDetails& details, float seconds)
         return seconds;
     }
     std::fprintf(stderr, "Test %s reported negative time: %fms. Time output clamped to 0ms.\n",
-                 GetDisplayedTestName(details).c_str(), static_cast<double>(seconds * 1000));
+                 GetDisplayedTestName(details).c_str(), static_cast<double>(ToSmallerUnit(seconds, 1000)));
     return 0;
 }
 
 core::string DescribePass(const NativeTestReporter& reporter, float seconds)
 {
-    core::string status = Format("PASS(%lldms", static_cast<long long>(seconds * 1000));
+    core::string status = Format("PASS(%lldms", static_cast<long long>(ToSmallerUnit(seconds, 1000)));
     for (const auto& [name, property] : reporter.properties)
     {
         status += ", " + name + ": " + property.AsString();

@@ -4,6 +4,13 @@
 
 using UnitTest::TestDetails;
 
+float ToSmallerUnit(float seconds, float unitsPerSecond)
+{
+    // An x87 register holds more digits than a float, also after a cast; a store into memory rounds.
+    volatile const float rounded = seconds * unitsPerSecond;
+    return rounded;
+}
+
 bool NativeTestReporter::Failure::operator==(const Failure& other) const
 {
     return filename == other.filename && line == other.line && message == other.message;

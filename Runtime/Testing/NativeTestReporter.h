@@ -5,6 +5,10 @@
 #include <map>
 #include <vector>
 
+/// Returns seconds in a smaller unit, rounded to single precision also where the processor computes with more
+/// digits: 0.015 seconds are 15 milliseconds, not 14.99.
+float ToSmallerUnit(float seconds, float unitsPerSecond);
+
 /// What all reporters share: keeps the state of the running test and the list of failed ones. A derived class
 /// turns it into output.
 class NativeTestReporter : public UnitTest::TestReporter
