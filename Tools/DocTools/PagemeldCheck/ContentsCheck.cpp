@@ -28,15 +28,15 @@ void ReportRoot(const SetModule& module, const SetModule& other, const std::stri
 
 void ReportOddFirst(const SetModule& first, const Modules& dropped, Report& report)
 {
-    std::string names;
+    std::vector<std::string> names;
     for (const SetModule* module : dropped)
     {
-        AppendListed(names, module->name);
+        names.push_back(module->name);
     }
     ReportRoot(first, *dropped.front(),
                "of " + std::to_string(dropped.size()) +
                    " other modules; it comes first, so they are dropped from the contents of " +
-                   NameOf(first.docdata.set) + ": " + names,
+                   NameOf(first.docdata.set) + ": " + Listed(names),
                report);
 }
 

@@ -16,7 +16,7 @@ void ReportMissing(const std::vector<std::string>& roots, Report& report)
 {
     for (std::size_t i = 0; i < roots.size(); ++i)
     {
-        if (!FileStatus::Of(roots[i]).Exists())
+        if (!RootExists(roots[i]))
         {
             report.Add(
                 Finding::OfRoot(Rule::MissingRoot, i, roots[i],
@@ -30,8 +30,7 @@ void ReportMissing(const std::vector<std::string>& roots, Report& report)
 /// of them in every set that is written.
 void ReportIfNoneIsModule(const std::vector<std::string>& roots, Report& report)
 {
-    const auto first = std::find_if(roots.begin(), roots.end(),
-                                    [](const std::string& root) { return FileStatus::Of(root).Exists(); });
+    const auto first = std::find_if(roots.begin(), roots.end(), RootExists);
     if (first != roots.end() && std::none_of(roots.begin(), roots.end(), IsModule))
     {
         report.Add(Finding::OfRoot(
@@ -98,6 +97,11 @@ void ReportDuplicates(const std::vector<std::string>& roots, Report& report)
 }
 
 } // namespace
+
+bool RootExists(const std::string& root)
+{
+    return FileStatus::Of(root.empty() ? "/" : root).Exists();
+}
 
 bool HasSet(const std::string& root, DocSet set)
 {

@@ -5,6 +5,9 @@
 #include <string>
 #include <vector>
 
+/// Whether there is anything at a root. The empty one is that of the file system: its set is /Manual.
+[[nodiscard]] bool RootExists(const std::string& root);
+
 /// Whether a root has a set: pagemeld reads and writes its docdata directory only.
 [[nodiscard]] bool HasSet(const std::string& root, DocSet set);
 

@@ -78,12 +78,12 @@ void CheckCommonWords(DocSet set, const Modules& modules, Report& report)
 {
     const auto hasWords = [](const SetModule& module) { return !module.index.commonWords.empty(); };
     const auto counts = std::find_if(modules.begin(), modules.end(), hasWords);
-    std::string differing;
+    std::vector<std::string> differing;
     for (auto module = counts; module != modules.end(); ++module)
     {
         if (hasWords(*module) && module->index.commonWords != counts->index.commonWords)
         {
-            AppendListed(differing, module->name);
+            differing.push_back(module->name);
         }
     }
     if (!differing.empty())
@@ -91,7 +91,7 @@ void CheckCommonWords(DocSet set, const Modules& modules, Report& report)
         report.Add(Finding::OfSet(Rule::CommonIgnored, set,
                                   "the common words of " + counts->name +
                                       " count for all modules; those that differ are ignored, of " +
-                                      differing));
+                                      Listed(differing)));
     }
 }
 

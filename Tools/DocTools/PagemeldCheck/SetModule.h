@@ -35,9 +35,6 @@ struct SetModule
 
     InputFacts& FactsOf(Input input) { return input == Input::Index ? index : toc; }
 
-    /// Whether there is anything at the module's root.
-    [[nodiscard]] bool Exists() const { return FileStatus::Of(root).Exists(); }
-
     /// Whether the module brings anything to the set, sound or not.
     [[nodiscard]] bool HasFiles() const
     {

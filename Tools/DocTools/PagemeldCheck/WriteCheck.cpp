@@ -38,7 +38,7 @@ private:
     void CheckModule(const SetModule& module)
     {
         const std::string problem = DescribeUnwritableDirectory(module.docdata.path);
-        if (!module.Exists())
+        if (!RootExists(module.root))
         {
             m_runEnds = true;
         }

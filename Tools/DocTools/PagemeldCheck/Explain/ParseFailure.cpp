@@ -103,10 +103,10 @@ std::string DescribeStringCharacter(char c)
     switch (c)
     {
     case '\\':
-        return "a backslash in a string must be doubled";
+        return "a backslash in a string must be doubled; in a title or path, use another character";
     case '\n':
     case '\r':
-        return "a line break in a string must be written as \\n";
+        return "a line break in a string: write a space, or \\n if it is not in a title or path";
     case '\t':
         return "a tab in a string must be written as \\t";
     default:
@@ -121,10 +121,16 @@ std::string DescribeCause(std::string_view text, std::size_t size, const rapidjs
     {
         return cause;
     }
+    if (failure.Code() == rapidjson::kParseErrorTermination)
+    {
+        return DescribeLimit(text, failure.Offset());
+    }
+    if (failure.Offset() >= text.size())
+    {
+        return "the text ends too early: it was cut, or brackets are left open: write the file again";
+    }
     switch (failure.Code())
     {
-    case rapidjson::kParseErrorTermination:
-        return DescribeLimit(text, failure.Offset());
     case rapidjson::kParseErrorNumberTooBig:
         return "a number is too large";
     case rapidjson::kParseErrorDocumentRootNotSingular:

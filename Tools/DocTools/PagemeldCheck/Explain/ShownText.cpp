@@ -174,7 +174,14 @@ std::string Counted(std::size_t count, const std::string& noun)
     return std::to_string(count) + " " + noun + (count == 1 ? "" : "s");
 }
 
-void AppendListed(std::string& list, const std::string& item)
+std::string Listed(const std::vector<std::string>& items)
 {
-    list += (list.empty() ? "" : ", ") + item;
+    constexpr std::size_t kMaxShown = 10;
+    std::string list;
+    for (std::size_t i = 0; i < items.size() && i < kMaxShown; ++i)
+    {
+        list += (i == 0 ? "" : ", ") + items[i];
+    }
+    return items.size() <= kMaxShown ? list
+                                     : list + " and " + std::to_string(items.size() - kMaxShown) + " more";
 }

@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <string>
 #include <string_view>
+#include <vector>
 
 // Texts of input files and names on disk come from strangers. They are shown so that they can neither change
 // the terminal nor pass for something else.
@@ -26,5 +27,5 @@ std::string NameOfRoot(std::string_view root);
 /// Returns a number and a noun: "1 page", "3 pages".
 std::string Counted(std::size_t count, const std::string& noun);
 
-/// Appends an item to a list with commas between the items.
-void AppendListed(std::string& list, const std::string& item);
+/// Returns the items with commas between them: the first ten, and the number of the others.
+std::string Listed(const std::vector<std::string>& items);

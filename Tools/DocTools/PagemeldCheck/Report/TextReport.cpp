@@ -28,12 +28,12 @@ std::string ShownPointer(const std::string& pointer)
 
 std::string NamesOf(const std::vector<std::string>& roots)
 {
-    std::string names;
+    std::vector<std::string> names;
     for (const std::string& root : roots)
     {
-        AppendListed(names, Visible(NameOfRoot(root)));
+        names.push_back(Visible(NameOfRoot(root)));
     }
-    return names;
+    return Listed(names);
 }
 
 } // namespace
