@@ -5,9 +5,10 @@
 #include <cstdint>
 #include <utility>
 
-// The renderer escapes the double quotes of titles and nothing else, so a backslash in a title or a link
-// means to a browser whatever the language makes of it. Only a walk by the rules of the language shows what
-// readers get. Nearly all texts have nothing to walk over: one pre-check is all that they cost.
+// The renderer escapes the double quotes of titles and nothing else, so a browser reads a backslash in a
+// title or a link as the start of an escape. To know what readers get, the literal is decoded by the
+// language's own rules. Nearly all texts have no backslash, quote or line break, and cost one cheap
+// pre-check.
 
 namespace
 {
@@ -156,8 +157,8 @@ private:
                TakeIf("\xE2\x80\xA9");
     }
 
-    /// Any other character means a control character or itself. Of one that has several bytes this
-    /// takes the first; the others follow as ordinary text.
+    /// Takes the character after a backslash: the name of a control character, or any other, which has no
+    /// special meaning. Of a character of several bytes this takes the first; the rest is ordinary text.
     void TakeCharacter()
     {
         constexpr std::string_view kNames = "bfnrtv";

@@ -24,10 +24,9 @@
 ///
 /// fromDirectory is a path on disk, which the page's address holds without doubled slashes, each character
 /// literal. link is a URL reference: "#" and "?" end its path, "%41" is an A, a backslash is a slash, tabs
-/// and line breaks are dropped, as are spaces and control characters at either end. An empty name between two
-/// slashes is one more to climb for a ".." after it; what remains of them is then dropped, since the
-/// directory is the same. A ".." above "/" stays there; one above the start of a relative path is kept. Bytes
-/// above 0x7F pass as they are.
+/// and line breaks are dropped, as are spaces and control characters at either end. An empty name, between
+/// two slashes, counts as a directory for a ".." after it; one that no ".." removes is dropped. A ".." above
+/// "/" stays there; one above the start of a relative path is kept. Bytes above 0x7F pass as they are.
 ///
 /// So the prefix from one module to another is right if and only if FollowLink(from, prefix) is equal to
 /// WebPathOf(to).

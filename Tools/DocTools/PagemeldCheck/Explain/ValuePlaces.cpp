@@ -8,10 +8,10 @@
 #include <string_view>
 #include <unordered_map>
 
-// A document does not keep where its values stood, and a pointer such as "/a/0" does not say either, since
-// an object may hold a name twice. A value's number in document order does. So the document is walked for
-// the numbers of the values, and the text is read a second time until all have been found. Neither
-// recurses: documents may be nested deeper than a small stack holds.
+// A document does not keep the places of its values in the text. A pointer such as "/a/0" can't tell them
+// either, since an object may hold a name twice. So values are counted in document order: one walk over the
+// document gives the number of each value asked for, and a second parse of the text stops at those numbers.
+// Neither recurses: documents may be nested deeper than a small stack holds.
 
 namespace
 {
@@ -85,8 +85,8 @@ std::vector<SoughtValue> NumberValues(const Value& document, PlaceTable& places)
     return sought;
 }
 
-/// A string stream of which the library's reader makes no copy while it reads a token, so that a handler can
-/// ask it for the end of that token.
+/// A string stream that tells a handler where the current token ends. The library's reader copies a plain
+/// StringStream while it reads a token, and the handler would see an outdated position.
 struct TrackedStream : rapidjson::StringStream
 {
     explicit TrackedStream(const char* text) : rapidjson::StringStream(text) {}
@@ -94,8 +94,8 @@ struct TrackedStream : rapidjson::StringStream
 
 /// Takes the events of a parse, notes where the sought values begin, and ends the parse after the last.
 ///
-/// An event comes when its token has been read; for an opening bracket, before. Between the end of one token
-/// and the next value stand only white space, commas, colons and closing brackets.
+/// The event of a bracket comes before it is read, that of any other token after it. Between the end of a
+/// token and the next value there are only white space, commas, colons and closing brackets.
 class PlaceFinder : public rapidjson::BaseReaderHandler<rapidjson::UTF8<>, PlaceFinder>
 {
 public:
