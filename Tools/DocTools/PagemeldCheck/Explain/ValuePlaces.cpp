@@ -94,7 +94,7 @@ struct TrackedStream : rapidjson::StringStream
 
 /// Takes the events of a parse, notes where the sought values begin, and ends the parse after the last.
 ///
-/// The event of a bracket comes before it is read, that of any other token after it. Between the end of a
+/// The event of an opening bracket comes before it is read, any other event after its token. Between a
 /// token and the next value there are only white space, commas, colons and closing brackets.
 class PlaceFinder : public rapidjson::BaseReaderHandler<rapidjson::UTF8<>, PlaceFinder>
 {
