@@ -23,11 +23,12 @@ struct SetPath
     }
 
     /// Whether every name in the path is itself in a URL and in a script, and no step can be left out.
+    /// A space that begins a URL is lost.
     static bool IsPlain(const std::string& path)
     {
         const std::string steps = "/" + path + "/";
-        return std::none_of(path.begin(), path.end(), [](char c) { return c >= '\0' && c <= ' '; }) &&
-               path.find_first_of("%#?:\"\\") == std::string::npos &&
+        return std::none_of(path.begin(), path.end(), [](char c) { return c >= '\0' && c < ' '; }) &&
+               steps.find("/ ") == std::string::npos && path.find_first_of("%#?:\"\\") == std::string::npos &&
                FindInvalidUtf8(path) == std::string::npos && steps.find("/./") == std::string::npos &&
                steps.find("/../") == std::string::npos && path.find("//") == std::string::npos;
     }
