@@ -13,7 +13,7 @@ const node = (link, title, children = null) => ({ link, title, children });
 const toc = node("index.html", "Brackwater Manual", [
     node("null", "Getting started", [node("far/off/latin.html#roll", "Roll"), node("far/off/latin.html", "Gr\u00f6\u00dfe")]),
     node("https://sea.invalid/?a#b", "Outside"), node("https://[/latin.html", "Broken"),
-    node("50% of? all.html#end", "Half"), node("File:x.html", "No scheme"),
+    node("50% of? all.html#end", "Half"), node("far/off/no theme.html#end", "End"), node("File:x.html", "No scheme"),
     node("far/off/hostile.html", hostileTitle, waves.map((wave) => node(wave, "")))]);
 const index = {
     common: {}, searchIndex: { pitch: [0, 1], roll: [1], rolling: [2], pitching: [2], thesis: [3], constructor: [1] },
