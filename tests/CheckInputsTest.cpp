@@ -5,15 +5,16 @@
 TEST(PagemeldCheck, ReadsInputs)
 {
     ExpectReports({
-        {"CHECK @/a @/b @/c # Inputs that can't be read say why",
+        {"truncate -s 5G c/Manual/docdata/index.json; CHECK @/a @/b @/c # Inputs that can't be read say why",
          {{"a/Manual/docdata/toc.json", kDirectory},
           {"b/Manual/docdata/index.json", kGone},
           {"c/Manual/docdata/index.json", Index(R"(["p.html","P"])")},
           {"c/Manual/docdata/toc.json", kLink + "nowhere"}},
          R"(@/a/Manual/docdata/toc.json: error: is a directory, not a file; "a" will be missing from the contents of Manual [unreadable]
 @/b/Manual/docdata/index.json: error: is missing beside toc.json; "b" will be missing from the search of Manual [unreadable]
+@/c/Manual/docdata/index.json: error: can't be read: it is larger than 4 GiB; "c" will be missing from the search of Manual [unreadable]
 @/c/Manual/docdata/toc.json: error: is a link to what does not exist; "c" will be missing from the contents of Manual [unreadable]
-3 modules, 3 errors, 0 warnings; missing from the search of Manual: b; from its contents: a, c, status 1)"},
+3 modules, 4 errors, 0 warnings; missing from the search of Manual: b, c; from its contents: a, c, status 1)"},
         {"CHECK @/a @/b # A set without inputs is a note",
          {{"b/Manual/docdata/index.json", kGone},
           {"b/Manual/docdata/toc.json", kGone},
@@ -25,7 +26,7 @@ TEST(PagemeldCheck, ReadsInputs)
          {{"a/Manual/docdata/toc.json", kGone}, {"b/Manual/docdata/toc.json", "[]"}},
          R"(@/a/Manual/docdata/toc.json: error: is missing beside index.json; "a" will be missing from the contents of Manual [unreadable]
 @/b/Manual/docdata/toc.json:1:1: error: node is an array of 0, not an object; "b" will be missing from the contents of Manual [structure]
-Manual: error: no module has a sound toc.json: nothing will be written, and earlier outputs stay [nothing-to-combine]
+Manual: error: no module has a sound toc.json: nothing will be written [nothing-to-combine]
 2 modules, 3 errors, 0 warnings; missing from the contents of Manual: a, b, status 1)"},
         {"CHECK @/a @/b @/c # What is not JSON says what to do",
          {{"a/Manual/docdata/index.json", "{\"pages\":[],\n\"info\":[1,]}"},
@@ -39,13 +40,13 @@ Manual: error: no module has a sound toc.json: nothing will be written, and earl
 @/b/Manual/docdata/index.json:1:2: error: not JSON: strings need double quotes; refused at byte 1, at "'pages':[]}"; "b" will be missing from the search of Manual [not-json]
 @/b/Manual/docdata/toc.json:1:11: error: not JSON: a backslash in a string must be doubled; in a title or path, use another character; refused at byte 10, at "\\q\"}"; "b" will be missing from the contents of Manual [not-json]
 @/c/Manual/docdata/toc.json:1:1: error: not JSON: the file is empty; refused at byte 0, at the end of the text; "c" will be missing from the contents of Manual [not-json]
-Manual: error: no module has a sound toc.json: nothing will be written, and earlier outputs stay [nothing-to-combine]
+Manual: error: no module has a sound toc.json: nothing will be written [nothing-to-combine]
 3 modules, 6 errors, 0 warnings; missing from the search of Manual: a, b; from its contents: a, b, c, status 1)"},
         {"CHECK @/a # UTF-16 is not JSON",
          {{"a/Manual/docdata/index.json", std::string("{\000\"\000", 4)}},
          R"(@/a/Manual/docdata/index.json:1:2: warning: a NUL byte ends the text; bytes after it that are not seen: 2 [text-after-nul]
 @/a/Manual/docdata/index.json:1:2: error: not JSON: the file is in UTF-16: save it as UTF-8; refused at byte 1, at the end of the text; "a" will be missing from the search of Manual [not-json]
-Manual: error: no module has a sound index.json: nothing will be written, and earlier outputs stay [nothing-to-combine]
+Manual: error: no module has a sound index.json: nothing will be written [nothing-to-combine]
 1 module, 2 errors, 1 warning; missing from the search of Manual: a, status 1)"},
         {"CHECK @/a @/b # Each broken rule of the formats is shown, ten of a kind",
          {{"b/Manual/docdata/index.json",

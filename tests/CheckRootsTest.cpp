@@ -27,6 +27,7 @@ TEST(PagemeldCheck, FindsModulesAsARunDoes)
         {"CHECK -d @ # What looks like a module and is not taken is named",
          {{"c/.h/ScriptReference/docdata", kDirectory},
           {"c/.i/Manual", kDirectory},
+          {"c/k", kLink + "c/.h"},
           {"c/l", kLink + "a"}, // which is found under its own name
           {"c/m", kLink + "a/Manual"},
           {"c/n", kLink + "c/.o"},
@@ -41,13 +42,18 @@ TEST(PagemeldCheck, FindsModulesAsARunDoes)
           {"c/w/x/y/z/Manual/docdata", kDirectory}},
          R"(@/c/w/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
 @/c/.h: warning: a hidden module is not taken: its pages will be missing [passed-over]
+@/c/k: warning: a link to a module is not followed: its pages will be missing [passed-over]
 @/c/n: warning: a link to a directory of modules is not followed: their pages will be missing [passed-over]
 @/c/r: warning: has ScriptReference/docdata but no Manual/docdata, so it is not taken: its pages will be missing [passed-over]
 @/c/t/manual: warning: is not spelled Manual, so it is not taken: its pages will be missing [passed-over]
 @/c/u/Manual: warning: has pages but no docdata, so it is not taken: its pages will be missing [passed-over]
 @/c/v: warning: has docdata itself, which belongs one level deeper, into a directory Manual: its pages will be missing [passed-over]
 @/c/w/x/y: warning: a module inside @/c/w is not looked for: its pages will be missing [passed-over]
-3 modules, 0 errors, 7 warnings, status 0)"},
+3 modules, 0 errors, 8 warnings, status 0)"},
+        {"chmod 0 c; AS_USER CHECK -d @ # What may hold modules can be listed",
+         {{"c/d", kModule}},
+         R"(@/c: warning: can't be listed, so the modules below it are not found [passed-over]
+2 modules, 0 errors, 1 warning, status 0)"},
     });
 }
 

@@ -83,3 +83,11 @@ TEST(Explanation, ShowsNoCharacterThatDeceivesAReader)
         EXPECT_EQ(8U, FindInvalidUtf8(std::string("123456\xC3\xA9") + broken)) << broken;
     }
 }
+
+TEST(Explanation, CutsLongLists)
+{
+    std::vector<std::string> names(10, "m");
+    EXPECT_EQ("m, m, m, m, m, m, m, m, m, m", Listed(names));
+    names.resize(300, "x");
+    EXPECT_EQ("m, m, m, m, m, m, m, m, m, m and 290 more", Listed(names));
+}

@@ -8,6 +8,8 @@
 
 #include <filesystem>
 
+#include <unistd.h>
+
 namespace
 {
 
@@ -40,10 +42,13 @@ void Put(const TemporaryDirectory& directory, const std::string& path, const std
     }
 }
 
+/// Runs the command of a case.
 std::string Run(const TemporaryDirectory& directory, const std::string& command)
 {
-    const std::string script =
-        ReplaceAll(ReplaceAll("cd @; " + command, "@", directory.Path()), "CHECK", PAGEMELD_CHECK_PROGRAM);
+    std::string script = "trap 'chmod -R u+rwX @' EXIT; cd @; " + command;
+    script = ReplaceAll(script, "AS_USER",
+                        ::geteuid() == 0 ? "setpriv --bounding-set=-dac_override,-dac_read_search" : "");
+    script = ReplaceAll(ReplaceAll(script, "@", directory.Path()), "CHECK", PAGEMELD_CHECK_PROGRAM);
     const ProgramResult result = RunProgram("sh", {"-c", script});
     const std::string report = result.standardError + result.standardOutput;
     return WithPlaceholders(report.substr(0, report.rfind('\n')), directory) + ", status " +

@@ -23,7 +23,7 @@ struct Change
 struct CheckCase
 {
     std::string command; ///< for a shell in the directory of the modules, which is also @; CHECK is the
-                         ///< program, and the comment says what must hold
+                         ///< program, AS_USER takes root's rights away, the comment says what must hold
     std::vector<Change> changes;
     const char* output;
 };

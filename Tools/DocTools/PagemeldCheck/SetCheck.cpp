@@ -102,7 +102,8 @@ bool CheckWhetherWritten(DocSet set, const Modules& modules, Report& report)
     const bool hasIndex = has([](const SetModule& module) { return module.index.IsSound(); });
     const bool hasToc = has([](const SetModule& module) { return module.toc.IsSound(); });
     const bool hasFiles = has([](const SetModule& module) { return module.HasFiles(); });
-    if (!hasFiles && HasOutputs(modules))
+    const bool hasOutputs = !(hasIndex && hasToc) && HasOutputs(modules);
+    if (!hasFiles && hasOutputs)
     {
         report.Add(
             Finding::OfSet(Rule::NothingToCombine, set,
@@ -116,7 +117,8 @@ bool CheckWhetherWritten(DocSet set, const Modules& modules, Report& report)
                                       (hasIndex ? "a sound toc.json"
                                        : hasToc ? "a sound index.json"
                                                 : "a sound index.json, and none a sound toc.json") +
-                                      ": nothing will be written, and earlier outputs stay"));
+                                      ": nothing will be written" +
+                                      (hasOutputs ? ", and the outputs of an earlier run stay" : "")));
     }
     return hasIndex && hasToc;
 }
