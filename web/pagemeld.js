@@ -1,9 +1,7 @@
-// Search and contents of all modules, in a documentation page.
-//
-// The view is in the page's own <div id="pagemeld">, or else in a dialog that a button in a corner opens. A page on disk
-// can't fetch anything, so the outputs run as classic scripts, in hidden frames: a page's own "const p0" would make
-// their globals a syntax error. The contents load when they are seen, the search index when the reader turns to the box.
-// Titles and texts enter the page as text only.
+// Search and contents of all modules, in a documentation page: in its own <div id="pagemeld">, or else in a dialog that
+// a button in a corner opens. A page on disk can't fetch anything, so the outputs run as classic scripts, in hidden
+// frames: a page's own "const p0" would make their globals a syntax error. They load when they are needed. Titles and
+// texts enter the page as text only.
 
 (function () {
     "use strict";
@@ -17,15 +15,13 @@
     const ownAddress = new URL(tag.getAttribute("src"), isBeforeBase ? document.URL : document.baseURI).href;
     const shared = tag.dataset.docdata?.replace(/\/?$/, "/");
     const docdata = shared ? new URL(shared, document.URL).href : new URL(".", ownAddress).href;
-    const ownSet = nameOf(docdata, -3);
-    const otherSet = SETS[1 - SETS.indexOf(ownSet)]; // none of a directory with another name
 
     const language = { lang: document.documentElement.lang }; // of what is not the view's own words
     const box = create("input", { type: "search", autocomplete: "off", spellcheck: "false" });
     const filter = create("select", language, create("option", { value: "", lang: "en" }, "All"));
-    const filterLabel = create("label", {}, "Search in ", filter);
+    const filterLabel = create("label", { hidden: "" }, "Search in ", filter);
     const form = create("form", { role: "search", "aria-label": "All modules" },
-        create("label", {}, "Search all modules ", box));
+        create("label", {}, "Search all modules ", box), filterLabel);
     const status = create("p", { role: "status" });
     const results = create("ul", { class: "pagemeld-results", ...language });
     const more = create("button", { type: "button", hidden: "" }, "More results");
@@ -43,7 +39,7 @@
         opener, dialog);
 
     const systemIsDark = matchMedia("(prefers-color-scheme: dark)");
-    const needIndex = once(loadLookups);
+    const needIndex = once(loadIndexes);
     const needContents = once(loadContents);
     const lookups = []; // of the sets that are loaded, the own one first
     let search; // the functions of the search file
@@ -69,21 +65,17 @@
     const loaded = (element, parent) =>
         new Promise((done) => { element.onload = element.onerror = done; parent.append(element); });
 
-    // Runs scripts in a hidden frame that stays, so that their functions and values can be used. Returns its window. A
-    // script that fails is loaded too: what it assigned tells whether it ran.
-    async function runScripts(...addresses) {
+    // Runs scripts in a hidden frame that stays, so that its functions and values can be used. Returns its window, and
+    // the values of p0, p1, ..., longest first. What a script assigned tells whether it ran.
+    async function run(...addresses) {
         const frame = create("iframe", { hidden: "" });
         await loaded(frame, view);
-        for (const address of addresses) {
-            await loaded(create("script", { src: address }), frame.contentDocument.head);
+        for (const src of addresses) {
+            await loaded(create("script", { src }), frame.contentDocument.head);
         }
-        return frame.contentWindow;
-    }
-
-    // The values of p0, p1, ... that an output assigned, longest first.
-    function prefixesOf(source) {
-        const names = Object.keys(source).filter((key) => /^p\d+$/.test(key));
-        return names.map((name) => source[name]).sort((a, b) => b.length - a.length);
+        const source = frame.contentWindow;
+        const prefixes = Object.keys(source).filter((key) => /^p\d+$/.test(key)).map((key) => source[key]);
+        return [source, prefixes.sort((a, b) => b.length - a.length)];
     }
 
     function decode(text) {
@@ -94,66 +86,60 @@
         }
     }
 
-    // A directory in an address: the module, "charts", is the fourth from the end of ".../charts/Manual/docdata/".
-    function nameOf(address, level) {
-        return decode(new URL(address).pathname.split("/").at(level) ?? "");
-    }
+    // Names in the address of docdata: the set is the third from the end, the module the fourth.
+    const nameOf = (address, level) => decode(new URL(address).pathname.split("/").at(level) ?? "");
 
     // A link is a path on disk, in which only "#" has a meaning: "File:a.html" and "javascript:" are names of files.
     // The outputs put the prefix before whole addresses too.
-    function addressOf(link, prefix, from = docdata) {
-        const rest = link.slice(prefix.length);
-        if (/^(https?|ftp|mailto):(?!:)/i.test(rest)) {
-            return rest;
+    function addressOf(link, prefixes, from = docdata) {
+        const { length } = prefixes.find((prefix) => link.startsWith(prefix)) ?? "";
+        if (/^(https?|ftp|mailto):(?!:)/i.test(link.slice(length))) {
+            return link.slice(length);
         }
-        const end = `${link}#`.indexOf("#", prefix.length);
-        return new URL("..", from).href + link.slice(0, end).replace(/[\0- %?#\\]/g, encodeURIComponent) + link.slice(end);
+        const end = `${link}#`.indexOf("#", length);
+        const path = link.slice(0, end).replace(/[\0- %?#\\]/g, encodeURIComponent);
+        return new URL("..", from).href + path + link.slice(end);
     }
 
-    const createLink = (link, title, prefix, from) =>
-        create("a", { href: addressOf(link, prefix, from), target: "_self" }, title.trim() || link);
+    const createLink = (link, title, prefixes, from) =>
+        create("a", { href: addressOf(link, prefixes, from), target: "_self" }, title.trim() || link);
 
     // Runs a generator, and makes way for the reader's events now and then. Returns its result.
     async function finish(steps) {
-        for (let end = 0, step = {}; ; step = steps.next()) {
-            if (step.done) {
-                return step.value;
-            }
-            if (performance.now() > end) {
-                await new Promise((done) => { setTimeout(done); });
-                end = performance.now() + SLICE;
+        let step = { done: false };
+        while (!step.done) {
+            await new Promise((done) => { setTimeout(done); });
+            for (const end = performance.now() + SLICE; !step.done && performance.now() < end;) {
+                step = steps.next();
             }
         }
+        return step.value;
     }
 
-    // Loads the search index of a set from its docdata. Returns null if it did not run.
-    async function loadLookup(set, from) {
-        const source = await runScripts(`${from}global_index.js`, new URL("pagemeld-search.js", ownAddress).href);
-        if (!["pages", "info", "common", "searchIndex", "prepareIndex"].every((name) => source[name])) {
-            return null;
+    // Loads the search index in a docdata. Returns whether it ran.
+    async function loadIndex(from) {
+        const [source, all] = await run(`${from}global_index.js`, new URL("pagemeld-search.js", ownAddress).href);
+        const isThere = ["pages", "info", "common", "searchIndex", "prepareIndex"].every((name) => source[name]);
+        if (isThere) {
+            search = source;
+            const lookup = await finish(source.prepareIndex(source, all));
+            const moduleOf = (prefix) => nameOf(addressOf(`${prefix}docdata/`, [prefix], from), -4);
+            const modules = Object.fromEntries(["", ...all].map((prefix) => [prefix, moduleOf(prefix)]));
+            join({ ...lookup, from, set: nameOf(from, -3), modules });
         }
-        search = source;
-        const prefixes = prefixesOf(source);
-        const moduleOf = (prefix) => nameOf(addressOf(`${prefix}docdata/`, prefix, from), -4);
-        const modules = Object.fromEntries(["", ...prefixes].map((prefix) => [prefix, moduleOf(prefix)]));
-        return { ...await finish(source.prepareIndex(source, prefixes)), set, from, modules };
+        return isThere;
     }
 
-    // Loads the set being read, then the other one, unless the tag names the sets to search and leaves it out.
-    async function loadLookups() {
+    // The set being read, then the other one, unless the tag names the sets to search and leaves it out.
+    async function loadIndexes() {
         status.textContent = "Loading the search index";
-        const own = await loadLookup(ownSet, docdata);
-        if (!own) {
+        if (!await loadIndex(docdata)) {
             status.textContent = "Search is not available: global_index.js did not run";
             return;
         }
-        join(own);
-        if (otherSet && (tag.dataset.sets ?? otherSet).includes(otherSet)) {
-            const other = await loadLookup(otherSet, new URL(`../../${otherSet}/docdata/`, docdata).href);
-            if (other) {
-                join(other);
-                offerSet(other);
-            }
+        const other = SETS[1 - SETS.indexOf(nameOf(docdata, -3))]; // none of a directory with another name
+        if (other && (tag.dataset.sets ?? other).includes(other)) {
+            await loadIndex(new URL(`../../${other}/docdata/`, docdata).href);
         }
     }
 
@@ -166,23 +152,17 @@
         findAll();
         found.pages = [...shown, ...found.pages.filter((page) => !shown.some((other) => isSame(page, other)))];
         showResults(Math.max(shown.length, RESULTS_AT_ONCE));
+        if (lookups.length > 1 && lookup.prefixes.includes("")) {
+            const [path] = lookup.pages[lookup.prefixes.indexOf("")];
+            nav.append(createLink(path, lookup.set, [], lookup.from)); // the contents end with the other set
+        }
     }
 
     function addToFilter({ set, modules }) {
         const names = Object.values(modules).sort().filter((name, i, all) => name !== all[i - 1]);
         const options = names.map((name) => create("option", { value: `${set}/${name}` }, name));
         filter.append(create("optgroup", { label: set }, create("option", { value: set }, `All of ${set}`), ...options));
-        if (lookups.length > 1 || names.length > 1) {
-            form.append(filterLabel);
-        }
-    }
-
-    // The last entry of the contents leads to the other set: to its first page of the own module, or else of all.
-    function offerSet({ set, from, pages, prefixes }) {
-        const first = Math.max(0, prefixes.indexOf(""));
-        if (first < pages.length) {
-            nav.append(createLink(pages[first][0], set, prefixes[first], from));
-        }
+        filterLabel.hidden = lookups.length === 1 && names.length === 1;
     }
 
     // Whether a page is in the set or module that is chosen.
@@ -191,11 +171,11 @@
 
     function findAll() {
         found = search.findPages(lookups, box.value, accepts);
-        const { query, pages } = found;
-        const whole = pages.filter(({ isWhole }) => isWhole).length;
-        const count = pages.length === 1 ? "1 page" : `${pages.length || "No"} pages`;
-        const rest = whole === pages.length ? "" : `, ${whole || "none"} with all words`;
-        status.textContent = query.keys.length > 0 ? `${count} found${rest}` : "";
+        const { length } = found.pages;
+        const whole = found.pages.filter(({ isWhole }) => isWhole).length;
+        const count = ["Nothing", "1 page"][length] ?? `${length} pages`;
+        const rest = whole === length ? "" : `, ${whole || "none"} with all words`;
+        status.textContent = found.query.keys.length > 0 ? `${count} found${rest}` : "";
     }
 
     function update() {
@@ -221,7 +201,7 @@
         const { set, modules, from, prefixes } = page.weighed.lookup;
         const prefix = prefixes[page.page];
         const shown = search.describePage(page, found.query);
-        const linkTo = ({ link, title }) => createLink(link, title, prefix, from);
+        const linkTo = ({ link, title }) => createLink(link, title, [prefix], from);
         const result = create("li", {}, linkTo(shown), " ",
             create("span", {}, lookups.length > 1 ? `${modules[prefix]}, ${set}` : modules[prefix]),
             create("p", {}, ...shown.pieces.map((piece, i) => (i % 2 === 1 ? create("mark", {}, piece) : piece))),
@@ -229,8 +209,6 @@
         result.querySelector(shown.isPlaceMeant ? "ul a" : "a").classList.add("pagemeld-best");
         return result;
     }
-
-    const linksFound = () => [...results.querySelectorAll("a")];
 
     // Writes the query of an open view into the address, and which module and link were chosen into the entry of the
     // history, so that Back finds them. The rest of both is the page's.
@@ -253,15 +231,28 @@
             filter.value = module;
             update();
             showResults(Math.max(shown, RESULTS_AT_ONCE));
-            linksFound().find(({ href }) => href === chosen)?.focus();
+            [...results.querySelectorAll("a")].find(({ href }) => href === chosen)?.focus();
         }
     }
 
+    async function loadContents() {
+        const [{ toc }, prefixes] = await run(`${docdata}global_toc.js`);
+        if (!toc) {
+            contents.textContent = "Contents are not available: global_toc.js did not run";
+            return;
+        }
+        const way = findWay(toc.children, (link) => isThisPage(link, prefixes)) ?? [];
+        const entries = toc.children.map((node) => createEntry(node, way, prefixes));
+        contents.append(create("p", {}, toc.title), create("ul", {}, ...entries));
+        showCurrent();
+    }
+
     // Whether a link of the contents leads to this page. Takes few links apart.
-    function isThisPage(link, prefix) {
+    function isThisPage(link, prefixes) {
         const pathOf = ({ pathname }) => decode(pathname.replace(/\/$/, "/index.html"));
         const path = pathOf(location);
-        return link.includes(path.split("/").at(-1)) && pathOf(create("a", { href: addressOf(link, prefix) })) === path;
+        const isLikely = link.includes(path.split("/").at(-1));
+        return isLikely && pathOf(create("a", { href: addressOf(link, prefixes) })) === path;
     }
 
     // The nodes down to the first whose link passes the test, or null.
@@ -276,9 +267,9 @@
     }
 
     // An entry of the contents. Those below it are made when it is opened, or at once on the way to this page.
-    function createEntry(node, way, prefixOf) {
+    function createEntry(node, way, prefixes) {
         const { link, title, children } = node;
-        const name = link === "null" ? "" : createLink(link, title, prefixOf(link));
+        const name = link === "null" ? "" : createLink(link, title, prefixes);
         if (node === way.at(-1)) {
             name.setAttribute("aria-current", "page");
         }
@@ -286,9 +277,9 @@
             return create("li", {}, name || title);
         }
         const list = create("ul", {});
-        const summary = name ? create("summary", { "aria-label": `Below ${name.text}` }) : create("summary", {}, title);
+        const fill = () => { list.append(...children.map((child) => createEntry(child, way, prefixes))); };
+        const summary = name ? create("summary", { "aria-label": `Below ${title}` }) : create("summary", {}, title);
         const details = create("details", {}, summary, list);
-        const fill = () => list.append(...children.map((child) => createEntry(child, way, prefixOf)));
         if (way.slice(0, -1).includes(node)) {
             fill();
             details.open = true;
@@ -296,21 +287,6 @@
             details.addEventListener("toggle", fill, { once: true });
         }
         return create("li", {}, name, details);
-    }
-
-    async function loadContents() {
-        const source = await runScripts(`${docdata}global_toc.js`);
-        if (!source.toc) {
-            contents.textContent = "Contents are not available: global_toc.js did not run";
-            return;
-        }
-        const { title, children } = source.toc;
-        const prefixes = prefixesOf(source);
-        const prefixOf = (link) => prefixes.find((prefix) => link.startsWith(prefix)) ?? "";
-        const way = findWay(children, (link) => isThisPage(link, prefixOf(link))) ?? [];
-        const entries = children.map((node) => createEntry(node, way, prefixOf));
-        contents.append(create("p", {}, title), create("ul", {}, ...entries));
-        showCurrent();
     }
 
     function showCurrent() {
@@ -326,28 +302,23 @@
         showCurrent();
     }
 
-    const isTyped = (target) => target.isContentEditable || /^(input|textarea|select)$/.test(target.localName);
-
-    // What a key does where it is pressed: "/" leads to the box, the arrows through the box and the results.
-    function actOf({ key, shiftKey }, target) {
-        const stops = [box, ...linksFound(), ...(more.hidden ? [] : [more])];
-        const step = { ArrowDown: 1, ArrowUp: -1 }[key];
-        const next = stops.includes(target) && !shiftKey ? stops[stops.indexOf(target) + step] : null;
-        if (next) {
-            return () => next.focus();
-        }
-        if (key === "/" && !isTyped(target)) {
-            return openView;
+    // What a key does: "/" leads to the box, as Escape does in a place of the page; arrows lead through the results.
+    function findAct(key, target) {
+        const stops = [box, ...results.querySelectorAll("a"), more];
+        const next = stops[stops.indexOf(target) + { ArrowDown: 1, ArrowUp: -1 }[key]];
+        if (next && stops.includes(target)) {
+            return () => { next.focus(); };
         }
         if (key === "Escape" && dialog.open) {
-            return () => dialog.close();
+            return () => { dialog.close(); };
         }
-        return key === "Escape" && view.contains(target) ? clear : null;
+        const isTyped = target.isContentEditable || /^(input|textarea|select)$/.test(target.localName);
+        return (key === "Escape" && view.contains(target)) || (key === "/" && !isTyped) ? openView : null;
     }
 
     function onKey(event) {
         const isTaken = event.ctrlKey || event.altKey || event.metaKey || event.isComposing || event.defaultPrevented;
-        const act = event.type === "keydown" && !isTaken ? actOf(event, event.composedPath()[0]) : null;
+        const act = event.type === "keydown" && !isTaken ? findAct(event.key, event.composedPath()[0]) : null;
         if (act) {
             event.preventDefault();
             act();
@@ -365,10 +336,20 @@
         }
     }
 
-    function clear() {
-        box.value = "";
-        update();
-        box.focus();
+    // A link within this page does not leave it, but the dialog.
+    function onClick({ target }) {
+        const link = target.closest("a");
+        if (link) {
+            keepQuery(link.href);
+        }
+        if (link?.href.split("#")[0] === document.URL.split("#")[0]) {
+            dialog.close();
+        }
+    }
+
+    function onSubmit(event) {
+        event.preventDefault();
+        results.querySelector(".pagemeld-best")?.click();
     }
 
     function openView() {
@@ -386,9 +367,15 @@
     function holdPage() {
         const { documentElement: root, body } = document;
         const width = root.offsetWidth;
-        const isOfBody = getComputedStyle(body).overflowY !== "visible";
-        root.classList.toggle("pagemeld-held", !isOfBody);
-        root.classList.toggle("pagemeld-held", !isOfBody && root.offsetWidth === width);
+        root.classList.toggle("pagemeld-held", getComputedStyle(body).overflowY === "visible");
+        if (root.offsetWidth !== width) {
+            root.classList.remove("pagemeld-held");
+        }
+    }
+
+    function onClose() {
+        document.documentElement.classList.remove("pagemeld-held");
+        keepQuery();
     }
 
     // Light text is on a dark page. What the system says decides where the color is not given as red, green, and blue.
@@ -397,14 +384,6 @@
         const [red, green, blue] = /^rgb/.test(color) ? color.match(/[\d.]+/g) : [];
         const isDark = blue === undefined ? systemIsDark.matches : 0.21 * red + 0.72 * green + 0.07 * blue > 127;
         home.classList.toggle("pagemeld-dark", isDark);
-    }
-
-    // Themes are switched by an attribute of the root or the body.
-    function watchPage() {
-        const observer = new MutationObserver(matchPage);
-        [document.documentElement, document.body].forEach((part) => observer.observe(part, { attributes: true }));
-        systemIsDark.onchange = matchPage;
-        matchPage();
     }
 
     // In a place of the page, with a link that leads past it.
@@ -421,7 +400,7 @@
         (window.requestIdleCallback ?? setTimeout)(needContents);
     }
 
-    // The edge of the dialog, outside the view, closes it.
+    // In a dialog, whose edge outside the view closes it.
     function fillCorner() {
         const close = create("button", { type: "button", class: "pagemeld-close", "aria-label": "Close" }, "\u00d7");
         view.append(close);
@@ -430,37 +409,29 @@
         opener.dataset.corner = tag.dataset.corner ?? "";
         document.body.append(corner);
         opener.onclick = openView;
-        close.onclick = () => dialog.close();
         dialog.onmousedown = ({ target }) => {
             if (target === dialog) {
                 dialog.close();
             }
         };
-        dialog.onclose = () => {
-            document.documentElement.classList.remove("pagemeld-held");
-            keepQuery();
-        };
-        addEventListener("popstate", () => dialog.close()); // a link led to another place of this page
+        close.onclick = () => { dialog.close(); };
+        dialog.onclose = onClose;
         ["keydown", "keypress", "keyup"].forEach((type) => addEventListener(type, onDialogKey, true));
     }
 
+    // Themes are switched by an attribute of the root or the body.
     function listen() {
         addEventListener("keydown", onKey);
         box.onfocus = () => { needIndex(); };
+        box.onblur = () => { keepQuery(); };
         box.oninput = filter.onchange = update;
-        box.onblur = () => keepQuery();
         more.onclick = showMore;
-        tabs.forEach((tab) => { tab.onclick = () => selectTab(tab); });
-        view.onclick = ({ target }) => {
-            const link = target.closest("a");
-            if (link) {
-                keepQuery(link.href);
-            }
-        };
-        form.onsubmit = (event) => {
-            event.preventDefault();
-            results.querySelector(".pagemeld-best")?.click();
-        };
+        view.onclick = onClick;
+        form.onsubmit = onSubmit;
+        tabs.forEach((tab) => { tab.onclick = () => { selectTab(tab); }; });
+        const observer = new MutationObserver(matchPage);
+        [document.documentElement, document.body].forEach((part) => observer.observe(part, { attributes: true }));
+        systemIsDark.onchange = matchPage;
     }
 
     async function start() {
@@ -475,16 +446,13 @@
         if (!place && !query && document.readyState !== "complete") {
             await happened(window, "load"); // which a style sheet would put off
         }
-        const style = create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress).href });
-        await loaded(style, document.head ?? document.documentElement);
+        const href = new URL("pagemeld.css", ownAddress).href;
+        await loaded(create("link", { rel: "stylesheet", href }), document.head ?? document.documentElement);
+        const fill = place ? fillPlace : fillCorner;
+        fill(place);
         listen();
         selectTab(tabs[0]);
-        if (place) {
-            fillPlace(place);
-        } else {
-            fillCorner();
-        }
-        watchPage();
+        matchPage();
         if (query) {
             restoreQuery(query);
         }
