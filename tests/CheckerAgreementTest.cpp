@@ -1,3 +1,4 @@
+#include "Tools/DocTools/VantorPagemeld/ModuleLayout.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 #include "tests/support/AnswersOfNode.h"
 #include "tests/support/ParsedJson.h"
@@ -21,6 +22,9 @@ using rapidjson::Value;
 using Names = std::set<std::string>;
 
 const std::vector<std::string> kModules = {"first", "second", "third"};
+
+const Names kOfOutputs = {"output-missing", "output-broken", "wrong-prefixes",
+                          "output-differs", "output-stale",  "leftover"};
 
 constexpr const char* kEvaluatesInNode = R"(
     const vm = require('vm');
@@ -173,7 +177,9 @@ TEST(CheckerAgreement, PredictsWhichModulesARunMerges)
         }
         std::vector<std::string> arguments = {"--format=json", "--limit=0"};
         arguments.insert(arguments.end(), roots.begin(), roots.end());
-        const Findings findings(RunProgram(PAGEMELD_CHECK_PROGRAM, arguments).standardOutput);
+        const auto check = [&]
+        { return Findings(RunProgram(PAGEMELD_CHECK_PROGRAM, arguments).standardOutput); };
+        const Findings findings = check();
         EXPECT_EQ(0, RunProgram(PAGEMELD_PROGRAM, roots).status);
 
         const std::string combined = Docdata(roots.back());
@@ -184,6 +190,8 @@ TEST(CheckerAgreement, PredictsWhichModulesARunMerges)
             continue;
         }
         ++writtenCount;
+        arguments.emplace_back("--outputs");
+        EXPECT_FALSE(check().Has(kOfOutputs)) << "seed " << seed;
         Names inSearch;
         Names inContents;
         for (std::size_t i = 0; i < roots.size(); ++i)
@@ -208,6 +216,9 @@ TEST(CheckerAgreement, PredictsWhichModulesARunMerges)
             scripts.push_back(ReadFile(combined + "/global_index.js"));
             scripts.push_back(ReadFile(combined + "/global_toc.js"));
         }
+        const std::string cut = combined + "/" + kOutputs[seed % std::size(kOutputs)].name;
+        std::filesystem::resize_file(cut, std::filesystem::file_size(cut) - 1 - seed % 50);
+        EXPECT_TRUE(check().Has(kOfOutputs, cut)) << "seed " << seed;
     }
     EXPECT_GT(writtenCount, 60);
     EXPECT_GT(scripts.size(), 20U);
