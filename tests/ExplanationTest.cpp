@@ -51,8 +51,8 @@ TEST(Explanation, NamesWhatUsuallyCausesAParseFailure)
         {R"(["\z and more"])",
          R"(a backslash in a string must be doubled; in a title or path, use another character; refused at byte 2, at "\\z and more"...)"},
         {"[1e999]", R"(a number is too large; refused at byte 1, at "1e999]")"},
-        {R"(["\")" + std::string(10'001, '[') + R"(",-1.8e308])",
-         R"(a number is too large; refused at byte 10007, at "-1.8e308]")"},
+        {R"(["\")" + std::string(10'001, '[') + R"(",)" + std::string(10'001, ' ') + "-1.8e308]",
+         R"(a number is too large; refused at byte 20008, at "-1.8e308]")"},
         {std::string(10'001, '['),
          R"(nested deeper than 10000 levels; refused at byte 10001, at the end of the text)"},
     };
