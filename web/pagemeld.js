@@ -8,7 +8,7 @@
 
     const RESULTS_AT_ONCE = 10;
     const SLICE = 30; // ms of work without a pause
-    const SETS = ["Manual", "ScriptReference"];
+    const OTHER_SET = { Manual: "ScriptReference", ScriptReference: "Manual" };
 
     const tag = document.currentScript; // a later <base> did not change where it led
     const isBeforeBase = document.querySelector("base[href]")?.compareDocumentPosition(tag) & 2;
@@ -29,9 +29,8 @@
     const contents = create("div", { class: "pagemeld-contents", ...language });
     const nav = create("nav", { "aria-label": "All modules" }, contents);
     const tabs = ["Search", "Contents"].map((name) => create("button", { type: "button", role: "tab" }, name));
-    const tabList = create("div", { role: "tablist", class: "pagemeld-tabs", "aria-label": "Parts" }, ...tabs);
     const view = create("div", { class: "pagemeld-view", lang: "en", role: "region", "aria-label": "All modules" },
-        tabList, finder, nav);
+        create("div", { role: "tablist", "aria-label": "Parts" }, ...tabs), finder, nav);
     const opener = create("button", { type: "button", class: "pagemeld-open", "aria-keyshortcuts": "/" },
         "Search all modules ", create("kbd", { "aria-hidden": "true" }, "/"));
     const dialog = create("dialog", { "aria-label": "All modules" });
@@ -60,8 +59,7 @@
         return () => (result ??= act());
     }
 
-    const happened = (target, type) => new Promise((done) => { target.addEventListener(type, done, { once: true }); });
-
+    const happened = (type) => new Promise((done) => { addEventListener(type, done); });
     const loaded = (element, parent) =>
         new Promise((done) => { element.onload = element.onerror = done; parent.append(element); });
 
@@ -78,13 +76,7 @@
         return [source, prefixes.sort((a, b) => b.length - a.length)];
     }
 
-    function decode(text) {
-        try {
-            return decodeURIComponent(text);
-        } catch {
-            return text; // not UTF-8
-        }
-    }
+    const decode = (text) => { try { return decodeURIComponent(text); } catch { return text; } }; // not UTF-8
 
     // Names in the address of docdata: the set is the third from the end, the module the fourth.
     const nameOf = (address, level) => decode(new URL(address).pathname.split("/").at(level) ?? "");
@@ -106,40 +98,43 @@
 
     // Runs a generator, and makes way for the reader's events now and then. Returns its result.
     async function finish(steps) {
-        let step = { done: false };
-        while (!step.done) {
-            await new Promise((done) => { setTimeout(done); });
-            for (const end = performance.now() + SLICE; !step.done && performance.now() < end;) {
-                step = steps.next();
+        let step = steps.next();
+        for (let end = 0; !step.done; step = steps.next()) {
+            if (performance.now() > end) {
+                await new Promise((done) => { setTimeout(done); });
+                end = performance.now() + SLICE;
             }
         }
         return step.value;
     }
 
-    // Loads the search index in a docdata. Returns whether it ran.
-    async function loadIndex(from) {
+    // Loads the search index in a docdata. Returns null if it did not run.
+    async function loadLookup(from) {
         const [source, all] = await run(`${from}global_index.js`, new URL("pagemeld-search.js", ownAddress).href);
-        const isThere = ["pages", "info", "common", "searchIndex", "prepareIndex"].every((name) => source[name]);
-        if (isThere) {
-            search = source;
-            const lookup = await finish(source.prepareIndex(source, all));
-            const moduleOf = (prefix) => nameOf(addressOf(`${prefix}docdata/`, [prefix], from), -4);
-            const modules = Object.fromEntries(["", ...all].map((prefix) => [prefix, moduleOf(prefix)]));
-            join({ ...lookup, from, set: nameOf(from, -3), modules });
+        if (!["pages", "info", "common", "searchIndex", "prepareIndex"].every((name) => source[name])) {
+            return null;
         }
-        return isThere;
+        search = source;
+        const moduleOf = (prefix) => nameOf(addressOf(`${prefix}docdata/`, [prefix], from), -4);
+        const modules = Object.fromEntries(["", ...all].map((prefix) => [prefix, moduleOf(prefix)]));
+        return { ...await finish(source.prepareIndex(source, all)), from, set: nameOf(from, -3), modules };
     }
 
     // The set being read, then the other one, unless the tag names the sets to search and leaves it out.
     async function loadIndexes() {
         status.textContent = "Loading the search index";
-        if (!await loadIndex(docdata)) {
+        const own = await loadLookup(docdata);
+        if (!own) {
             status.textContent = "Search is not available: global_index.js did not run";
             return;
         }
-        const other = SETS[1 - SETS.indexOf(nameOf(docdata, -3))]; // none of a directory with another name
-        if (other && (tag.dataset.sets ?? other).includes(other)) {
-            await loadIndex(new URL(`../../${other}/docdata/`, docdata).href);
+        join(own);
+        const set = OTHER_SET[own.set];
+        const isAsked = set && (tag.dataset.sets ?? set).includes(set);
+        const other = isAsked ? await loadLookup(new URL(`../../${set}/docdata/`, docdata).href) : null;
+        if (other) {
+            join(other);
+            offerSet(other);
         }
     }
 
@@ -148,21 +143,26 @@
         lookups.push(lookup);
         addToFilter(lookup);
         const shown = found.pages.slice(0, results.childElementCount);
-        const isSame = (a, b) => a.page === b.page && a.weighed.lookup === b.weighed.lookup;
+        const isShown = ({ page, weighed }) =>
+            shown.some((one) => one.page === page && one.weighed.lookup === weighed.lookup);
         findAll();
-        found.pages = [...shown, ...found.pages.filter((page) => !shown.some((other) => isSame(page, other)))];
+        found.pages = [...shown, ...found.pages.filter((page) => !isShown(page))];
         showResults(Math.max(shown.length, RESULTS_AT_ONCE));
-        if (lookups.length > 1 && lookup.prefixes.includes("")) {
-            const [path] = lookup.pages[lookup.prefixes.indexOf("")];
-            nav.append(createLink(path, lookup.set, [], lookup.from)); // the contents end with the other set
+    }
+
+    // The contents end with the other set: its first page of this module.
+    function offerSet({ set, from, pages, prefixes }) {
+        const first = prefixes.indexOf("");
+        if (first >= 0) {
+            nav.append(createLink(pages[first][0], set, [], from));
         }
     }
 
     function addToFilter({ set, modules }) {
-        const names = Object.values(modules).sort().filter((name, i, all) => name !== all[i - 1]);
-        const options = names.map((name) => create("option", { value: `${set}/${name}` }, name));
-        filter.append(create("optgroup", { label: set }, create("option", { value: set }, `All of ${set}`), ...options));
-        filterLabel.hidden = lookups.length === 1 && names.length === 1;
+        const values = [set, ...Object.values(modules).map((name) => `${set}/${name}`).sort()];
+        const each = values.filter((value, i) => value !== values[i - 1]);
+        filter.append(...each.map((value) => create("option", { value }, value)));
+        filterLabel.hidden = filter.length < 4; // all, this set, and one module are the same
     }
 
     // Whether a page is in the set or module that is chosen.
@@ -210,8 +210,7 @@
         return result;
     }
 
-    // Writes the query of an open view into the address, and which module and link were chosen into the entry of the
-    // history, so that Back finds them. The rest of both is the page's.
+    // Writes the query of an open view into the address, and what was chosen into the history, so that Back finds it.
     function keepQuery(chosen) {
         box.defaultValue = box.value; // to which WebKit resets the box after Back
         const query = dialog.isConnected && !dialog.open ? "" : box.value.trim();
@@ -227,12 +226,10 @@
         box.value = query;
         await needIndex();
         const { module = "", shown = 0, chosen } = history.state?.pagemeld ?? {};
-        if (box.value === query) {
-            filter.value = module;
-            update();
-            showResults(Math.max(shown, RESULTS_AT_ONCE));
-            [...results.querySelectorAll("a")].find(({ href }) => href === chosen)?.focus();
-        }
+        filter.value = module;
+        update();
+        showResults(Math.max(shown, RESULTS_AT_ONCE));
+        [...results.querySelectorAll("a")].find(({ href }) => href === chosen)?.focus();
     }
 
     async function loadContents() {
@@ -347,11 +344,6 @@
         }
     }
 
-    function onSubmit(event) {
-        event.preventDefault();
-        results.querySelector(".pagemeld-best")?.click();
-    }
-
     function openView() {
         if (dialog.isConnected && !dialog.open) {
             holdPage();
@@ -362,8 +354,7 @@
         box.select();
     }
 
-    // The page can't be scrolled while the dialog is open, unless that would move it: where a browser does not keep the
-    // room of the scroll bar, and where the window's overflow is that of the body.
+    // Keeps the page from being scrolled, unless that would move it: not every browser keeps the scroll bar's room.
     function holdPage() {
         const { documentElement: root, body } = document;
         const width = root.offsetWidth;
@@ -371,11 +362,6 @@
         if (root.offsetWidth !== width) {
             root.classList.remove("pagemeld-held");
         }
-    }
-
-    function onClose() {
-        document.documentElement.classList.remove("pagemeld-held");
-        keepQuery();
     }
 
     // Light text is on a dark page. What the system says decides where the color is not given as red, green, and blue.
@@ -415,7 +401,10 @@
             }
         };
         close.onclick = () => { dialog.close(); };
-        dialog.onclose = onClose;
+        dialog.onclose = () => {
+            document.documentElement.classList.remove("pagemeld-held");
+            keepQuery();
+        };
         ["keydown", "keypress", "keyup"].forEach((type) => addEventListener(type, onDialogKey, true));
     }
 
@@ -427,7 +416,10 @@
         box.oninput = filter.onchange = update;
         more.onclick = showMore;
         view.onclick = onClick;
-        form.onsubmit = onSubmit;
+        form.onsubmit = (event) => {
+            event.preventDefault();
+            results.querySelector(".pagemeld-best")?.click();
+        };
         tabs.forEach((tab) => { tab.onclick = () => { selectTab(tab); }; });
         const observer = new MutationObserver(matchPage);
         [document.documentElement, document.body].forEach((part) => observer.observe(part, { attributes: true }));
@@ -435,8 +427,8 @@
     }
 
     async function start() {
-        if (document.readyState === "loading") {
-            await happened(document, "DOMContentLoaded");
+        if (document.readyState === "loading") { // XHTML does not defer scripts
+            await happened("DOMContentLoaded");
         }
         if (document.body?.localName !== "body") {
             return; // a frame set
@@ -444,7 +436,7 @@
         const place = document.getElementById("pagemeld");
         const query = new URLSearchParams(location.search).get("pagemeld");
         if (!place && !query && document.readyState !== "complete") {
-            await happened(window, "load"); // which a style sheet would put off
+            await happened("load"); // which a style sheet would put off
         }
         const href = new URL("pagemeld.css", ownAddress).href;
         await loaded(create("link", { rel: "stylesheet", href }), document.head ?? document.documentElement);
@@ -455,8 +447,6 @@
         matchPage();
         if (query) {
             restoreQuery(query);
-        }
-        if (query && !place) {
             openView();
         }
     }
