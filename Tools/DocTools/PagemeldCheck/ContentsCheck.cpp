@@ -62,6 +62,10 @@ void CheckContentRoots(std::vector<SetModule>& modules, Report& report)
         module.isDropped = true;
         dropped.push_back(&module);
     }
+    if (first == nullptr)
+    {
+        return;
+    }
     // One that differs is odd itself. If two or more differ and none is like the first, the first is.
     if (dropped.size() >= 2 && sameCount == 1)
     {
