@@ -75,8 +75,9 @@ Manual: error: no module has an index.json or a toc.json, but outputs of an earl
         {"CHECK --outputs @/a @/b # Outputs of a run are sound",
          {{"", kCombined}},
          R"(2 modules, 0 errors, 0 warnings, status 0)"},
-        {"touch -d '1 hour ago' b/Manual/docdata/global_index.js; CHECK --outputs @/a @/b # Each output is "
-         "there, whole, equal and newer than the inputs",
+        {"touch -d '1 hour ago' a/Manual/docdata/[it]*.json b/Manual/docdata/index.json "
+         "b/Manual/docdata/global_index.js; "
+         "CHECK --outputs @/a @/b # Each output is there, whole, equal and newer than the inputs",
          {{"", kCombined},
           {"a/Manual/docdata/global_index.js", "pages = [\n];\ninfo = []\ncommon = {};\n"},
           {"a/Manual/docdata/global_index.json", "{"},
