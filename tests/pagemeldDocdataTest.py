@@ -160,6 +160,7 @@ MISTAKES = [
     (["--title", "T", "lib/Manual", "other/Manual"], "--title names one module, but the sets belong to several", 2),
     (["--page-script", "--remove", "lib/Manual"], "--page-script and --remove exclude each other", 2),
     (["other/Manual"], "other/Manual has no pages", 1),
+    (["outputs/Manual"], "outputs/Manual: no pages, docdata for outputs only", 0),
 ]
 
 
@@ -279,7 +280,8 @@ class PagemeldDocdata(unittest.TestCase):
         self.assertEqual(["index.json", "toc.json"], sorted(os.listdir(os.path.join(self.directory, "docdata"))))
 
     def test_mistakes(self):
-        self.write({"index.html": "x", "sub/index.html": "x", "../../other/Manual/picture.png": ""})
+        self.write({"index.html": "x", "sub/index.html": "x", "../../other/Manual/picture.png": "",
+                    "../../outputs/Manual/docdata/global_toc.js": ""})
         for arguments, message, status in MISTAKES:
             with self.subTest(arguments):
                 self.assertIn(message, self.run_program(*arguments, status=status)[-1])

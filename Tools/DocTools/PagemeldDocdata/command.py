@@ -78,9 +78,13 @@ def check(parser, arguments):
 
 
 def succeeds(work, directory, options):
-    """Does the work on a set directory. Returns whether it could be done, and says why not."""
+    """Does the work on a set directory. Returns whether it could be done, and says why not. A set without pages that
+    has docdata is there for the outputs, since all modules need the same sets."""
     try:
         if work(os.path.abspath(directory), options):
+            return True
+        if os.path.isdir(os.path.join(directory, "docdata")):
+            say(f"{directory}: no pages, docdata for outputs only")
             return True
         say(f"error: {directory} has no pages")
     except OSError as error:
