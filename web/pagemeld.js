@@ -19,18 +19,17 @@
     const language = { lang: document.documentElement.lang }; // of what is not the view's own words
     const box = create("input", { type: "search", autocomplete: "off", spellcheck: "false" });
     const filter = create("select", language, create("option", { value: "", lang: "en" }, "All"));
-    const filterLabel = create("label", { hidden: "" }, "Search in ", filter);
     const form = create("form", { role: "search", "aria-label": "All modules" },
-        create("label", {}, "Search all modules ", box), filterLabel);
+        create("label", {}, "Search all modules ", box), create("label", { hidden: "" }, "Search in ", filter));
     const status = create("p", { role: "status" });
     const results = create("ul", { class: "pagemeld-results", ...language });
     const more = create("button", { type: "button", hidden: "" }, "More results");
-    const finder = create("div", { class: "pagemeld-finder" }, form, status, results, more);
     const contents = create("div", { class: "pagemeld-contents", ...language });
     const nav = create("nav", { "aria-label": "All modules" }, contents);
     const tabs = ["Search", "Contents"].map((name) => create("button", { type: "button", role: "tab" }, name));
     const view = create("div", { class: "pagemeld-view", lang: "en", role: "region", "aria-label": "All modules" },
-        create("div", { role: "tablist", "aria-label": "Parts" }, ...tabs), finder, nav);
+        create("div", { role: "tablist", "aria-label": "Parts" }, ...tabs),
+        create("div", { class: "pagemeld-finder" }, form, status, results, more), nav);
     const opener = create("button", { type: "button", class: "pagemeld-open", "aria-keyshortcuts": "/" },
         "Search all modules ", create("kbd", { "aria-hidden": "true" }, "/"));
     const dialog = create("dialog", { "aria-label": "All modules" });
@@ -162,7 +161,7 @@
         const values = [set, ...Object.values(modules).map((name) => `${set}/${name}`).sort()];
         const each = values.filter((value, i) => value !== values[i - 1]);
         filter.append(...each.map((value) => create("option", { value }, value)));
-        filterLabel.hidden = filter.length < 4; // all, this set, and one module are the same
+        filter.parentElement.hidden = filter.length < 4; // all, this set, and one module are the same
     }
 
     // Whether a page is in the set or module that is chosen.
@@ -238,7 +237,7 @@
             contents.textContent = "Contents are not available: global_toc.js did not run";
             return;
         }
-        const way = findWay(toc.children, (link) => isThisPage(link, prefixes)) ?? [];
+        const way = findWay(toc.children, prefixes) ?? [];
         const entries = toc.children.map((node) => createEntry(node, way, prefixes));
         contents.append(create("p", {}, toc.title), create("ul", {}, ...entries));
         showCurrent();
@@ -248,14 +247,13 @@
     function isThisPage(link, prefixes) {
         const pathOf = ({ pathname }) => decode(pathname.replace(/\/$/, "/index.html"));
         const path = pathOf(location);
-        const isLikely = link.includes(path.split("/").at(-1));
-        return isLikely && pathOf(create("a", { href: addressOf(link, prefixes) })) === path;
+        return link.includes(path.split("/").at(-1)) && pathOf(createLink(link, "", prefixes)) === path;
     }
 
-    // The nodes down to the first whose link passes the test, or null.
-    function findWay(nodes, test) {
+    // The nodes of the contents down to the first that leads to this page, or null.
+    function findWay(nodes, prefixes) {
         for (const node of nodes ?? []) {
-            const below = test(node.link) ? [] : findWay(node.children, test);
+            const below = isThisPage(node.link, prefixes) ? [] : findWay(node.children, prefixes);
             if (below) {
                 return [node, ...below];
             }
@@ -287,9 +285,9 @@
     }
 
     function showCurrent() {
-        const current = contents.querySelector("[aria-current]") ?? contents;
-        const above = current.getBoundingClientRect().top - contents.getBoundingClientRect().top;
-        contents.scrollTop += above - contents.clientHeight / 2;
+        if (dialog.open) {
+            contents.querySelector("[aria-current]")?.scrollIntoView({ block: "center" });
+        }
     }
 
     // Tabs choose one of the parts where there is no room for both.
