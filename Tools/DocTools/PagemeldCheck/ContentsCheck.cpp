@@ -29,6 +29,7 @@ void ReportRoot(const SetModule& module, const SetModule& other, const std::stri
 void ReportOddFirst(const SetModule& first, const Modules& dropped, Report& report)
 {
     std::vector<std::string> names;
+    names.reserve(dropped.size());
     for (const SetModule* module : dropped)
     {
         names.push_back(module->name);

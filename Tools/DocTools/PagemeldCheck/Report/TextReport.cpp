@@ -29,6 +29,7 @@ std::string ShownPointer(const std::string& pointer)
 std::string NamesOf(const std::vector<std::string>& roots)
 {
     std::vector<std::string> names;
+    names.reserve(roots.size());
     for (const std::string& root : roots)
     {
         names.push_back(Visible(NameOfRoot(root)));
