@@ -39,6 +39,10 @@ public:
     {
     }
 
+    // Without these, clang++ rejects an optional of this class: its implicit copies take no const argument.
+    IndexMerge(const IndexMerge&) = delete;
+    IndexMerge& operator=(const IndexMerge&) = delete;
+
     /// Moves all of input except its common words, which are copied if there are none yet.
     void Append(rapidjson::Document& input);
 
