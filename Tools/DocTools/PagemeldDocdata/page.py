@@ -14,8 +14,8 @@ MARKED = re.compile(r"\b(?:id|class|name|role)\s*=", re.I)
 SHOWN_LENGTH = 300
 
 # The texts end at the next tag of that kind, so that tags that are never closed take linear time.
-TITLE = re.compile(r"<title[^<>]*>((?:[^<]++|<(?!/?title))*+)</title", re.I)
-HEADING = re.compile(r"<h([1-6])\b[^<>]*>((?:[^<]++|<(?!/?h[1-6]))*+)</h\1", re.I)
+TITLE = re.compile(r"<title[^<>]*>((?:(?!</?title).){0,2000})</title", re.S | re.I)
+HEADING = re.compile(r"<h([1-6])\b[^<>]*>((?:(?!</?h[1-6]).){0,2000})</h\1", re.S | re.I)
 
 LEVELS = {"h1": 1, "h2": 2, "h3": 3, "h4": 4, "h5": 5, "h6": 6, "dt": 7, MEMBER: 7}
 KINDS = {**{name: name for name in ("h1", "h2", "h3", "h4", "h5", "h6", "dt", "title")}, "p": TEXT}
