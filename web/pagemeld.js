@@ -222,9 +222,9 @@
 
     // Once the indexes are there: as it was when the reader left for a result.
     async function restoreQuery(query) {
+        const { module = "", shown = 0, chosen } = history.state?.pagemeld ?? {};
         box.value = query;
         await needIndex();
-        const { module = "", shown = 0, chosen } = history.state?.pagemeld ?? {};
         filter.value = module;
         update();
         showResults(Math.max(shown, RESULTS_AT_ONCE));

@@ -204,7 +204,7 @@ const rows = { // what must hold, and how that is seen
     "the chosen module is kept": async () => {
         await goto(plain);
         await openDialog();
-        await page.until($("select"));
+        await page.until($("[value='Manual/charts']"));
         await page.evaluate(`${$("select")}.value = "Manual/charts"`);
         await search("r");
         await page.evaluate(`${$(".pagemeld-results a")}.click()`);
