@@ -104,7 +104,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     for (const bool isJson : {false, true})
     {
         Report report;
-        CheckSet(DocSet::Manual, roots, {true, true, 10, isJson ? SIZE_MAX : 80}, report);
+        (void)CheckSet(DocSet::Manual, roots, {true, true, 10, isJson ? SIZE_MAX : 80}, false, report);
         Require(report.MissingOf(DocSet::Manual).search == refused.search,
                 "what is missing from the search is refused");
         Require(report.MissingOf(DocSet::Manual).contents == refused.contents,
