@@ -73,7 +73,7 @@ GENERATORS = (
     Generator("DocBook", "docbook|gtk-doc", (), (("index.html",),)),
     Generator("Sphinx", "sphinx", ("objects.inv", "searchindex.js"), (("contents.html", "index.html"),)),
 )
-META = re.compile(r"""<meta\s[^>]*\bname\s*=\s*["']?generator\b[^>]*>""", re.I)
+META = re.compile(r"""<meta\s[^<>]*\bname\s*=\s*["']?generator\b[^<>]*>""", re.I)
 
 
 def find_generator(directory, start_html):

@@ -12,7 +12,7 @@ TAG = re.compile(r"""<script\b[^>]*\bsrc\s*=\s*["']?[^"'>]*\bdocdata/pagemeld\.j
 XHTML = re.compile(r"""\s*<\?xml\b|<html\b[^>]*\bxmlns\s*=""", re.I)
 # What decides on the place of the tag. Comments and scripts are matched whole, so that nothing in them counts.
 MARK = re.compile(r"""<!--.*?(?:-->|\Z) | <script\b.*?(?:</script\s*>|\Z)
-                      | <(/body|/html|frameset|base(?=\s[^>]*\bhref))\b""", re.S | re.I | re.X)
+                      | <(/body|/html|frameset|base(?=\s[^<>]*\bhref))\b""", re.S | re.I | re.X)
 
 
 def make_tag(path, encoding):
