@@ -10,11 +10,9 @@
     const SLICE = 30; // ms of work without a pause
     const OTHER_SET = { Manual: "ScriptReference", ScriptReference: "Manual" };
 
-    const tag = document.currentScript; // a later <base> did not change where it led
-    const isBeforeBase = document.querySelector("base[href]")?.compareDocumentPosition(tag) & 2;
-    const ownAddress = new URL(tag.getAttribute("src"), isBeforeBase ? document.URL : document.baseURI).href;
-    const shared = tag.dataset.docdata?.replace(/\/?$/, "/");
-    const docdata = shared ? new URL(shared, document.URL).href : new URL(".", ownAddress).href;
+    const tag = document.currentScript;
+    const ownAddress = new URL(tag.getAttribute("src"), document.URL); // a <base> is to come after the tag
+    const docdata = new URL(tag.dataset.docdata?.replace(/\/?$/, "/") ?? new URL(".", ownAddress), document.URL);
 
     const language = { lang: document.documentElement.lang }; // of what is not the view's own words
     const box = create("input", { type: "search", autocomplete: "off", spellcheck: "false" });
@@ -23,100 +21,165 @@
         create("label", {}, "Search all modules ", box), create("label", { hidden: "" }, "Search in ", filter));
     const status = create("p", { role: "status" });
     const results = create("ul", { class: "pagemeld-results", ...language });
-    const more = create("button", { type: "button", hidden: "" }, "More results");
-    const contents = create("div", { class: "pagemeld-contents", ...language });
-    const nav = create("nav", { "aria-label": "All modules" }, contents);
-    const tabs = ["Search", "Contents"].map((name) => create("button", { type: "button", role: "tab" }, name));
+    const more = create("button", { hidden: "" }, "More results");
+    const contents = create("nav", { "aria-label": "All modules" });
+    const tabs = ["Search", "Contents"].map((name) => create("button", { role: "tab" }, name));
     const view = create("div", { class: "pagemeld-view", lang: "en", role: "region", "aria-label": "All modules" },
         create("div", { role: "tablist", "aria-label": "Parts" }, ...tabs),
-        create("div", { class: "pagemeld-finder" }, form, status, results, more), nav);
-    const opener = create("button", { type: "button", class: "pagemeld-open", "aria-keyshortcuts": "/" },
-        "Search all modules ", create("kbd", { "aria-hidden": "true" }, "/"));
-    const dialog = create("dialog", { "aria-label": "All modules" });
-    const corner = create("div", { id: "pagemeld-corner", role: "region", "aria-label": "Search", lang: "en" },
-        opener, dialog);
+        create("div", { class: "pagemeld-finder" }, form, status, results, more), contents);
+    const dialog = create("dialog", { id: "pagemeld", "aria-label": "All modules" });
 
-    const systemIsDark = matchMedia("(prefers-color-scheme: dark)");
     const needIndex = once(loadIndexes);
     const needContents = once(loadContents);
     const lookups = []; // of the sets that are loaded, the own one first
     let search; // the functions of the search file
     let found = { pages: [] };
     let isDialogKey = false;
-    let home = corner; // where the view is
+    let placeOfPage; // below the dialog
 
-    function create(name, attributes, ...children) {
-        const element = document.createElementNS("http://www.w3.org/1999/xhtml", name);
-        Object.entries(attributes).forEach(([key, value]) => element.setAttribute(key, value));
-        element.append(...children);
-        return element;
-    }
-
-    // Does something at the first call, and returns the same at each.
-    function once(act) {
-        let result;
-        return () => (result ??= act());
-    }
-
-    const happened = (type) => new Promise((done) => { addEventListener(type, done); });
-    const loaded = (element, parent) =>
-        new Promise((done) => { element.onload = element.onerror = done; parent.append(element); });
-
-    // Runs scripts in a hidden frame that stays, so that its functions and values can be used. Returns its window, and
-    // the values of p0, p1, ..., longest first. What a script assigned tells whether it ran.
-    async function run(...addresses) {
-        const frame = create("iframe", { hidden: "" });
-        await loaded(frame, view);
-        for (const src of addresses) {
-            await loaded(create("script", { src }), frame.contentDocument.head);
+    async function start() {
+        const query = new URLSearchParams(location.search).get("pagemeld");
+        const isSeenAtOnce = query || document.getElementById("pagemeld");
+        if (document.readyState === "loading" || (!isSeenAtOnce && document.readyState !== "complete")) {
+            await new Promise((done) => { addEventListener("load", done); }); // XHTML does not defer scripts
         }
-        const source = frame.contentWindow;
-        const prefixes = Object.keys(source).filter((key) => /^p\d+$/.test(key)).map((key) => source[key]);
-        return [source, prefixes.sort((a, b) => b.length - a.length)];
+        const place = document.getElementById("pagemeld");
+        if (document.body?.localName !== "body") {
+            return; // a frame set
+        }
+        await loaded(create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress) }), document.head);
+        listen();
+        selectTab(tabs[0]);
+        matchPage(place ? fillPlace(place) : fillCorner());
+        if (query) {
+            restoreQuery(query);
+            openView();
+        }
     }
 
-    const decode = (text) => { try { return decodeURIComponent(text); } catch { return text; } }; // not UTF-8
-
-    // Names in the address of docdata: the set is the third from the end, the module the fourth.
-    const nameOf = (address, level) => decode(new URL(address).pathname.split("/").at(level) ?? "");
-
-    // A link is a path on disk, in which only "#" has a meaning: "File:a.html" and "javascript:" are names of files.
-    // The outputs put the prefix before whole addresses too.
-    function addressOf(link, prefixes, from = docdata) {
-        const { length } = prefixes.find((prefix) => link.startsWith(prefix)) ?? "";
-        if (/^(https?|ftp|mailto):(?!:)/i.test(link.slice(length))) {
-            return link.slice(length);
-        }
-        const end = `${link}#`.indexOf("#", length);
-        const path = link.slice(0, end).replace(/[\0- %?#\\]/g, encodeURIComponent);
-        return new URL("..", from).href + path + link.slice(end);
+    // In a place of the page, with a link that leads past it.
+    function fillPlace(place) {
+        const end = create("span", { tabindex: "-1" });
+        const skip = create("a", { href: "#pagemeld", class: "pagemeld-skip" }, "Skip search and contents");
+        skip.onclick = (event) => {
+            event.preventDefault();
+            end.focus();
+        };
+        view.prepend(skip);
+        place.append(view, end);
+        (window.requestIdleCallback ?? setTimeout)(needContents);
+        return place;
     }
 
-    const createLink = (link, title, prefixes, from) =>
-        create("a", { href: addressOf(link, prefixes, from), target: "_self" }, title.trim() || link);
-
-    // Runs a generator, and makes way for the reader's events now and then. Returns its result.
-    async function finish(steps) {
-        let step = steps.next();
-        for (let end = 0; !step.done; step = steps.next()) {
-            if (performance.now() > end) {
-                await new Promise((done) => { setTimeout(done); });
-                end = performance.now() + SLICE;
-            }
-        }
-        return step.value;
+    // In a dialog, whose edge outside the view closes it.
+    function fillCorner() {
+        const opener = create("button",
+            { class: "pagemeld-open", "aria-keyshortcuts": "/", "data-corner": tag.dataset.corner ?? "" },
+            "Search all modules ", create("kbd", { "aria-hidden": "true" }, "/"));
+        const close = create("button", { class: "pagemeld-close", "aria-label": "Close" }, "\u00d7");
+        const corner = create("div", { id: "pagemeld-corner", role: "region", "aria-label": "Search", lang: "en" },
+            opener, dialog);
+        view.append(close);
+        dialog.append(view);
+        document.body.append(corner);
+        opener.onclick = openView;
+        dialog.onclose = () => { keepQuery(); };
+        dialog.onmousedown = ({ target }) => { if (target === dialog) { dialog.close(); } };
+        close.onclick = () => { dialog.close(); };
+        addEventListener("scroll", () => { if (dialog.open) { scrollTo(placeOfPage); } }); // WebKit's keys scroll it
+        return corner;
     }
 
-    // Loads the search index in a docdata. Returns null if it did not run.
-    async function loadLookup(from) {
-        const [source, all] = await run(`${from}global_index.js`, new URL("pagemeld-search.js", ownAddress).href);
-        if (!["pages", "info", "common", "searchIndex", "prepareIndex"].every((name) => source[name])) {
-            return null;
+    // Light text is on a dark page, whose theme an attribute of the root or the body may switch. What the system says
+    // decides where the color is not given as red, green, and blue.
+    function matchPage(home) {
+        const systemIsDark = matchMedia("(prefers-color-scheme: dark)");
+        const match = () => {
+            const { color } = getComputedStyle(home.parentElement);
+            const [red, green, blue] = /^rgb/.test(color) ? color.match(/[\d.]+/g) : [];
+            const isDark = blue === undefined ? systemIsDark.matches : 0.21 * red + 0.72 * green + 0.07 * blue > 127;
+            home.style.colorScheme = isDark ? "dark" : "light";
+        };
+        const observer = new MutationObserver(match);
+        [document.documentElement, document.body].forEach((part) => observer.observe(part, { attributes: true }));
+        systemIsDark.onchange = match;
+        match();
+    }
+
+    function listen() {
+        addEventListener("keydown", onKey);
+        ["keydown", "keypress", "keyup"].forEach((type) => addEventListener(type, onDialogKey, true));
+        box.onfocus = needIndex;
+        box.onblur = () => { keepQuery(); };
+        box.oninput = filter.onchange = update;
+        more.onclick = showMore;
+        view.onclick = onClick;
+        form.onsubmit = (event) => {
+            event.preventDefault();
+            results.querySelector(".pagemeld-best")?.click();
+        };
+        tabs.forEach((tab) => { tab.onclick = () => { selectTab(tab); }; });
+    }
+
+    function openView() {
+        if (dialog.isConnected && !dialog.open) {
+            placeOfPage = { left: scrollX, top: scrollY, behavior: "instant" };
+            dialog.showModal();
+            needContents();
         }
-        search = source;
-        const moduleOf = (prefix) => nameOf(addressOf(`${prefix}docdata/`, [prefix], from), -4);
-        const modules = Object.fromEntries(["", ...all].map((prefix) => [prefix, moduleOf(prefix)]));
-        return { ...await finish(source.prepareIndex(source, all)), from, set: nameOf(from, -3), modules };
+        box.focus();
+        box.select();
+    }
+
+    // Tabs choose one of the parts where there is no room for both.
+    function selectTab(chosen) {
+        tabs.forEach((tab) => tab.setAttribute("aria-selected", tab === chosen));
+        view.classList.toggle("pagemeld-at-contents", chosen === tabs[1]);
+        showCurrent(contents);
+    }
+
+    // A link within this page does not leave it, but the dialog.
+    function onClick({ target }) {
+        const link = target.closest("a");
+        if (link) {
+            keepQuery(link.href);
+        }
+        if (link?.href.split("#")[0] === document.URL.split("#")[0]) {
+            dialog.close();
+        }
+    }
+
+    // The page does not see the keys that are pressed while the dialog is open, nor how the last one is let go.
+    function onDialogKey(event) {
+        isDialogKey = event.type === "keydown" ? dialog.open : isDialogKey;
+        if (isDialogKey) {
+            event.stopPropagation();
+            onKey(event);
+        }
+    }
+
+    function onKey(event) {
+        const isTaken = event.ctrlKey || event.altKey || event.metaKey || event.isComposing || event.defaultPrevented;
+        if (event.type === "keydown" && !isTaken && actOn(event.key, event.composedPath()[0])) {
+            event.preventDefault();
+        }
+    }
+
+    // Arrows lead through the results, "/" to the box, as Escape does in a place of the page. Returns whether it acted.
+    function actOn(key, target) {
+        const stops = [box, ...results.querySelectorAll("a"), more];
+        const next = stops.includes(target) && stops[stops.indexOf(target) + { ArrowDown: 1, ArrowUp: -1 }[key]];
+        const isTyped = target.isContentEditable || /^(input|textarea|select)$/.test(target.localName);
+        if (next) {
+            next.focus();
+        } else if (key === "Escape" && dialog.open) {
+            dialog.close();
+        } else if (key === "Escape" ? view.contains(target) : key === "/" && !isTyped) {
+            openView();
+        } else {
+            return false;
+        }
+        return true;
     }
 
     // The set being read, then the other one, unless the tag names the sets to search and leaves it out.
@@ -130,31 +193,37 @@
         join(own);
         const set = OTHER_SET[own.set];
         const isAsked = set && (tag.dataset.sets ?? set).includes(set);
-        const other = isAsked ? await loadLookup(new URL(`../../${set}/docdata/`, docdata).href) : null;
+        const other = isAsked ? await loadLookup(new URL(`../../${set}/docdata/`, docdata)) : null;
         if (other) {
             join(other);
+            await needContents();
             offerSet(other);
         }
+    }
+
+    // Loads the search index in a docdata. Returns null if it did not run.
+    async function loadLookup(from) {
+        const [source, all] = await run(`${from}global_index.js`, new URL("pagemeld-search.js", ownAddress));
+        if (!["pages", "info", "common", "searchIndex", "prepareIndex"].every((name) => source[name])) {
+            return null;
+        }
+        search = source;
+        const moduleOf = (prefix) => nameOf(createLink(prefix, "", [prefix], from), -3);
+        const modules = Object.fromEntries(["", ...all].map((prefix) => [prefix, moduleOf(prefix)]));
+        return { ...await finish(source.prepareIndex(source, all)), from, set: nameOf(from, -3), modules };
     }
 
     // The results that are shown stay where they are; those of the other set come after them.
     function join(lookup) {
         lookups.push(lookup);
         addToFilter(lookup);
-        const shown = found.pages.slice(0, results.childElementCount);
-        const isShown = ({ page, weighed }) =>
-            shown.some((one) => one.page === page && one.weighed.lookup === weighed.lookup);
-        findAll();
-        found.pages = [...shown, ...found.pages.filter((page) => !isShown(page))];
-        showResults(Math.max(shown.length, RESULTS_AT_ONCE));
+        findAll(found.pages.slice(0, results.childElementCount));
     }
 
     // The contents end with the other set: its first page of this module.
     function offerSet({ set, from, pages, prefixes }) {
-        const first = prefixes.indexOf("");
-        if (first >= 0) {
-            nav.append(createLink(pages[first][0], set, [], from));
-        }
+        const first = pages[prefixes.indexOf("")];
+        contents.append(first ? createLink(first[0], set, [], from) : "");
     }
 
     function addToFilter({ set, modules }) {
@@ -168,25 +237,29 @@
     const accepts = ({ set, modules, prefixes }, page) =>
         ["", set, `${set}/${modules[prefixes[page]]}`].includes(filter.value);
 
-    function findAll() {
+    function update() {
+        if (lookups.length > 0) {
+            results.replaceChildren();
+            findAll([]);
+        }
+    }
+
+    function findAll(shown) {
+        const isShown = ({ page, weighed }) =>
+            shown.some((one) => one.page === page && one.weighed.lookup === weighed.lookup);
         found = search.findPages(lookups, box.value, accepts);
+        found.pages = shown.concat(found.pages.filter((page) => !isShown(page)));
         const { length } = found.pages;
         const whole = found.pages.filter(({ isWhole }) => isWhole).length;
         const count = ["Nothing", "1 page"][length] ?? `${length} pages`;
         const rest = whole === length ? "" : `, ${whole || "none"} with all words`;
         status.textContent = found.query.keys.length > 0 ? `${count} found${rest}` : "";
-    }
-
-    function update() {
-        if (lookups.length > 0) {
-            findAll();
-            results.replaceChildren();
-            showResults(RESULTS_AT_ONCE);
-        }
+        showResults(shown.length);
     }
 
     function showResults(count) {
-        results.append(...found.pages.slice(results.childElementCount, count).map(createResult));
+        const next = found.pages.slice(results.childElementCount, Math.max(count, RESULTS_AT_ONCE));
+        results.append(...next.map(createResult));
         more.hidden = results.childElementCount === found.pages.length;
     }
 
@@ -214,21 +287,23 @@
         box.defaultValue = box.value; // to which WebKit resets the box after Back
         const query = dialog.isConnected && !dialog.open ? "" : box.value.trim();
         const address = new URL(document.URL);
-        const others = address.search.slice(1).split("&").filter((part) => part && !part.startsWith("pagemeld="));
-        address.search = others.concat(query ? `pagemeld=${encodeURIComponent(query)}` : []).join("&");
+        const others = address.search.replace(/[?&]pagemeld=[^&]*/, "");
+        address.search = others + (query ? `${others && "&"}pagemeld=${encodeURIComponent(query)}` : "");
         const kept = { module: filter.value, shown: results.childElementCount, chosen };
         history.replaceState({ ...history.state, pagemeld: kept }, "", address.href);
     }
 
     // Once the indexes are there: as it was when the reader left for a result.
     async function restoreQuery(query) {
-        const { module = "", shown = 0, chosen } = history.state?.pagemeld ?? {};
+        const kept = history.state?.pagemeld;
         box.value = query;
         await needIndex();
-        filter.value = module;
-        update();
-        showResults(Math.max(shown, RESULTS_AT_ONCE));
-        [...results.querySelectorAll("a")].find(({ href }) => href === chosen)?.focus();
+        if (kept) {
+            filter.value = kept.module;
+            update();
+            showResults(kept.shown);
+            [...results.querySelectorAll("a")].find(({ href }) => href === kept.chosen)?.focus();
+        }
     }
 
     async function loadContents() {
@@ -237,23 +312,18 @@
             contents.textContent = "Contents are not available: global_toc.js did not run";
             return;
         }
-        const way = findWay(toc.children, prefixes) ?? [];
-        const entries = toc.children.map((node) => createEntry(node, way, prefixes));
-        contents.append(create("p", {}, toc.title), create("ul", {}, ...entries));
-        showCurrent();
+        const root = decode(new URL("..", docdata).pathname);
+        const page = decode(location.pathname.replace(/\/$/, "/index.html")).slice(root.length);
+        const way = findWay(toc.children, page) ?? [];
+        const list = create("ul", language, ...toc.children.map((node) => createEntry(node, way, prefixes)));
+        contents.append(create("p", language, toc.title), list);
+        showCurrent(contents);
     }
 
-    // Whether a link of the contents leads to this page. Takes few links apart.
-    function isThisPage(link, prefixes) {
-        const pathOf = ({ pathname }) => decode(pathname.replace(/\/$/, "/index.html"));
-        const path = pathOf(location);
-        return link.includes(path.split("/").at(-1)) && pathOf(createLink(link, "", prefixes)) === path;
-    }
-
-    // The nodes of the contents down to the first that leads to this page, or null.
-    function findWay(nodes, prefixes) {
+    // The nodes of the contents down to the first that leads to a page, or null.
+    function findWay(nodes, page) {
         for (const node of nodes ?? []) {
-            const below = isThisPage(node.link, prefixes) ? [] : findWay(node.children, prefixes);
+            const below = node.link.split("#", 1)[0] === page ? [] : findWay(node.children, page);
             if (below) {
                 return [node, ...below];
             }
@@ -261,7 +331,7 @@
         return null;
     }
 
-    // An entry of the contents. Those below it are made when it is opened, or at once on the way to this page.
+    // An entry of the contents. Those below it are made when it is opened, as it is on the way to this page.
     function createEntry(node, way, prefixes) {
         const { link, title, children } = node;
         const name = link === "null" ? "" : createLink(link, title, prefixes);
@@ -272,181 +342,77 @@
             return create("li", {}, name || title);
         }
         const list = create("ul", {});
-        const fill = () => { list.append(...children.map((child) => createEntry(child, way, prefixes))); };
         const summary = name ? create("summary", { "aria-label": `Below ${title}` }) : create("summary", {}, title);
         const details = create("details", {}, summary, list);
-        if (way.slice(0, -1).includes(node)) {
-            fill();
-            details.open = true;
-        } else {
-            details.addEventListener("toggle", fill, { once: true });
-        }
+        const fill = () => {
+            list.append(...children.map((child) => createEntry(child, way, prefixes)));
+            showCurrent(list);
+        };
+        details.addEventListener("toggle", fill, { once: true });
+        details.open = way.slice(0, -1).includes(node);
         return create("li", {}, name, details);
     }
 
-    function showCurrent() {
+    function showCurrent(part) {
         if (dialog.open) {
-            contents.querySelector("[aria-current]")?.scrollIntoView({ block: "center" });
+            part.querySelector("[aria-current]")?.scrollIntoView({ block: "center" });
         }
     }
 
-    // Tabs choose one of the parts where there is no room for both.
-    function selectTab(chosen) {
-        tabs.forEach((tab) => tab.setAttribute("aria-selected", tab === chosen));
-        view.classList.toggle("pagemeld-at-contents", chosen === tabs[1]);
-        showCurrent();
+    // A link is a path on disk, in which only "#" has a meaning: "File:a.html" and "javascript:" are names of files.
+    // The outputs put the prefix before whole addresses too.
+    function createLink(link, title, prefixes, from = docdata) {
+        const { length } = prefixes.find((prefix) => link.startsWith(prefix)) ?? "";
+        const end = `${link}#`.indexOf("#", length);
+        const path = link.slice(0, end).replace(/[\0- %?#\\]/g, encodeURIComponent) + link.slice(end);
+        const isAddress = /^(https?|ftp|mailto):(?!:)/i.test(link.slice(length));
+        const href = isAddress ? link.slice(length) : new URL("..", from).href + path;
+        return create("a", { href, target: "_self" }, title.trim() || link);
     }
 
-    // What a key does: "/" leads to the box, as Escape does in a place of the page; arrows lead through the results.
-    function findAct(key, target) {
-        const stops = [box, ...results.querySelectorAll("a"), more];
-        const next = stops[stops.indexOf(target) + { ArrowDown: 1, ArrowUp: -1 }[key]];
-        if (next && stops.includes(target)) {
-            return () => { next.focus(); };
+    // The names of a module and of its set are the last two of its directories.
+    const nameOf = ({ pathname }, level) => decode(pathname.split("/").at(level) ?? "");
+    const decode = (text) => { try { return decodeURIComponent(text); } catch { return text; } }; // not UTF-8
+
+    // Runs scripts in a hidden frame that stays, so that its functions and values can be used. Returns its window, and
+    // the values of p0, p1, ..., longest first. What a script assigned tells whether it ran.
+    async function run(...addresses) {
+        const frame = create("iframe", { hidden: "" });
+        await loaded(frame, view);
+        for (const src of addresses) {
+            await loaded(create("script", { src }), frame.contentDocument.head);
         }
-        if (key === "Escape" && dialog.open) {
-            return () => { dialog.close(); };
-        }
-        const isTyped = target.isContentEditable || /^(input|textarea|select)$/.test(target.localName);
-        return (key === "Escape" && view.contains(target)) || (key === "/" && !isTyped) ? openView : null;
+        const source = frame.contentWindow;
+        const prefixes = Object.keys(source).filter((key) => /^p\d+$/.test(key)).map((key) => source[key]);
+        return [source, prefixes.sort((a, b) => b.length - a.length)];
     }
 
-    function onKey(event) {
-        const isTaken = event.ctrlKey || event.altKey || event.metaKey || event.isComposing || event.defaultPrevented;
-        const act = event.type === "keydown" && !isTaken ? findAct(event.key, event.composedPath()[0]) : null;
-        if (act) {
-            event.preventDefault();
-            act();
-        }
-    }
-
-    // The page does not see the keys that are pressed while the dialog is open, nor how the last one is let go.
-    function onDialogKey(event) {
-        if (event.type === "keydown") {
-            isDialogKey = dialog.open;
-        }
-        if (isDialogKey) {
-            event.stopPropagation();
-            onKey(event);
-        }
-    }
-
-    // A link within this page does not leave it, but the dialog.
-    function onClick({ target }) {
-        const link = target.closest("a");
-        if (link) {
-            keepQuery(link.href);
-        }
-        if (link?.href.split("#")[0] === document.URL.split("#")[0]) {
-            dialog.close();
-        }
-    }
-
-    function openView() {
-        if (dialog.isConnected && !dialog.open) {
-            holdPage();
-            dialog.showModal();
-            needContents();
-        }
-        box.focus();
-        box.select();
-    }
-
-    // Keeps the page from being scrolled, unless that would move it: not every browser keeps the scroll bar's room.
-    function holdPage() {
-        const { documentElement: root, body } = document;
-        const width = root.offsetWidth;
-        root.classList.toggle("pagemeld-held", getComputedStyle(body).overflowY === "visible");
-        if (root.offsetWidth !== width) {
-            root.classList.remove("pagemeld-held");
-        }
-    }
-
-    // Light text is on a dark page. What the system says decides where the color is not given as red, green, and blue.
-    function matchPage() {
-        const { color } = getComputedStyle(home.parentElement);
-        const [red, green, blue] = /^rgb/.test(color) ? color.match(/[\d.]+/g) : [];
-        const isDark = blue === undefined ? systemIsDark.matches : 0.21 * red + 0.72 * green + 0.07 * blue > 127;
-        home.classList.toggle("pagemeld-dark", isDark);
-    }
-
-    // In a place of the page, with a link that leads past it.
-    function fillPlace(place) {
-        const end = create("span", { tabindex: "-1" });
-        const skip = create("a", { href: "#pagemeld", class: "pagemeld-skip" }, "Skip search and contents");
-        skip.onclick = (event) => {
-            event.preventDefault();
-            end.focus();
-        };
-        home = place;
-        view.prepend(skip);
-        home.append(view, end);
-        (window.requestIdleCallback ?? setTimeout)(needContents);
-    }
-
-    // In a dialog, whose edge outside the view closes it.
-    function fillCorner() {
-        const close = create("button", { type: "button", class: "pagemeld-close", "aria-label": "Close" }, "\u00d7");
-        view.append(close);
-        dialog.id = "pagemeld";
-        dialog.append(view);
-        opener.dataset.corner = tag.dataset.corner ?? "";
-        document.body.append(corner);
-        opener.onclick = openView;
-        dialog.onmousedown = ({ target }) => {
-            if (target === dialog) {
-                dialog.close();
+    // Runs a generator, and makes way for the reader's events now and then. Returns its result.
+    async function finish(steps) {
+        let step = steps.next();
+        for (let end = 0; !step.done; step = steps.next()) {
+            if (performance.now() > end) {
+                await new Promise((done) => { setTimeout(done); });
+                end = performance.now() + SLICE;
             }
-        };
-        close.onclick = () => { dialog.close(); };
-        dialog.onclose = () => {
-            document.documentElement.classList.remove("pagemeld-held");
-            keepQuery();
-        };
-        ["keydown", "keypress", "keyup"].forEach((type) => addEventListener(type, onDialogKey, true));
+        }
+        return step.value;
     }
 
-    // Themes are switched by an attribute of the root or the body.
-    function listen() {
-        addEventListener("keydown", onKey);
-        box.onfocus = () => { needIndex(); };
-        box.onblur = () => { keepQuery(); };
-        box.oninput = filter.onchange = update;
-        more.onclick = showMore;
-        view.onclick = onClick;
-        form.onsubmit = (event) => {
-            event.preventDefault();
-            results.querySelector(".pagemeld-best")?.click();
-        };
-        tabs.forEach((tab) => { tab.onclick = () => { selectTab(tab); }; });
-        const observer = new MutationObserver(matchPage);
-        [document.documentElement, document.body].forEach((part) => observer.observe(part, { attributes: true }));
-        systemIsDark.onchange = matchPage;
+    // Does something at the first call, and returns the same at each.
+    function once(act) {
+        let result;
+        return () => (result ??= act());
     }
 
-    async function start() {
-        if (document.readyState === "loading") { // XHTML does not defer scripts
-            await happened("DOMContentLoaded");
-        }
-        if (document.body?.localName !== "body") {
-            return; // a frame set
-        }
-        const place = document.getElementById("pagemeld");
-        const query = new URLSearchParams(location.search).get("pagemeld");
-        if (!place && !query && document.readyState !== "complete") {
-            await happened("load"); // which a style sheet would put off
-        }
-        const href = new URL("pagemeld.css", ownAddress).href;
-        await loaded(create("link", { rel: "stylesheet", href }), document.head ?? document.documentElement);
-        const fill = place ? fillPlace : fillCorner;
-        fill(place);
-        listen();
-        selectTab(tabs[0]);
-        matchPage();
-        if (query) {
-            restoreQuery(query);
-            openView();
-        }
+    const loaded = (element, parent) =>
+        new Promise((done) => { element.onload = element.onerror = done; parent.append(element); });
+
+    function create(name, attributes, ...children) {
+        const element = document.createElementNS("http://www.w3.org/1999/xhtml", name);
+        Object.entries(attributes).forEach(([key, value]) => element.setAttribute(key, value));
+        element.append(...children);
+        return element;
     }
 
     start();
