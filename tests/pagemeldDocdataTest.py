@@ -5,6 +5,7 @@ import subprocess
 import sys
 import tempfile
 import unittest
+from pathlib import Path
 
 PROGRAM = os.path.abspath(sys.argv.pop(1))
 PAGES = {
@@ -31,8 +32,9 @@ PAGES = {
     "sub/index.html": "<title>Lib: Same (1.0)</title><h1>C:\\new\0</h1><p>İki \\o/",
     "plain.html": "<title>Plain</title><h1>Plain</h1>",
     "sub/w%41?.html": '<title>Wide "quotes"</title><h1>"quotes"</h1>',
-    'quote".html': "", "sharp#.html": "", "line\n.html": "", "back\\slash.html": "", b"bytes\xff.html": "",
+    'quote".html': "", "sharp#.html": "", "line\n.html": "", "back\\slash.html": "", "bytes\udcff.html": "",
     "docdata/old.html": "", "picture.png": "",
+    "moved.html": "<title>Redirecting</title><meta content='0;\nURL=plain.html' http-equiv=Refresh><h1>Moved</h1>",
 }
 INDEX = {
     "pages": [["index.html", "Start"], ["Foo.html", "By “heading”"], ["Foo.html#x", "नमस्ते x_1"],
@@ -74,9 +76,9 @@ WARNINGS = """'back\\\\slash.html': left out: the scripts can't hold its path
 'quote".html': left out: the scripts can't hold its path
 'sharp#.html': left out: the scripts can't hold its path
 sub/index.html: what would break the scripts is replaced in the title "C:∖new␀"
+Manual: there is no page none.html
 index.html: what would break the scripts is replaced in the title "C:∖new"
 index.html: links to 'gone.html', which is not a page of the set, are left out
-Manual: there is no page none.html
 plain.html: its lists lead to no page of the set""".split("\n")
 
 
@@ -123,15 +125,15 @@ TITLES = [
 # A row is the start page's title and heading, more options, and the name of the entry of module "lib".
 MODULE_NAMES = [("Main Page", "Overview", [], "lib"), ("3.11.2 Documentation", "", [], "lib"),
                 ("Overview", "The Lib", [], "The Lib"), ("Lib", "", [], "Lib"), ("Lib", "", ["--title", "L"], "L")]
-LIST = '<li><a href="b.html">B</a></li><li><a href="#">Menu</a></li>'
+REPEATS = '<li><a href="index.html">Home</a><li><a href="c.html">index.html</a>'
+LIST = f'<ul>{REPEATS}<li><a href="b.html">B</a></li><li><a href="#">Menu</a></li></ul>'
 # A row is what makes a generator known, the page with its list, and the list.
 GENERATORS = [
     ("index.html", '<meta name="generator" content="Doxygen 1.9">', "annotated.html",
      '<tr id="row_0_"><td><a href="b.html">B</a>'),
     ("index.html", "<META content='DocBook XSL' name='generator'>", "index.html",
      '<dl class="toc"><dt><a href="b.html">B</a></dt></dl>'),
-    ("element-list", "", "overview-tree.html", f"<ul>{LIST}</ul>"),
-    ("objects.inv", "", "contents.html", f"<ul>{LIST}</ul>"),
+    ("element-list", "", "overview-tree.html", LIST), ("objects.inv", "", "contents.html", LIST),
     ("book.js", "", "index.html", '<nav><ol><li><a href="b.html">B</a><li><ol><li><a href="c.html">C</a></ol></ol>'
                                   '</nav><a rel="next" href="c.html">Next</a>'),
 ]
@@ -139,14 +141,14 @@ TAG = '<script src="docdata/pagemeld.js" defer="defer"></script>'
 WIDE_TAG = TAG.replace(" defer", ' charset="utf-8" defer').encode("utf-16-le").decode()
 WIDE = ("\ufeff<p>\u010d".encode("utf-16-le"), "</body>".encode("utf-16-le") + b"!", WIDE_TAG)
 OLD_TAG = '<script src="docdata/pagemeld.js" defer data-docdata="../docdata"></script>'
+SLOW = b"<script " + b"src=docdata/pagemeld.js " * 50000 + b">x</script><meta " + b"name=generator " * 50000
 # A row is a page's name, what it has before and after the place of the tag, and the tag that it gets.
 SCRIPT = [
     ("plain.html", b"<body>x", b"</BODY ></html>", TAG), ("bytes.html", b"\xff\r\n", b"</body>", TAG),
-    ("end.html", b"<p>x", b"", TAG), ("bodyless.html", b"<p>x", b"</html>", TAG),
+    ("end.html", b"<p>x", b"", TAG), ("bodyless.html", b"<p>x", b"</html>", TAG), ("a.html", SLOW, b"</body>", TAG),
     ("hidden.html", b"<script>'</body>'</script>x", b"</body><!-- </body> -->", TAG),
     ("said.html", f"<!-- {TAG} -->".encode(), b"</body>", TAG),
-    ("wide.html", *WIDE),
-    ("based.html", b"<base target=x>", b"<base href=y></body>", TAG),
+    ("wide.html", *WIDE), ("based.html", b"<base target=x>", b"<base href=y></body>", TAG),
     ("deep/er/page.html", b"", b"</body>", TAG.replace('"doc', '"../../doc')),
     ("frames.html", b"<frameset></frameset><noframes><body>", b"</body></noframes>", ""),
     ("strict.xhtml", b'<?xml version="1.0"?><html><body/>', b"</html>", ""),
@@ -167,21 +169,17 @@ MISTAKES = [
 class PagemeldDocdata(unittest.TestCase):
     def setUp(self):
         self.maxDiff = None
-        parent = tempfile.TemporaryDirectory()
-        self.addCleanup(parent.cleanup)
-        self.parent = parent.name
-        self.directory = os.path.join(parent.name, "lib", "Manual")
+        self.parent = self.enterContext(tempfile.TemporaryDirectory())
+        self.directory = os.path.join(self.parent, "lib", "Manual")
 
     def write(self, pages):
         for path, page in pages.items():
-            path = os.path.join(os.fsencode(self.directory), os.fsencode(path))
-            os.makedirs(os.path.dirname(path), exist_ok=True)
-            with open(path, "wb") as file:
-                file.write(page if isinstance(page, bytes) else page.encode())
+            file = Path(self.directory, path)
+            file.parent.mkdir(parents=True, exist_ok=True)
+            file.write_bytes(page if isinstance(page, bytes) else page.encode())
 
     def read(self, path):
-        with open(os.path.join(self.directory, path), "rb") as file:
-            return file.read()
+        return Path(self.directory, path).read_bytes()
 
     def run_program(self, *arguments, status=0):
         """Returns the lines that the program says, with paths relative to the set."""
@@ -203,15 +201,22 @@ class PagemeldDocdata(unittest.TestCase):
         self.assertEqual(INDEX, index)
         self.assertEqual(list(INDEX["searchIndex"]), list(index["searchIndex"]))
         self.assertEqual(FROM_LISTS, contents)
-        self.assertEqual(["pagemeld-docdata: warning: " + warning for warning in WARNINGS], said[:-1])
-        self.assertEqual("pagemeld-docdata: Manual: 8 pages, 5 places, 14 texts, 36 terms", said[-1])
+        self.assertEqual(WARNINGS, [line.removeprefix("pagemeld-docdata: warning: ") for line in said[:-1]])
+        self.assertIn("Manual: 8 pages, 5 places, 14 texts, 36 terms; 1 redirects left out", said[-1])
 
-    def test_any_number_of_processes_gives_the_same_bytes(self):
-        self.write({f"{number}.html": f"<h1>{number}</h1><h2 id=a>A{number % 7}</h2><p>x" for number in range(100)})
-        self.make("--jobs", "1")
+    def test_many_pages_give_the_same_in_several_processes_and_what_most_of_them_have_is_no_place(self):
+        page = "<h1>P</h1><h2 id=e>Examples</h2><p>x<h3 id=o>Own {}</h3>"
+        self.write({f"{number}.html": page.format(number) for number in range(100)})
+        self.assertEqual(["0.html", "0.html#o"], [path for path, _ in self.make("--jobs", "1")[0]["pages"][:2]])
         once = self.read("docdata/index.json")
         self.make("--jobs", "5")
         self.assertEqual(once, self.read("docdata/index.json"))
+
+    def test_makes_the_sets_that_other_modules_have_for_outputs(self):
+        self.write({"index.html": "x", "../../other/ScriptReference/index.html": "x"})
+        self.run_program("lib/Manual", "other/ScriptReference")
+        for made in ("lib/ScriptReference", "other/Manual"):
+            self.assertEqual(["docdata"], os.listdir(Path(self.parent, made)))
 
     def test_contents_from_directories_have_no_generated_and_no_excluded_pages(self):
         self.write({**PAGES, "genindex.html": "<h1>Index</h1><h2 id=a>A</h2><p>gauge", "draft/x.html": ""})
@@ -238,11 +243,6 @@ class PagemeldDocdata(unittest.TestCase):
                 index = self.make()[0]
                 entries = [index["info"][number][1] for number in index["searchIndex"].get(word, [])]
                 self.assertEqual(is_found, "a.html" in [index["pages"][entry][0] for entry in entries])
-
-    def test_a_heading_of_most_pages_is_no_place(self):
-        page = "<h1>P</h1><h2 id=e>Examples</h2><p>x<h3 id=o>Own {}</h3>"
-        self.write({f"{number}.html": page.format(number) for number in range(20)})
-        self.assertEqual(["0.html", "0.html#o"], [path for path, _ in self.make()[0]["pages"][:2]])
 
     def test_titles_of_pages_and_modules(self):
         for name, pages, expected in TITLES:

@@ -1,15 +1,17 @@
 """Makes the docdata of one set directory."""
-import json
 import os
 from typing import NamedTuple
 
-from contents import ListReader, list_directories, list_links, make_contents
+from contents import list_directories, list_links, make_contents
+from docdata_files import copy_script, remove_script, write_inputs
 from generators import find_generator
+from list_reader import ListReader
 from messages import say, warn
-from page_script import copy_script, remove_from_page, remove_script
 from page_files import Task, list_paths, read_file, read_pages
+from page_script import remove_from_page
 from search_index import make_index
 from titles import choose_titles, is_generic, make_title
+
 
 class SetOptions(NamedTuple):
     """What the command line says of the sets."""
@@ -26,7 +28,10 @@ class SetOptions(NamedTuple):
 def choose_lists(directory, titles, options):
     """Returns the pages whose lists are contents, and whether these lists are navigation."""
     if options.lists:
-        return options.lists, False
+        for path in options.lists:
+            if path not in titles:
+                warn(f"{directory}: there is no page {path}")
+        return [path for path in options.lists if path in titles], False
     first = options.root_link if options.root_link in titles else next(iter(titles))
     generator = find_generator(directory, read_file(os.path.join(directory, first)))
     if not generator:
@@ -36,18 +41,15 @@ def choose_lists(directory, titles, options):
 
 
 def list_rows(directory, titles, options):
-    """Returns the rows of each list that there is, or those of the directories if there is none."""
+    """Returns the rows of each page with lists that lead somewhere, or those of the directories if there is none."""
     lists, is_navigation_read = choose_lists(directory, titles, options)
     found = []
     for path in lists:
-        if path not in titles:
-            warn(f"{directory}: there is no page {path}")
-            continue
         items = ListReader(is_navigation_read).read(read_file(os.path.join(directory, path)))
         rows = list_links(items, path, titles, directory)
         if any(row.link != "null" for row in rows):
             found.append(rows)
-        elif path in options.lists:
+        elif options.lists:
             warn(f"{directory}/{path}: its lists lead to no page of the set")
     if options.lists and not found:
         warn(f"{directory}: the contents are made from the directories")
@@ -73,35 +75,29 @@ def make_set_contents(directory, titles, options):
     return make_contents(root, module, list_rows(directory, titles, options), options.shared_groups)
 
 
-def write_file(file, write):
-    """Writes a file by a temporary one, so that it is there whole or as it was."""
-    with open(file + ".tmp", "w", encoding="utf-8", newline="\n") as stream:
-        write(stream)
-    os.replace(file + ".tmp", file)
-
-
-def write_docdata(docdata, index, contents, options):
-    os.makedirs(docdata, exist_ok=True)
-    write_file(os.path.join(docdata, "index.json"), index.write)
-    write_file(os.path.join(docdata, "toc.json"),
-               lambda file: file.write(json.dumps(contents, ensure_ascii=False, indent=1) + "\n"))
-    if options.adds_script:
-        copy_script(docdata)
+def read_set(directory, paths, options):
+    """Returns the pages by path without those that only lead to another page, but with the start page, where the root
+    of the contents leads; and the number of those that were left out."""
+    pages = read_pages([Task(directory, path, options.adds_script) for path in paths], options.jobs)
+    kept = {path: page for path, page in pages.items() if not page.is_redirect or path == options.root_link}
+    return kept, len(pages) - len(kept)
 
 
 def make_docdata(directory, options):
     """Writes both files of a set directory, and what the page script needs if the options say so. Returns whether the
     directory has pages."""
-    paths = list_paths(directory, options.excluded)
-    pages = read_pages([Task(directory, path, options.adds_script) for path in paths], options.jobs)
+    pages, redirect_count = read_set(directory, list_paths(directory, options.excluded), options)
     if not pages:
         return False
     titles = choose_titles(pages, options.root_link, directory)
     contents = make_set_contents(directory, titles, options)
     index = make_index(pages, titles)
-    write_docdata(os.path.join(directory, "docdata"), index, contents, options)
+    docdata = os.path.join(directory, "docdata")
+    write_inputs(docdata, index, contents)
+    if options.adds_script:
+        copy_script(docdata)
     say(f"{directory}: {len(titles)} pages, {len(index.entries) - len(titles)} places, {len(index.texts)} texts, "
-        f"{index.term_count} terms")
+        f"{index.term_count} terms" + (f"; {redirect_count} redirects left out" if redirect_count else ""))
     return True
 
 

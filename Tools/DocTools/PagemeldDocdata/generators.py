@@ -4,6 +4,8 @@ import os
 import re
 from typing import NamedTuple
 
+from markup import read_attributes
+
 # What an element is to the reader of a page. SKIP: no text of the page. LISTING: code, of which the first line counts.
 # NAME: the name in the heading of a member. MEMBER: a heading if there was an anchor since the last one. TEXT: a
 # paragraph. UNUSED: anchors count, text does not. Anything else is the level of a heading.
@@ -67,20 +69,29 @@ GENERATORS = (
     Generator("Doxygen", "doxygen", ("doxygen.css",),
               (("pages.html",), ("topics.html", "modules.html"), ("annotated.html",))),
     Generator("javadoc", "javadoc", ("element-list", "package-list"), (("overview-tree.html", "package-tree.html"),)),
+    Generator("rustdoc", "rustdoc", (), ()),  # a directory for each of its modules
     Generator("mdBook", "mdbook", ("book.js",), (("toc.html", "index.html"),), True),
     Generator("MkDocs", "mkdocs", ("mkdocs", "search/search_index.json"), (("index.html",),), True),
     Generator("texinfo", "makeinfo|texi2any|texinfo", (), (("index.html",),)),
     Generator("DocBook", "docbook|gtk-doc", (), (("index.html",),)),
     Generator("Sphinx", "sphinx", ("objects.inv", "searchindex.js"), (("contents.html", "index.html"),)),
 )
-META = re.compile(r"""<meta\s[^<>]*\bname\s*=\s*["']?generator\b[^<>]*>""", re.I)
+META = re.compile(r"<meta(\s[^<>]*)", re.I)
+
+
+def read_meta(html):
+    """Returns what the <meta name="generator"> of a page says, "" if there is none."""
+    for attributes in map(read_attributes, META.findall(html)):
+        if attributes.get("name", "").lower() == "generator":
+            return attributes.get("content", "")
+    return ""
 
 
 def find_generator(directory, start_html):
     """Returns the generator of the pages in directory, whose start page is given; None if it isn't in the table."""
-    meta = META.search(start_html)
+    meta = read_meta(start_html)
     for generator in GENERATORS:
-        if meta and re.search(generator.meta, meta[0], re.I):
+        if re.search(generator.meta, meta, re.I):
             return generator
     for generator in GENERATORS:
         if any(os.path.exists(os.path.join(directory, file)) for file in generator.files):

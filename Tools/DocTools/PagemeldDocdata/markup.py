@@ -3,31 +3,37 @@ no text; html.parser does the same with a Python call for every step, and takes 
 import re
 from html import unescape
 
-# A quote begins a value only after "=", and what is never closed reaches to the end. Groups: the content of a listing;
-# the name of a tag, with its "/", and its attributes.
+# A quote begins a value only after "=", and what is never closed reaches to the end: so the first try always matches,
+# and time is linear without possessive groups, which Python 3.11.2 reads wrongly. Groups: the content of a listing; the
+# name of a tag, with its "/", and its attributes.
 TOKEN = re.compile(r"""
     <!--(?:-?>|.*?(?:--!?>|\Z)) | <!\[CDATA\[.*?(?:\]\]>|\Z) | <[!?][^>]*(?:>|\Z)
     | <(?:script|style|svg)\b(?![^>]*/>).*?(?:</(?:script|style|svg)\s*>|\Z)
     | <pre\b[^>]*>(.*?)(?:</pre\s*>|\Z)
-    | <(/?[a-z][^\s/>]*)((?:[^>=]++|=\s*+(?:"[^"]*+"|'[^']*+')?)*+)(?:>|\Z)""", re.X | re.S | re.I)
+    | <(/?[a-z][^\s/>]*)([^>=]*(?:=\s*(?:"[^"]*"|'[^']*')?[^>=]*)*)(?:>|\Z)""", re.X | re.S | re.I)
 ATTRIBUTE = re.compile(r"""([^\s=/"'>]+)(?:\s*=\s*(?:"([^"]*)"|'([^']*)'|([^\s>]+)))?""")
 TAG = re.compile("<[^>]*>")
 ENCODING = re.compile(rb"""(?:charset|encoding)\s*=\s*["']?\s*([\w.:-]+)""")
-BYTE_ORDER_MARKS = {b"\xff\xfe": "utf-16-le", b"\xfe\xff": "utf-16-be", b"\xef\xbb": "utf-8"}
+# Byte order marks, and the "<" with which pages in UTF-16 without a mark begin.
+FIRST_BYTES = {b"\xff\xfe": "utf-16-le", b"\xfe\xff": "utf-16-be", b"\xef\xbb": "utf-8",
+               b"<\0": "utf-16-le", b"\0<": "utf-16-be"}
 
 
 def find_encoding(data):
-    """Returns the encoding of a page: that of its byte order mark, or UTF-8 if it is that, or the declared one, or else
-    windows-1252. Pages in UTF-16 without a mark begin with a "<"."""
-    unmarked = {b"<\0": "utf-16-le", b"\0<": "utf-16-be"}
-    encoding = BYTE_ORDER_MARKS.get(data[:2]) or unmarked.get(data[:2])
+    """Returns the encoding of a page: that of its first two bytes, or UTF-8 if it is that, or the declared one."""
+    encoding = FIRST_BYTES.get(data[:2])
     if encoding:
         return encoding
     try:
         data.decode()
         return "utf-8"
     except UnicodeDecodeError:
-        declared = ENCODING.search(data[:4096])
+        return find_declared_encoding(data)
+
+
+def find_declared_encoding(data):
+    """Returns the encoding that a page declares, or else windows-1252."""
+    declared = ENCODING.search(data[:4096])
     try:
         name = declared[1].decode() if declared else "cp1252"
         "".encode(name)

@@ -6,12 +6,14 @@ from typing import NamedTuple
 
 from generators import LISTING, MEMBER, NAME, PARTS, SKIP, SKIPPED_ROLES, SKIPPED_TAGS, TEXT, UNUSED
 from markup import TAG, TOKEN, first_line, read_attributes, squeeze
-from words import find_plain_words, find_words
+from sections import OpenSection, Section
+from words import find_words
 
 NUMBER = re.compile(r"^[\dA-Z]+(\.\d+)*\.?\s+")  # of a section, before its name
 MAIN = "main"
-MARKED = re.compile(r"\b(?:id|class|name|role)\s*=", re.I)
-SHOWN_LENGTH = 300
+REDIRECT = "redirect"
+MARKED = re.compile(r"\b(?:id|class|name|role|http-equiv)\s*=", re.I)
+ADDRESS = re.compile(r"\burl\s*=", re.I)
 
 # The texts end at the next tag of that kind, so that tags that are never closed take linear time.
 TITLE = re.compile(r"<title[^<>]*>((?:(?!</?title).){0,2000})</title", re.S | re.I)
@@ -25,27 +27,11 @@ BLOCKS = KINDS.keys() | set(
 READ_WITHOUT_ATTRIBUTES = BLOCKS | SKIPPED_TAGS | {"br"}
 
 
-class Section(NamedTuple):
-    level: int  # of its heading, 0 for the beginning of the page
-    anchor: str  # "" if nothing leads there
-    heading: str
-    name: str  # the heading, of a member without its parameters
-    lead: str  # the beginning of its first paragraph
-    words: str  # those of heading and first paragraph, with a space between them
-    more_words: str  # the others
-
-
 class Page(NamedTuple):
     title: str
     heading: str  # the main one
     sections: list  # the first is the beginning of the page
-
-
-def shorten(text):
-    """Returns text with at most SHOWN_LENGTH letters, cut between words."""
-    if len(text) <= SHOWN_LENGTH:
-        return text
-    return text[:SHOWN_LENGTH - 1].rpartition(" ")[0] + " \u2026"
+    is_redirect: bool = False  # it only leads to another page
 
 
 @functools.lru_cache(maxsize=4096)
@@ -58,35 +44,16 @@ def read_traits(name, attributes):
     part = next((PARTS[name, one] for one in values.get("class", "").split() if (name, one) in PARTS), "")
     if name == "main" or role == "main":
         part = MAIN
+    elif values.get("http-equiv", "").lower() == "refresh" and ADDRESS.search(values.get("content", "")):
+        part = REDIRECT
     return part, values.get("id") or name == "a" and values.get("name") or ""
-
-
-class OpenSection:
-    """A section while it is read."""
-
-    def __init__(self, level, anchor="", heading="", name=""):
-        self.level, self.anchor, self.heading, self.name = level, anchor, heading, name
-        self.lead, self.texts = "", []
-
-    def add(self, text, is_paragraph=False):
-        if is_paragraph and not self.lead:
-            self.lead = text.removesuffix(" More...")
-        elif text:
-            self.texts.append(text)
-
-    def close(self):
-        lead = self.lead or (self.texts.pop(0) if self.texts else "")
-        words = find_words(self.heading) | find_plain_words(lead)
-        more_words = find_plain_words(" ".join(self.texts)) - words
-        return Section(self.level, self.anchor, self.heading, self.name, shorten(lead), " ".join(words),
-                       " ".join(more_words))
 
 
 class PageReader:
     """Goes through the tokens of a page and collects the texts between the boundaries of blocks."""
 
     def __init__(self):
-        self.title = ""
+        self.title, self.is_redirect = "", False
         self.block = ""  # what the block being read is
         self.data = []  # the pieces of its text
         self.part, self.part_tag, self.part_depth, self.part_start = "", "", 0, 0
@@ -102,6 +69,12 @@ class PageReader:
         self.outer = []  # the sections around lists, to which what follows a list belongs
 
     def read(self, html):
+        self.read_tokens(html)
+        self.end_block()
+        sections = [section.close() for section in self.sections]
+        return Page(self.title, sections[0].heading, sections, self.is_redirect)
+
+    def read_tokens(self, html):
         position = 0
         for token in TOKEN.finditer(html):
             if token.start() > position:
@@ -110,40 +83,36 @@ class PageReader:
             listing, name, attributes = token.groups()
             if name is None:
                 self.add_listing(listing)  # None of a comment
-                continue
-            name = name.lower()
-            if name == "/main":
-                break
-            if name[0] == "/":
-                self.end(name[1:])
-            elif attributes or name in READ_WITHOUT_ATTRIBUTES or self.part:
-                self.start(name, attributes)
-        else:
-            self.data.append(html[position:])
-        self.end_block()
-        return Page(self.title, self.sections[0].heading, [section.close() for section in self.sections])
+            elif name.lower() == "/main":
+                return
+            elif name[0] == "/":
+                self.end(name[1:].lower())
+            elif attributes or name.lower() in READ_WITHOUT_ATTRIBUTES or self.part:
+                self.start(name.lower(), attributes)
+        self.data.append(html[position:])
 
     def start(self, name, attributes):
         if self.part:
             self.part_depth += name == self.part_tag
             return
         part, anchor = read_traits(name, attributes)
-        if part == MAIN:
-            self.end_block()
-            self.start_over()
         if part in (SKIP, LISTING, NAME):
             self.part, self.part_tag, self.part_depth, self.part_start = part, name, 1, len(self.data)
         elif part or name in BLOCKS:
-            self.end_block()
-            self.block = part or KINDS.get(name, "")
-            self.start_block(name)
+            self.start_block(name, part)
         elif name == "br":
             self.data.append(" ")
         if anchor:
             self.anchor, self.anchor_at = anchor, len(self.data)
             self.row_anchor = anchor if name == "a" else self.row_anchor
 
-    def start_block(self, name):
+    def start_block(self, name, part):
+        self.end_block()
+        if part == MAIN:
+            self.start_over()
+        elif part == REDIRECT:
+            self.is_redirect = True
+        self.block = part or KINDS.get(name, "")
         if self.block in LEVELS:
             self.names = []
         if name == "dt":  # an anchor before it leads to the list

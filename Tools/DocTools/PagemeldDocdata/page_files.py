@@ -23,6 +23,7 @@ class PackedPage(NamedTuple):
     heading: str
     headings: tuple  # those of the sections, each once
     packed: bytes
+    is_redirect: bool
 
     def unpack(self):
         return pickle.loads(zlib.decompress(self.packed))
@@ -30,7 +31,8 @@ class PackedPage(NamedTuple):
 
 def pack(page):
     headings = tuple({section.heading: None for section in page.sections})
-    return PackedPage(page.title, page.heading, headings, zlib.compress(pickle.dumps(page.sections), 1))
+    return PackedPage(page.title, page.heading, headings, zlib.compress(pickle.dumps(page.sections), 1),
+                      page.is_redirect)
 
 
 def list_paths(directory, excluded):

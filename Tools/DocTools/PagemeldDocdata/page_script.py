@@ -1,14 +1,13 @@
-"""Puts the tag of the page script into pages, and the script beside the outputs."""
+"""Puts the tag of the page script into pages, and takes it out."""
 import os
 import re
 import shutil
 
-from markup import find_encoding
+from docdata_files import write_whole
+from markup import find_encoding, read_attributes
 
-HERE = os.path.dirname(os.path.realpath(__file__))
-# Where the program is installed, and in the sources.
-WEB_DIRECTORIES = (os.path.join(HERE, "..", "web"), os.path.join(HERE, "..", "..", "..", "web"))
-TAG = re.compile(r"""<script\b[^>]*\bsrc\s*=\s*["']?[^"'>]*\bdocdata/pagemeld\.js\b[^>]*>\s*</script\s*>""", re.I)
+EMPTY_SCRIPT = re.compile(r"<script\b([^>]*)>\s*</script\s*>", re.I)
+ADDRESS = re.compile(r"\bdocdata/pagemeld\.js\b", re.I)
 XHTML = re.compile(r"""\s*<\?xml\b|<html\b[^>]*\bxmlns\s*=""", re.I)
 # What decides on the place of the tag. Comments and scripts are matched whole, so that nothing in them counts.
 MARK = re.compile(r"""<!--.*?(?:-->|\Z) | <script\b.*?(?:</script\s*>|\Z)
@@ -36,8 +35,14 @@ def find_place(text):
     return None if XHTML.search(text[:2000]) else marks.get("/html", len(text))
 
 
+def is_tag(mark):
+    """Returns whether a match of MARK is the tag, also one that somebody wrote by hand."""
+    script = EMPTY_SCRIPT.fullmatch(mark[0])
+    return bool(script and ADDRESS.search(read_attributes(script[1]).get("src", "")))
+
+
 def has_tag(text):
-    return "pagemeld.js" in text and any(TAG.fullmatch(mark[0]) for mark in MARK.finditer(text))
+    return "pagemeld.js" in text and any(map(is_tag, MARK.finditer(text)))
 
 
 def put_tag(text, tag):
@@ -49,7 +54,7 @@ def put_tag(text, tag):
 
 def take_tags(text):
     """Returns text without tags of the page script."""
-    return MARK.sub(lambda mark: "" if TAG.fullmatch(mark[0]) else mark[0], text)
+    return MARK.sub(lambda mark: "" if is_tag(mark) else mark[0], text)
 
 
 def change_page(data, change):
@@ -63,12 +68,14 @@ def change_page(data, change):
 
 
 def write_page(file, data):
-    """Writes a page by a temporary file, so that it is there whole or as it was. A link stays a link."""
+    """Writes a page that keeps its mode. A link stays a link."""
     file = os.path.realpath(file)
-    with open(file + ".tmp", "wb") as stream:
-        stream.write(data)
-    shutil.copymode(file, file + ".tmp")
-    os.replace(file + ".tmp", file)
+
+    def write(temporary):
+        with open(temporary, "wb") as stream:
+            stream.write(data)
+        shutil.copymode(file, temporary)
+    write_whole(file, write)
 
 
 def add_to_page(directory, path, data):
@@ -87,23 +94,3 @@ def remove_from_page(directory, path):
     changed = change_page(data, lambda text, _: take_tags(text))
     if changed != data:
         write_page(file, changed)
-
-
-def list_web_files():
-    directory = next(filter(os.path.isdir, WEB_DIRECTORIES))
-    return [entry.path for entry in os.scandir(directory) if entry.name.endswith((".js", ".css"))]
-
-
-def copy_script(docdata):
-    """Copies the page script into the directory docdata."""
-    for file in list_web_files():
-        copy = os.path.join(docdata, os.path.basename(file))
-        shutil.copyfile(file, copy + ".tmp")
-        os.replace(copy + ".tmp", copy)
-
-
-def remove_script(docdata):
-    for file in list_web_files():
-        copy = os.path.join(docdata, os.path.basename(file))
-        if os.path.exists(copy):
-            os.remove(copy)
