@@ -114,15 +114,19 @@ TEST(PagemeldCheck, LooksAtTextsAsTheScriptsHoldThem)
 @/b/Manual/docdata/toc.json:1:97: warning: link "File:a" gets the module's prefix, and is dead unless a file has that name, which --targets checks [prefixed-url] /children/1/link
 2 modules, 0 errors, 3 warnings, status 0)"},
         {"CHECK @/a @/b # Files are UTF-8 to the end",
-         {{"a/Manual/docdata/index.json", Index("[\"p.html\",\"\303\251\"]")},
+         {{"a/Manual/docdata/index.json",
+           Index("[\"p.html\",\"\303\251\"]",
+                 R"("info":[["\ud83d\uDE00\\udc00",0]],"common":{},"searchIndex":{})")},
           {"a/Manual/docdata/toc.json",
            std::string("{\"link\":\"toc\",\"title\":\"toc\",\"children\":[]}\000", 43)},
-          {"b/Manual/docdata/index.json", Index("[\"p.html\",\"\351\351\"]")},
+          {"b/Manual/docdata/index.json",
+           Index("[\"p.html\",\"\351\351\"]", R"("info":[["\\\uDC00",0]],"common":{},"searchIndex":{})")},
           {"b/Manual/docdata/toc.json",
            std::string("{\"link\":\"toc\",\"title\":\"toc\",\"children\":[]}\000\351", 44)}},
          R"(@/b/Manual/docdata/index.json:1:22: warning: byte \xE9 is not UTF-8: readers see a replacement character [invalid-utf8]
+@/b/Manual/docdata/index.json:1:40: warning: half of a surrogate pair: readers see replacement characters, and other programs may refuse the JSON outputs; write both halves or neither [invalid-utf8]
 @/b/Manual/docdata/toc.json:1:43: warning: a NUL byte ends the text; bytes after it that are not seen: 1 [text-after-nul]
-2 modules, 0 errors, 2 warnings, status 0)"},
+2 modules, 0 errors, 3 warnings, status 0)"},
     });
 }
 
@@ -195,10 +199,10 @@ TEST(PagemeldCheck, MergesContentsAsARunDoes)
           {"c/Manual/docdata/index.json", Index("")},
           {"c/Manual/docdata/toc.json",
            Toc(R"({"link":"null","title":"G","children":[{"link":"s","title":"S","children":null}]})")}},
-         R"(@/b/Manual/docdata/toc.json:1:41: warning: "a" has the same entry, "O" with the link "o": in the contents it leads to the page of "a", and not to this module's [shadowed-entry] /children/0
-@/b/Manual/docdata/toc.json:1:241: warning: "a" has the same entry, "Q" with the link "q\x00": in the contents it leads to the page of "a", and not to this module's [shadowed-entry] /children/2/children/1
+         R"(@/b/Manual/docdata/toc.json:1:41: warning: @/a has the same entry, "O" with the link "o": in the contents it leads to the page of that module, and not to this one's [shadowed-entry] /children/0
+@/b/Manual/docdata/toc.json:1:241: warning: @/a has the same entry, "Q" with the link "q\x00": in the contents it leads to the page of that module, and not to this one's [shadowed-entry] /children/2/children/1
 @/b/Manual/docdata/toc.json:1:249: warning: link "q\x00" is "q" in global_toc.js: readers are led there [script-altered] /children/2/children/1/link
-@/c/Manual/docdata/toc.json:1:80: warning: "b" has the same entry, "S" with the link "s": in the contents it leads to the page of "b", and not to this module's [shadowed-entry] /children/0/children/0
+@/c/Manual/docdata/toc.json:1:80: warning: @/b has the same entry, "S" with the link "s": in the contents it leads to the page of that module, and not to this one's [shadowed-entry] /children/0/children/0
 3 modules, 0 errors, 4 warnings, status 0)"},
     });
 }

@@ -2,10 +2,14 @@
 
 #include <gtest/gtest.h>
 
+#include <unistd.h>
+
 TEST(PagemeldCheck, SaysWhatKeepsARunFromWriting)
 {
     ExpectReports({
         {"mkfifo b/Manual/docdata/global_toc.json.tmp; ln -s /dev/null c/Manual/docdata/global_toc.js.tmp; "
+         "python3 -c 'import socket; "
+         "socket.socket(socket.AF_UNIX).bind(\"c/Manual/docdata/global_toc.json.tmp\")'; "
          "CHECK @/a @/b @/c # Nothing keeps outputs from being written",
          {{"b/Manual/docdata/global_toc.js", kDirectory},
           {"b/Manual/docdata/global_index.js.tmp", kDirectory},
@@ -25,8 +29,9 @@ TEST(PagemeldCheck, SaysWhatKeepsARunFromWriting)
 @/c/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
 @/c/Manual/docdata/global_index.js.tmp: error: a link that leads back to itself is in the place of the temporary file: a run that came so far would end here with status 255 [output-blocked]
 @/c/Manual/docdata/global_toc.js.tmp: error: a device is in the place of the temporary file: the run writes into it, and it becomes the output: readers get nothing [output-blocked]
+@/c/Manual/docdata/global_toc.json.tmp: error: a socket is in the place of the temporary file: the run keeps the old output [output-blocked]
 @/c/ScriptReference/docdata: error: is missing: a run that came so far would end here with status 255 [output-blocked]
-3 modules, 8 errors, 0 warnings, status 1)"},
+3 modules, 9 errors, 0 warnings, status 1)"},
         {"cd a/Manual/docdata; chmod 0 index.json; chmod 500 .; cd @; chmod 400 b/Manual/docdata/*.tmp; "
          "chmod 0 c/Manual/docdata; AS_USER CHECK @/a @/b @/c # What a user may not read or write",
          {{"b/Manual/docdata/global_index.js.tmp", ""}, {"c/Manual/docdata", kDirectory}},
@@ -37,6 +42,25 @@ TEST(PagemeldCheck, SaysWhatKeepsARunFromWriting)
 @/c/Manual/docdata/index.json: error: can't be reached: permission denied; "c" will be missing from the search of Manual [unreadable]
 @/c/Manual/docdata/toc.json: error: can't be reached: permission denied; "c" will be missing from the contents of Manual [unreadable]
 3 modules, 6 errors, 0 warnings; missing from the search of Manual: a, c; from its contents: c, status 1)"},
+    });
+}
+
+TEST(PagemeldCheck, SaysWhatAnotherUserReservesInAStickyDirectory)
+{
+    if (::geteuid() != 0)
+    {
+        GTEST_SKIP() << "only root can make files of two users";
+    }
+    ExpectReports({
+        {"chmod 755 @; chmod 1777 */Manual/docdata; chmod 666 */Manual/docdata/*; chown 1 a/Manual/docdata "
+         "*/Manual/docdata/global*; chown 2 b/Manual/docdata; setpriv --reuid=2 --clear-groups "
+         "CHECK @/a @/b # Its owner may replace all that is in it",
+         {{"a/Manual/docdata/global_index.js", ""},
+          {"a/Manual/docdata/global_toc.js.tmp", ""},
+          {"b/Manual/docdata/global_toc.js", ""}},
+         R"(@/a/Manual/docdata/global_index.js: error: the output of another user in a sticky directory can't be replaced: the new one stays as .tmp [output-blocked]
+@/a/Manual/docdata/global_toc.js.tmp: error: the temporary file of another user in a sticky directory can't be renamed: the run keeps the old output [output-blocked]
+2 modules, 2 errors, 0 warnings, status 1)"},
     });
 }
 

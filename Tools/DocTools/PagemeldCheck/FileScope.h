@@ -27,6 +27,7 @@ struct FileScope
 {
     ModuleFile file;
     Input input;
+    const std::string& root;       ///< of the module, as typed
     const std::string& moduleName; ///< as messages show it
     const ModulePath& directory;   ///< which page paths and links are relative to
     const CheckOptions& options;

@@ -19,10 +19,31 @@ namespace
 
 using rapidjson::Value;
 
+constexpr std::size_t kNone = std::string_view::npos;
+
 /// Whether an entry of pages has the form that only the combined index has: a third element, the module.
 bool IsMergedPage(const Value& entry)
 {
     return entry.IsArray() && entry.Size() == 3 && entry[2].IsInt();
+}
+
+/// Whether the text at an escape begins that of half a surrogate pair: with "\\ud", and one of the digits.
+bool IsHalf(std::string_view text, std::string_view digits)
+{
+    const std::string_view start = text.substr(1, 2);
+    return (start == "ud" || start == "uD") && text.substr(3, 1).find_first_of(digits) == 0;
+}
+
+/// Returns the position of a second half without a first one, or npos. The parser takes it, though not a
+/// first half without a second, and the outputs hold bytes for it that are not UTF-8.
+std::size_t FindLoneHalf(std::string_view text)
+{
+    std::size_t i = text.find('\\');
+    while (i != kNone && !IsHalf(text.substr(i), "cdefCDEF"))
+    {
+        i = text.find('\\', i + (IsHalf(text.substr(i), "89abAB") ? 12 : 2));
+    }
+    return i;
 }
 
 std::set<std::string> NamesOf(const Value& object)
@@ -50,11 +71,19 @@ public:
     void CheckBytes(std::string_view seen, std::size_t size)
     {
         const std::size_t invalid = FindInvalidUtf8(seen);
-        if (invalid != std::string_view::npos)
+        if (invalid != kNone)
         {
             m_findings.AddAtOffset(Rule::InvalidUtf8, invalid,
                                    "byte " + Visible(seen.substr(invalid, 1)) +
                                        " is not UTF-8: readers see a replacement character");
+        }
+        const std::size_t half = FindLoneHalf(seen);
+        if (half != kNone)
+        {
+            m_findings.AddAtOffset(
+                Rule::InvalidUtf8, half,
+                "half of a surrogate pair: readers see replacement characters, and "
+                "other programs may refuse the JSON outputs; write both halves or neither");
         }
         if (seen.size() + 1 < size)
         {

@@ -44,12 +44,12 @@ std::uint64_t WayTo(std::uint64_t parent, const Value& node)
 
 void MergedContents::Merge(const Value& toc, const FileScope& scope, FileFindings& findings)
 {
-    const Source source = {static_cast<std::uint32_t>(m_moduleNames.size()), scope, findings};
+    const Source source = {static_cast<std::uint32_t>(m_roots.size()), scope, findings};
     const std::uint64_t way = WayTo(0, toc);
     const std::uint32_t root = m_entries.empty() ? Add(way, source.module) : Find(way);
     if (root != PositionTable::kNotFound)
     {
-        m_moduleNames.push_back(scope.moduleName);
+        m_roots.push_back(scope.root);
         MergeChildren(source, toc, JsonPointer(), root, false);
     }
 }
@@ -107,9 +107,9 @@ void MergedContents::Report(const Source& source, const Value& node, const JsonP
         [&]
         {
             const std::size_t quoteSize = source.scope.options.quoteSize;
-            const std::string& name = m_moduleNames[winner.module];
-            return name + " has the same entry, " + Quoted(BytesOf(*FindMember(node, "title")), quoteSize) +
-                   " with the link " + Quoted(BytesOf(*FindMember(node, "link")), quoteSize) +
-                   ": in the contents it leads to the page of " + name + ", and not to this module's";
+            return Visible(m_roots[winner.module]) + " has the same entry, " +
+                   Quoted(BytesOf(*FindMember(node, "title")), quoteSize) + " with the link " +
+                   Quoted(BytesOf(*FindMember(node, "link")), quoteSize) +
+                   ": in the contents it leads to the page of that module, and not to this one's";
         });
 }

@@ -24,7 +24,7 @@ private:
     struct Entry
     {
         std::uint64_t way;    ///< what leads to it: the hash of the links and titles from the root down
-        std::uint32_t module; ///< the first that has it, a position in the list of names
+        std::uint32_t module; ///< the first that has it, a position in the list of roots
         bool hasList;         ///< whether its children are a list
     };
 
@@ -43,7 +43,7 @@ private:
     void Report(const Source& source, const rapidjson::Value& node, const JsonPointer& pointer,
                 const Entry& winner) const;
 
-    std::vector<std::string> m_moduleNames;
+    std::vector<std::string> m_roots;
     std::vector<Entry> m_entries;
     PositionTable m_positions;
 };

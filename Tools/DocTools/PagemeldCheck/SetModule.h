@@ -30,7 +30,7 @@ struct SetModule
     /// Returns what the check of an input needs. The module must outlive it.
     [[nodiscard]] FileScope ScopeOf(Input input) const
     {
-        return {File(path.PathOf(input)), input, name, path, options};
+        return {File(path.PathOf(input)), input, root, name, path, options};
     }
 
     InputFacts& FactsOf(Input input) { return input == Input::Index ? index : toc; }

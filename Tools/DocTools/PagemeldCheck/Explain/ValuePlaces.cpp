@@ -26,43 +26,32 @@ struct SoughtValue
     ValuePlace* place;
 };
 
+SizeType CountChildren(const Value& value)
+{
+    return value.IsArray() ? value.Size() : value.IsObject() ? value.MemberCount() : 0;
+}
+
+/// An array or object that a walk over a document has come to.
 struct OpenValue
 {
     const Value* value;
     SizeType nextChild;
 };
 
-SizeType CountChildren(const Value& value)
+/// Returns the next value in document order, or null after the last.
+const Value* TakeNext(std::vector<OpenValue>& open)
 {
-    return value.IsArray() ? value.Size() : value.IsObject() ? value.MemberCount() : 0;
-}
-
-const Value& ChildAt(const Value& value, SizeType i)
-{
-    return value.IsArray() ? value[i] : (value.MemberBegin() + i)->value;
-}
-
-/// Calls visit with every value of the document, in document order.
-template <typename Visit>
-void VisitValues(const Value& document, const Visit& visit)
-{
-    visit(document);
-    std::vector<OpenValue> open = {{&document, 0}};
-    while (!open.empty())
+    while (!open.empty() && open.back().nextChild == CountChildren(*open.back().value))
     {
-        OpenValue& top = open.back();
-        if (top.nextChild == CountChildren(*top.value))
-        {
-            open.pop_back();
-            continue;
-        }
-        const Value& child = ChildAt(*top.value, top.nextChild++);
-        visit(child);
-        if (child.IsArray() || child.IsObject())
-        {
-            open.push_back({&child, 0});
-        }
+        open.pop_back();
     }
+    if (open.empty())
+    {
+        return nullptr;
+    }
+    const Value& parent = *open.back().value;
+    const SizeType i = open.back().nextChild++;
+    return parent.IsArray() ? &parent[i] : &(parent.MemberBegin() + i)->value;
 }
 
 using PlaceTable = std::unordered_map<const Value*, ValuePlace>;
@@ -71,17 +60,21 @@ using PlaceTable = std::unordered_map<const Value*, ValuePlace>;
 std::vector<SoughtValue> NumberValues(const Value& document, PlaceTable& places)
 {
     std::vector<SoughtValue> sought;
-    std::size_t number = 0;
-    VisitValues(document,
-                [&](const Value& value)
-                {
-                    const auto found = places.find(&value);
-                    if (found != places.end())
-                    {
-                        sought.push_back({number, &found->second});
-                    }
-                    ++number;
-                });
+    std::vector<OpenValue> open;
+    const Value* value = &document;
+    for (std::size_t number = 0; value != nullptr && sought.size() < places.size(); ++number)
+    {
+        const auto found = places.find(value);
+        if (found != places.end())
+        {
+            sought.push_back({number, &found->second});
+        }
+        if (CountChildren(*value) > 0)
+        {
+            open.push_back({value, 0});
+        }
+        value = TakeNext(open);
+    }
     return sought;
 }
 
@@ -146,11 +139,14 @@ void FindOffsets(const char* text, const std::vector<SoughtValue>& sought)
 /// Moves the place on to a later byte of the text.
 void MoveTo(ValuePlace& place, const char* text, std::size_t offset)
 {
-    const std::string_view passed(text + place.offset, offset - place.offset);
-    const std::size_t lineEnd = passed.rfind('\n');
-    place.line += static_cast<std::size_t>(std::count(passed.begin(), passed.end(), '\n'));
-    place.column = lineEnd == std::string_view::npos ? place.column + passed.size() : passed.size() - lineEnd;
-    place.offset = offset;
+    const std::string_view reached(text, offset);
+    std::size_t lineEnd = reached.find('\n', place.offset);
+    while (lineEnd != std::string_view::npos)
+    {
+        place = {lineEnd + 1, place.line + 1, 1};
+        lineEnd = reached.find('\n', place.offset);
+    }
+    place = {offset, place.line, place.column + offset - place.offset};
 }
 
 } // namespace

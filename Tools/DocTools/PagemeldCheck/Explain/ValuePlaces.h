@@ -16,8 +16,8 @@ struct ValuePlace
 /// Returns the place of the first byte of each value, in the order of values, which may name a value twice.
 ///
 /// text is NUL-terminated and document what ParseJson made of it, unchanged since; each value is the document
-/// or somewhere in it. Takes one pass over the document and one over the text up to the last of the values,
-/// and memory for the values asked for, the open brackets and the longest string.
+/// or somewhere in it. Takes one pass over the document and one over the text, both up to the last of the
+/// values, and memory for the values asked for, the open brackets and the longest string.
 [[nodiscard]] std::vector<ValuePlace> LocateValues(const char* text, const rapidjson::Value& document,
                                                    const std::vector<const rapidjson::Value*>& values);
 
