@@ -38,7 +38,7 @@ Manual: error: no module has a sound toc.json: nothing will be written [nothing-
          R"(@/a/Manual/docdata/index.json:2:11: error: not JSON: there is a comma before the closing bracket; refused at byte 23, at "]}"; "a" will be missing from the search of Manual [not-json]
 @/a/Manual/docdata/toc.json:1:1: error: not JSON: the file begins with a byte order mark: save it without; refused at byte 0, at "\uFEFF{}"; "a" will be missing from the contents of Manual [not-json]
 @/b/Manual/docdata/index.json:1:2: error: not JSON: strings need double quotes; refused at byte 1, at "'pages':[]}"; "b" will be missing from the search of Manual [not-json]
-@/b/Manual/docdata/toc.json:1:11: error: not JSON: a backslash in a string must be doubled; in a title or path, use another character; refused at byte 10, at "\\q\"}"; "b" will be missing from the contents of Manual [not-json]
+@/b/Manual/docdata/toc.json:1:11: error: not JSON: every backslash that is meant as one must be doubled; in a title or path, use another character; refused at byte 10, at "\\q\"}"; "b" will be missing from the contents of Manual [not-json]
 @/c/Manual/docdata/toc.json:1:1: error: not JSON: the file is empty; refused at byte 0, at the end of the text; "c" will be missing from the contents of Manual [not-json]
 Manual: error: no module has a sound toc.json: nothing will be written [nothing-to-combine]
 3 modules, 6 errors, 0 warnings; missing from the search of Manual: a, b; from its contents: a, b, c, status 1)"},
@@ -58,13 +58,13 @@ Manual: error: no module has a sound index.json: nothing will be written [nothin
          R"(@/b/Manual/docdata/index.json:1:21: error: page entry is an array of 0, not [path, title]; "b" will be missing from the search of Manual [structure] /pages/1
 @/b/Manual/docdata/index.json:1:24: error: page path or title is 7, not a string; "b" will be missing from the search of Manual [structure] /pages/2
 @/b/Manual/docdata/index.json:1:32: error: page entry is an array of 3, not [path, title]; "b" will be missing from the search of Manual [structure] /pages/3
-@/b/Manual/docdata/index.json:1:63: error: page number 4, but there are 4 pages; "b" will be missing from the search of Manual [structure] /info/1
-@/b/Manual/docdata/index.json:1:71: error: page number -1, but there are 4 pages; "b" will be missing from the search of Manual [structure] /info/2
+@/b/Manual/docdata/index.json:1:63: error: page number 4, but there are 4 pages, numbered from 0; "b" will be missing from the search of Manual [structure] /info/1
+@/b/Manual/docdata/index.json:1:71: error: page number -1, but there are 4 pages, numbered from 0; "b" will be missing from the search of Manual [structure] /info/2
 @/b/Manual/docdata/index.json:1:80: error: page number is "x", not a 32-bit integer; "b" will be missing from the search of Manual [structure] /info/3
 @/b/Manual/docdata/index.json:1:90: error: text is 1, not a string; "b" will be missing from the search of Manual [structure] /info/4
 @/b/Manual/docdata/index.json:1:117: error: common word has the value 2, not 1; "b" will be missing from the search of Manual [structure] /common/b
 @/b/Manual/docdata/index.json:1:141: error: term has an object of 0, not an array of info numbers; "b" will be missing from the search of Manual [structure] /searchIndex/a~1b
-@/b/Manual/docdata/index.json:1:151: error: info number 5, but there are 5 infos; "b" will be missing from the search of Manual [structure] /searchIndex/t/1
+@/b/Manual/docdata/index.json:1:151: error: info number 5, but there are 5 infos, numbered from 0; "b" will be missing from the search of Manual [structure] /searchIndex/t/1
 @/b/Manual/docdata/index.json: error: 1 more of this rule; --limit=0 shows all [structure]
 @/b/Manual/docdata/toc.json:1:1: error: "title" is missing; it must be a string; "b" will be missing from the contents of Manual [structure]
 @/b/Manual/docdata/toc.json:1:9: error: "link" is 7, not a string; "b" will be missing from the contents of Manual [structure] /link

@@ -21,13 +21,6 @@
 namespace
 {
 
-using FileId = std::pair<dev_t, ino_t>;
-
-FileId IdOf(const FileStatus& status)
-{
-    return {status.Details().st_dev, status.Details().st_ino};
-}
-
 bool IsInput(std::string_view name)
 {
     return std::any_of(std::begin(kInputs), std::end(kInputs),
@@ -56,7 +49,7 @@ public:
     {
         for (const std::string& root : taken)
         {
-            m_taken.insert(IdOf(FileStatus::Of(root)));
+            m_taken.insert(FileStatus::Of(root).Id());
         }
     }
 
@@ -170,7 +163,7 @@ private:
     /// Whether a module is at path and not taken under any name.
     [[nodiscard]] bool IsMissed(const std::string& path) const
     {
-        return IsModule(path) && m_taken.count(IdOf(FileStatus::Of(path))) == 0;
+        return IsModule(path) && m_taken.count(FileStatus::Of(path).Id()) == 0;
     }
 
     void Add(const std::string& path, std::string message)
@@ -178,7 +171,7 @@ private:
         m_report.Add(Finding::OfRun(Rule::PassedOver, path, std::move(message)));
     }
 
-    std::set<FileId> m_taken;
+    std::set<std::pair<dev_t, ino_t>> m_taken;
     Report& m_report;
 };
 

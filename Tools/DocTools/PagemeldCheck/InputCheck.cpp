@@ -103,7 +103,7 @@ public:
     bool CheckStructure()
     {
         bool isSound = true;
-        CheckTopMembers(m_document, m_scope.input, m_findings);
+        CheckTopMembers(m_document, m_findings);
         const auto onFault = [&](const FoundFault& found)
         {
             isSound = false;
@@ -128,15 +128,15 @@ public:
         if (m_scope.input == Input::Index)
         {
             facts.commonWords = NamesOf(*FindMember(m_document, "common"));
-            CheckIndexTexts(m_document, m_scope, m_findings);
-            CheckWords(m_document, !earlier.hasCommonWords, m_scope, m_findings);
+            CheckIndexTexts(m_document, m_findings);
+            CheckWords(m_document, !earlier.hasCommonWords, m_findings);
             earlier.hasCommonWords |= !facts.commonWords.empty();
             return facts;
         }
         facts.rootLink = CStringOf(*FindMember(m_document, "link"));
         facts.rootTitle = CStringOf(*FindMember(m_document, "title"));
-        CheckTocTexts(m_document, m_scope, m_findings);
-        earlier.contents.Merge(m_document, m_scope, m_findings);
+        CheckTocTexts(m_document, m_findings);
+        earlier.contents.Merge(m_document, m_findings);
         return facts;
     }
 

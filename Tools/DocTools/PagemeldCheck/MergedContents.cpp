@@ -1,6 +1,5 @@
 #include "Tools/DocTools/PagemeldCheck/MergedContents.h"
 
-#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/Merge/SipHash.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 
@@ -42,14 +41,14 @@ std::uint64_t WayTo(std::uint64_t parent, const Value& node)
 
 } // namespace
 
-void MergedContents::Merge(const Value& toc, const FileScope& scope, FileFindings& findings)
+void MergedContents::Merge(const Value& toc, FileFindings& findings)
 {
-    const Source source = {static_cast<std::uint32_t>(m_roots.size()), scope, findings};
+    const Source source = {static_cast<std::uint32_t>(m_roots.size()), findings};
     const std::uint64_t way = WayTo(0, toc);
     const std::uint32_t root = m_entries.empty() ? Add(way, source.module) : Find(way);
     if (root != PositionTable::kNotFound)
     {
-        m_roots.push_back(scope.root);
+        m_roots.push_back(findings.Scope().root);
         MergeChildren(source, toc, JsonPointer(), root, false);
     }
 }
@@ -106,10 +105,9 @@ void MergedContents::Report(const Source& source, const Value& node, const JsonP
         Rule::ShadowedEntry, node, pointer,
         [&]
         {
-            const std::size_t quoteSize = source.scope.options.quoteSize;
             return Visible(m_roots[winner.module]) + " has the same entry, " +
-                   Quoted(BytesOf(*FindMember(node, "title")), quoteSize) + " with the link " +
-                   Quoted(BytesOf(*FindMember(node, "link")), quoteSize) +
+                   source.findings.Quote(BytesOf(*FindMember(node, "title"))) + " with the link " +
+                   source.findings.Quote(BytesOf(*FindMember(node, "link"))) +
                    ": in the contents it leads to the page of that module, and not to this one's";
         });
 }

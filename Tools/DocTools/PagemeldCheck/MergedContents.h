@@ -18,7 +18,7 @@ public:
     /// Reports the topmost of its entries that have a page and become one with an entry of an earlier module.
     /// Those below stay unmentioned. Entries that a module has twice itself are no loss: their children are
     /// joined.
-    void Merge(const rapidjson::Value& toc, const FileScope& scope, FileFindings& findings);
+    void Merge(const rapidjson::Value& toc, FileFindings& findings);
 
 private:
     struct Entry
@@ -32,7 +32,6 @@ private:
     struct Source
     {
         std::uint32_t module;
-        const FileScope& scope;
         FileFindings& findings;
     };
 

@@ -1,7 +1,6 @@
 #include "Tools/DocTools/PagemeldCheck/NameCheck.h"
 
 #include "Tools/DocTools/PagemeldCheck/ByteSet.h"
-#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 
 #include <algorithm>
@@ -53,7 +52,7 @@ void CheckCommonWords(const Value& words, bool count, FileFindings& findings)
     }
 }
 
-void CheckTerms(const Value& terms, const FileScope& scope, FileFindings& findings)
+void CheckTerms(const Value& terms, FileFindings& findings)
 {
     const JsonPointer root;
     const JsonPointer searchIndex(root, "searchIndex");
@@ -80,7 +79,7 @@ void CheckTerms(const Value& terms, const FileScope& scope, FileFindings& findin
             {
                 return "terms that readers can't find by the whole word, since words are looked up as "
                        "letters, digits and _ in lower case: " +
-                       std::to_string(unfound) + ", first " + Quoted(term, scope.options.quoteSize);
+                       std::to_string(unfound) + ", first " + findings.Quote(term);
             });
     }
 }
@@ -103,13 +102,13 @@ void ReportSecond(const Value& object, const char* name, FileFindings& findings)
 
 } // namespace
 
-void CheckTopMembers(const Value& document, Input input, FileFindings& findings)
+void CheckTopMembers(const Value& document, FileFindings& findings)
 {
     if (!document.IsObject())
     {
         return;
     }
-    const std::vector<const char*> names = input == Input::Index
+    const std::vector<const char*> names = findings.Scope().input == Input::Index
                                                ? std::vector{"pages", "info", "common", "searchIndex"}
                                                : std::vector{"link", "title", "children"};
     for (const char* name : names)
@@ -118,8 +117,8 @@ void CheckTopMembers(const Value& document, Input input, FileFindings& findings)
     }
 }
 
-void CheckWords(const Value& index, bool commonWordsCount, const FileScope& scope, FileFindings& findings)
+void CheckWords(const Value& index, bool commonWordsCount, FileFindings& findings)
 {
     CheckCommonWords(*FindMember(index, "common"), commonWordsCount, findings);
-    CheckTerms(*FindMember(index, "searchIndex"), scope, findings);
+    CheckTerms(*FindMember(index, "searchIndex"), findings);
 }

@@ -53,8 +53,7 @@ public:
         {
             return "";
         }
-        const auto [known, isNew] =
-            m_paths.try_emplace({status.Details().st_dev, status.Details().st_ino}, path);
+        const auto [known, isNew] = m_paths.try_emplace(status.Id(), path);
         return isNew ? "" : Visible(known->second);
     }
 

@@ -1,10 +1,8 @@
 #include "Tools/DocTools/PagemeldCheck/TargetCheck.h"
 
 #include "Tools/DocTools/PagemeldCheck/Browse/WebPath.h"
-#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 #include "Tools/DocTools/VantorPagemeld/System/DirectoryListing.h"
-#include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
 
 #include <algorithm>
 #include <vector>
@@ -27,10 +25,9 @@ bool IsPage(std::string_view name)
     return end == ".html" || end == ".htm";
 }
 
-std::pair<dev_t, ino_t> IdOf(const std::string& path)
+bool IsFile(const FileStatus& status)
 {
-    const FileStatus status = FileStatus::Of(path);
-    return {status.Details().st_dev, status.Details().st_ino};
+    return status.Exists() && !status.IsDirectory();
 }
 
 /// Calls visit with the path of every HTML file below a directory. Takes no hidden names and follows no links
@@ -67,31 +64,32 @@ void VisitPages(const std::string& directory, const Visit& visit)
 void TargetCheck::Check(const char* name, const rapidjson::Value& link, const JsonPointer& pointer,
                         std::string_view path)
 {
-    if (!m_scope.options.checksTargets)
+    if (!m_findings.Scope().options.checksTargets)
     {
         return;
     }
     const std::string problem = ProblemOf(path);
     if (!problem.empty())
     {
-        m_findings.AddAtValue(Rule::MissingTarget, link, pointer,
-                              [&] { return std::string(name) + " " + Quote(BytesOf(link)) + " " + problem; });
+        m_findings.AddAtValue(
+            Rule::MissingTarget, link, pointer,
+            [&] { return std::string(name) + " " + m_findings.Quote(BytesOf(link)) + " " + problem; });
     }
 }
 
 void TargetCheck::ReportUnreached()
 {
-    if (!m_scope.options.checksTargets)
+    if (!m_findings.Scope().options.checksTargets)
     {
         return;
     }
     std::string first;
     std::size_t count = 0;
-    const std::string& directory = m_scope.directory.Text();
+    const std::string& directory = m_findings.Scope().directory.Text();
     VisitPages(directory,
                [&](const std::string& path)
                {
-                   if (m_reached.count(IdOf(path)) == 0 && count++ == 0)
+                   if (m_reached.count(FileStatus::Of(path).Id()) == 0 && count++ == 0)
                    {
                        first = path.substr(directory.size() + 1);
                    }
@@ -100,7 +98,7 @@ void TargetCheck::ReportUnreached()
     {
         m_findings.Add(Rule::UnlistedPage,
                        "pages of the set without an entry, which the search does not find: " +
-                           std::to_string(count) + ", first " + Quote(first));
+                           std::to_string(count) + ", first " + m_findings.Quote(first));
     }
 }
 
@@ -111,36 +109,31 @@ std::string TargetCheck::ProblemOf(std::string_view path)
     const std::string inUrl = NameInUrl(path);
     if (Reach(file))
     {
-        return inUrl == file ? ""
-                             : "leads to " + Quote(inUrl) + " without the page script, which encodes names";
+        return inUrl == file
+                   ? ""
+                   : "leads to " + m_findings.Quote(inUrl) + " without the page script, which encodes names";
     }
     const std::string lost = "leads to no file: ";
-    if (IsFile(inUrl))
+    if (IsFile(StatusOf(inUrl)))
     {
-        return lost + "the page script asks for " + Quote(PercentEncoded(file)) + "; the file is " +
-               Quote(inUrl);
+        return lost + "the page script asks for " + m_findings.Quote(PercentEncoded(file)) +
+               "; the file is " + m_findings.Quote(inUrl);
     }
-    return lost + (IsFile(path) ? "\"#\" ends its name; rename it" : "the link is dead");
+    return lost + (IsFile(StatusOf(path)) ? "\"#\" ends its name; rename it" : "the link is dead");
 }
 
 bool TargetCheck::Reach(std::string_view name)
 {
-    const bool isFile = IsFile(name);
-    if (isFile)
+    const FileStatus status = StatusOf(name);
+    if (IsFile(status))
     {
-        m_reached.insert(IdOf(m_scope.directory.File(std::string(name))));
+        m_reached.insert(status.Id());
     }
-    return isFile;
+    return IsFile(status);
 }
 
-/// Whether a file has the name below the set's directory.
-bool TargetCheck::IsFile(std::string_view name) const
+/// Returns what is at the name below the set's directory.
+FileStatus TargetCheck::StatusOf(std::string_view name) const
 {
-    const FileStatus status = FileStatus::Of(m_scope.directory.File(std::string(name)));
-    return status.Exists() && !status.IsDirectory();
-}
-
-std::string TargetCheck::Quote(std::string_view text) const
-{
-    return Quoted(text, m_scope.options.quoteSize);
+    return FileStatus::Of(m_findings.Scope().directory.File(std::string(name)));
 }

@@ -1,19 +1,18 @@
 #pragma once
 
 #include "Tools/DocTools/PagemeldCheck/Report/FileFindings.h"
+#include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
 
 #include <set>
 #include <string>
 #include <string_view>
 #include <utility>
 
-#include <sys/types.h>
-
 /// Checks where the page paths and links of one file lead, if that is asked for.
 class TargetCheck
 {
 public:
-    TargetCheck(const FileScope& scope, FileFindings& findings) : m_scope(scope), m_findings(findings) {}
+    explicit TargetCheck(FileFindings& findings) : m_findings(findings) {}
 
     /// Checks a page path or link, called by name, that the scripts hold as path.
     void Check(const char* name, const rapidjson::Value& link, const JsonPointer& pointer,
@@ -25,10 +24,8 @@ public:
 private:
     [[nodiscard]] std::string ProblemOf(std::string_view path);
     [[nodiscard]] bool Reach(std::string_view name);
-    [[nodiscard]] bool IsFile(std::string_view name) const;
-    [[nodiscard]] std::string Quote(std::string_view text) const;
+    [[nodiscard]] FileStatus StatusOf(std::string_view name) const;
 
-    const FileScope& m_scope;
     FileFindings& m_findings;
     std::set<std::pair<dev_t, ino_t>> m_reached; ///< files, by device and number
 };

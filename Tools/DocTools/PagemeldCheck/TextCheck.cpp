@@ -3,7 +3,6 @@
 #include "Tools/DocTools/PagemeldCheck/Browse/ScriptLiteral.h"
 #include "Tools/DocTools/PagemeldCheck/Browse/WebPath.h"
 #include "Tools/DocTools/PagemeldCheck/ByteSet.h"
-#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/PagemeldCheck/TargetCheck.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 #include "Tools/DocTools/VantorPagemeld/Render/TextBuffer.h"
@@ -24,11 +23,8 @@ enum class TextKind
 class TextCheck
 {
 public:
-    TextCheck(Output script, const FileScope& scope, FileFindings& findings)
-        : m_script(RowOf(kOutputs, script).name),
-          m_scope(scope),
-          m_findings(findings),
-          m_targets(scope, findings)
+    TextCheck(Output script, FileFindings& findings)
+        : m_script(RowOf(kOutputs, script).name), m_findings(findings), m_targets(findings)
     {
     }
 
@@ -46,8 +42,8 @@ public:
         std::optional<std::string> value = ValueOfScriptLiteral(LiteralOf(kind, text));
         const auto named = [&]
         {
-            return std::string(name) + " " + Quote(BytesOf(text)) +
-                   (pagePath == nullptr ? "" : " of page " + Quote(BytesOf(*pagePath)));
+            return std::string(name) + " " + m_findings.Quote(BytesOf(text)) +
+                   (pagePath == nullptr ? "" : " of page " + m_findings.Quote(BytesOf(*pagePath)));
         };
         if (!value)
         {
@@ -59,7 +55,7 @@ public:
             m_findings.AddAtValue(Rule::ScriptAltered, text, pointer,
                                   [&]
                                   {
-                                      return named() + " is " + Quote(*value) + " in " + m_script +
+                                      return named() + " is " + m_findings.Quote(*value) + " in " + m_script +
                                              (kind == TextKind::Title ? ": readers see that"
                                                                       : ": readers are led there");
                                   });
@@ -73,12 +69,12 @@ public:
         const std::optional<std::string> other = CheckText(TextKind::Path, name, link, pointer);
         const std::string_view path = other ? *other : BytesOf(link);
         const bool isAddress = IsAddress(path);
-        if (isAddress || (!m_scope.options.checksTargets && IsDoubtful(path)))
+        if (isAddress || (!m_findings.Scope().options.checksTargets && IsDoubtful(path)))
         {
             m_findings.AddAtValue(Rule::PrefixedUrl, link, pointer,
                                   [&]
                                   {
-                                      return std::string(name) + " " + Quote(BytesOf(link)) +
+                                      return std::string(name) + " " + m_findings.Quote(BytesOf(link)) +
                                              " gets the module's prefix, and is dead " +
                                              (isAddress
                                                   ? "without the page script"
@@ -89,11 +85,6 @@ public:
         {
             m_targets.Check(name, link, pointer, path);
         }
-    }
-
-    [[nodiscard]] std::string Quote(std::string_view text) const
-    {
-        return Quoted(text, m_scope.options.quoteSize);
     }
 
 private:
@@ -119,7 +110,6 @@ private:
     }
 
     const char* m_script;
-    const FileScope& m_scope;
     FileFindings& m_findings;
     TargetCheck m_targets;
 };
@@ -155,9 +145,9 @@ void CheckChildren(TextCheck& check, const Value& node, const JsonPointer& point
 
 } // namespace
 
-void CheckIndexTexts(const Value& index, const FileScope& scope, FileFindings& findings)
+void CheckIndexTexts(const Value& index, FileFindings& findings)
 {
-    TextCheck check(Output::IndexScript, scope, findings);
+    TextCheck check(Output::IndexScript, findings);
     const JsonPointer root;
     const JsonPointer pagesPointer(root, "pages");
     const Value& pages = *FindMember(index, "pages");
@@ -171,9 +161,9 @@ void CheckIndexTexts(const Value& index, const FileScope& scope, FileFindings& f
     check.Targets().ReportUnreached();
 }
 
-void CheckTocTexts(const Value& toc, const FileScope& scope, FileFindings& findings)
+void CheckTocTexts(const Value& toc, FileFindings& findings)
 {
-    TextCheck check(Output::TocScript, scope, findings);
+    TextCheck check(Output::TocScript, findings);
     const JsonPointer root;
     const Value& link = *FindMember(toc, "link");
     // The root's link is escaped as a title is, and gets no prefix.

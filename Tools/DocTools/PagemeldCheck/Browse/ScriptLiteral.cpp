@@ -1,5 +1,8 @@
 #include "Tools/DocTools/PagemeldCheck/Browse/ScriptLiteral.h"
 
+#include <rapidjson/encodings.h>
+#include <rapidjson/stringbuffer.h>
+
 #include <algorithm>
 #include <cstddef>
 #include <cstdint>
@@ -188,18 +191,9 @@ private:
 
     void AppendBytes(std::uint32_t codePoint)
     {
-        if (codePoint < 0x80)
-        {
-            m_value += static_cast<char>(codePoint);
-            return;
-        }
-        const int continuations = codePoint < 0x800 ? 1 : codePoint < 0x10000 ? 2 : 3;
-        const std::uint32_t lead = 0xF0U << (3 - continuations);
-        m_value += static_cast<char>(lead | (codePoint >> (6 * continuations)));
-        for (int i = continuations - 1; i >= 0; --i)
-        {
-            m_value += static_cast<char>(0x80 | ((codePoint >> (6 * i)) & 0x3F));
-        }
+        rapidjson::StringBuffer bytes;
+        rapidjson::UTF8<>::Encode(bytes, codePoint);
+        m_value.append(bytes.GetString(), bytes.GetSize());
     }
 
     std::string_view m_rest;

@@ -9,12 +9,12 @@ namespace
 
 using rapidjson::Value;
 
-/// Returns "but there are 3 pages" or "but there is 1 page" for the entries of an array of the document,
-/// which must be one: otherwise no number is out of its bounds.
+/// Returns "but there are 3 pages, numbered from 0" or "but there is 1 page, ..." for the entries of an array
+/// of the document, which must be one: otherwise no number is out of its bounds.
 std::string CountEntries(const Value& document, const char* member, const std::string& noun)
 {
     const rapidjson::SizeType count = FindMember(document, member)->Size();
-    return (count == 1 ? "but there is " : "but there are ") + Counted(count, noun);
+    return (count == 1 ? "but there is " : "but there are ") + Counted(count, noun) + ", numbered from 0";
 }
 
 /// Returns the value whose type is wrong in a pair of strings.

@@ -103,7 +103,8 @@ std::string DescribeStringCharacter(char c)
     switch (c)
     {
     case '\\':
-        return "a backslash in a string must be doubled; in a title or path, use another character";
+        return "every backslash that is meant as one must be doubled; in a title or path, use another "
+               "character";
     case '\n':
     case '\r':
         return "a line break in a string: write a space, or \\n if it is not in a title or path";
@@ -139,7 +140,7 @@ std::string DescribeCause(std::string_view text, std::size_t size, const rapidjs
     case rapidjson::kParseErrorStringEscapeInvalid:
         return DescribeStringCharacter(text[failure.Offset()]);
     case rapidjson::kParseErrorStringUnicodeEscapeInvalidHex:
-        return "\\u needs four hexadecimal digits; a backslash that begins no escape must be doubled";
+        return "\\u needs four hexadecimal digits; a backslash that is meant as one must be doubled";
     case rapidjson::kParseErrorStringUnicodeSurrogateInvalid:
         return "half of a surrogate pair, as cutting a text leaves it: write both halves or neither";
     default:

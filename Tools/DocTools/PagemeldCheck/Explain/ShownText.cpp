@@ -1,5 +1,8 @@
 #include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 
+#include <rapidjson/encodings.h>
+#include <rapidjson/memorystream.h>
+
 #include <cstdint>
 #include <cstring>
 
@@ -35,29 +38,10 @@ struct Character
 
 Character ReadCharacter(std::string_view text)
 {
-    const auto lead = static_cast<unsigned char>(text.front());
-    if (lead < 0x80)
-    {
-        return {lead, 1};
-    }
-    const std::size_t length = lead >= 0xF0 ? 4 : lead >= 0xE0 ? 3 : 2;
-    if (lead < 0xC2 || lead > 0xF4 || text.size() < length)
-    {
-        return {};
-    }
-    std::uint32_t code = lead & (0x7FU >> length);
-    for (std::size_t i = 1; i < length; ++i)
-    {
-        const auto next = static_cast<unsigned char>(text[i]);
-        if ((next & 0xC0U) != 0x80)
-        {
-            return {};
-        }
-        code = code << 6 | (next & 0x3FU);
-    }
-    constexpr std::uint32_t kSmallest[] = {0, 0, 0x80, 0x800, 0x10000};
-    const bool isSurrogate = code >= 0xD800 && code <= 0xDFFF;
-    return code < kSmallest[length] || isSurrogate || code > 0x10FFFF ? Character{} : Character{code, length};
+    rapidjson::MemoryStream stream(text.data(), text.size());
+    unsigned code = 0;
+    const bool isWellFormed = rapidjson::UTF8<>::Decode(stream, &code);
+    return isWellFormed ? Character{code, stream.Tell()} : Character{};
 }
 
 bool IsUnsafe(std::uint32_t code)

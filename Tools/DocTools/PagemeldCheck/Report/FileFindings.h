@@ -1,5 +1,6 @@
 #pragma once
 
+#include "Tools/DocTools/PagemeldCheck/Explain/ShownText.h"
 #include "Tools/DocTools/PagemeldCheck/Report/Report.h"
 #include "Tools/DocTools/VantorPagemeld/Check/StructureFault.h"
 
@@ -15,6 +16,14 @@ class FileFindings
 public:
     /// The scope must outlive this object.
     explicit FileFindings(const FileScope& scope) : m_scope(scope) {}
+
+    [[nodiscard]] const FileScope& Scope() const { return m_scope; }
+
+    /// Returns a text as messages quote it.
+    [[nodiscard]] std::string Quote(std::string_view text) const
+    {
+        return Quoted(text, m_scope.options.quoteSize);
+    }
 
     /// Adds what is wrong with a value, in the words that wording() returns. The value must stay
     /// valid and in place until HandTo.

@@ -2,6 +2,7 @@
 
 #include <cstdio>
 #include <string>
+#include <utility>
 
 #include <sys/stat.h>
 
@@ -29,6 +30,9 @@ public:
     [[nodiscard]] bool IsSocket() const { return S_ISSOCK(m_status.st_mode); }
     [[nodiscard]] bool IsLink() const { return S_ISLNK(m_status.st_mode); }
     [[nodiscard]] bool IsDevice() const { return S_ISCHR(m_status.st_mode) || S_ISBLK(m_status.st_mode); }
+
+    /// What tells apart all that is there at one time, whatever its names are.
+    [[nodiscard]] std::pair<dev_t, ino_t> Id() const { return {m_status.st_dev, m_status.st_ino}; }
 
     /// All else that the system tells; zeros if nothing is there.
     [[nodiscard]] const struct stat& Details() const { return m_status; }
