@@ -17,11 +17,7 @@ void ReportRoot(const SetModule& module, const SetModule& other, const std::stri
         Finding::OfFile(Rule::RootDiffers, module.File(module.path.PathOf(Input::Toc)),
                         "root " + member + " " + Quoted(own, module.options.quoteSize) + " differs from " +
                             Quoted(others, module.options.quoteSize) + " " + consequence);
-    const std::vector<ValuePlace> places = LocateRoot(finding.file);
-    if (!places.empty())
-    {
-        finding.place = places[linkDiffers ? 0 : 1];
-    }
+    finding.place = module.toc.rootPlaces[linkDiffers ? 0 : 1];
     finding.pointer = "/" + member;
     report.Add(std::move(finding));
 }

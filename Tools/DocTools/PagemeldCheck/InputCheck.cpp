@@ -60,8 +60,8 @@ std::set<std::string> NamesOf(const Value& object)
 class InputCheck
 {
 public:
-    InputCheck(const FileScope& scope, const Value& document)
-        : m_scope(scope), m_findings(scope), m_document(document)
+    InputCheck(const FileScope& scope, const char* text, const Value& document)
+        : m_scope(scope), m_findings(scope), m_text(text), m_document(document)
     {
     }
 
@@ -133,8 +133,15 @@ public:
             earlier.hasCommonWords |= !facts.commonWords.empty();
             return facts;
         }
-        facts.rootLink = CStringOf(*FindMember(m_document, "link"));
-        facts.rootTitle = CStringOf(*FindMember(m_document, "title"));
+        const Value& link = *FindMember(m_document, "link");
+        const Value& title = *FindMember(m_document, "title");
+        facts.rootLink = CStringOf(link);
+        facts.rootTitle = CStringOf(title);
+        if (!earlier.firstContents || !(earlier.firstContents->Root() == facts.Root()))
+        {
+            facts.rootPlaces = LocateValues(m_text, m_document, {&link, &title});
+        }
+        earlier.firstContents = earlier.firstContents.value_or(facts);
         CheckTocTexts(m_document, m_findings);
         earlier.contents.Merge(m_document, m_findings);
         return facts;
@@ -193,6 +200,7 @@ private:
 
     const FileScope& m_scope;
     FileFindings m_findings;
+    const char* m_text;
     const Value& m_document;
     bool m_wasMergedReported = false;
 };
@@ -208,7 +216,7 @@ InputFacts CheckInputText(const InputText& text, const FileScope& scope, Earlier
 
     InputFacts facts;
     facts.state = InputFacts::State::Refused;
-    InputCheck check(scope, document);
+    InputCheck check(scope, text.bytes.get(), document);
     check.CheckBytes(seen, text.bytesRead);
     if (failure.IsError())
     {
@@ -234,21 +242,4 @@ InputFacts CheckInput(const FileScope& scope, EarlierModules& earlier, Report& r
     InputFacts facts;
     facts.state = InputFacts::State::Unreadable;
     return facts;
-}
-
-std::vector<ValuePlace> LocateRoot(const std::string& path)
-{
-    const InputText text = ReadInputFile(path.c_str());
-    rapidjson::Document document;
-    if (text.outcome != InputText::Outcome::Read || ParseJson(text.bytes.get(), document).IsError())
-    {
-        return {};
-    }
-    const Value* const link = FindMember(document, "link");
-    const Value* const title = FindMember(document, "title");
-    if (link == nullptr || title == nullptr)
-    {
-        return {};
-    }
-    return LocateValues(text.bytes.get(), document, {link, title});
 }

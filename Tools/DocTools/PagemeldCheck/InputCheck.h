@@ -4,6 +4,7 @@
 #include "Tools/DocTools/PagemeldCheck/Report/Report.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 
+#include <optional>
 #include <set>
 #include <string>
 #include <vector>
@@ -23,9 +24,10 @@ struct InputFacts
 
     std::set<std::string> commonWords; ///< of a sound index
 
-    // Of a sound toc, as pagemeld compares them: up to the first NUL.
+    // Of the root of a sound toc, as pagemeld compares them: up to the first NUL.
     std::string rootLink;
     std::string rootTitle;
+    std::vector<ValuePlace> rootPlaces; ///< of link and title, if the root is the first or differs from it
 
     [[nodiscard]] bool IsSound() const { return state == State::Sound; }
     [[nodiscard]] EntryKey Root() const { return {rootLink.c_str(), rootTitle.c_str()}; }
@@ -35,6 +37,7 @@ struct InputFacts
 struct EarlierModules
 {
     bool hasCommonWords = false;
+    std::optional<InputFacts> firstContents;
     MergedContents contents;
 };
 
@@ -42,7 +45,3 @@ struct EarlierModules
 /// file that is missing or can't be read is left to the caller to report. Adds what it holds to that of
 /// earlier modules.
 InputFacts CheckInput(const FileScope& scope, EarlierModules& earlier, Report& report);
-
-/// Returns the places of the root's link and title of a toc.json that was sound when it was checked; nothing
-/// if it can't be read any more.
-std::vector<ValuePlace> LocateRoot(const std::string& path);

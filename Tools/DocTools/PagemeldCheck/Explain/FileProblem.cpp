@@ -2,11 +2,9 @@
 
 #include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
 
-#include <array>
 #include <cerrno>
-#include <climits>
 #include <cstdint>
-#include <string_view>
+#include <filesystem>
 
 #include <fcntl.h>
 #include <unistd.h>
@@ -33,31 +31,16 @@ std::string DescribeAbsence(const std::string& path, int error)
     }
 }
 
-std::string DirectoryOf(const std::string& path)
-{
-    const std::size_t slash = path.rfind('/');
-    return slash == std::string::npos ? "." : path.substr(0, slash + 1);
-}
-
-/// Returns the path that a link holds, as seen from where path is.
-std::string TargetOf(const std::string& link)
-{
-    std::array<char, PATH_MAX> target;
-    const ssize_t size = ::readlink(link.c_str(), target.data(), target.size());
-    const std::string_view text(target.data(), size < 0 ? 0 : static_cast<std::size_t>(size));
-    const bool isAbsolute = text.substr(0, 1) == "/";
-    return (isAbsolute ? "" : DirectoryOf(link)).append(text);
-}
-
 /// Whether a link, or the last of several, leads to a name that can be made.
-bool LeadsToFreeName(std::string path)
+bool LeadsToFreeName(std::filesystem::path path)
 {
     constexpr int kMaxLinks = 40; // as many as Linux follows
+    std::error_code ignored;
     for (int i = 0; i < kMaxLinks && FileStatus::OfEntry(path).IsLink(); ++i)
     {
-        path = TargetOf(path);
+        path = path.parent_path() / std::filesystem::read_symlink(path, ignored);
     }
-    return DescribeUnwritableDirectory(DirectoryOf(path)).empty();
+    return DescribeUnwritableDirectory(path.parent_path()).empty();
 }
 
 /// What can't be opened for what its kind is; an empty text for files and devices.
