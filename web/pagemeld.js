@@ -29,6 +29,7 @@
         create("div", { class: "pagemeld-finder" }, form, status, results, more), contents);
     const dialog = create("dialog", { id: "pagemeld", "aria-label": "All modules" });
 
+    const kept = history.state?.pagemeld; // before the page's own scripts replace it, as Sphinx's do
     const needIndex = once(loadIndexes);
     const needContents = once(loadContents);
     const lookups = []; // of the sets that are loaded, the own one first
@@ -289,13 +290,12 @@
         const address = new URL(document.URL);
         const others = address.search.replace(/[?&]pagemeld=[^&]*/, "");
         address.search = others + (query ? `${others && "&"}pagemeld=${encodeURIComponent(query)}` : "");
-        const kept = { module: filter.value, shown: results.childElementCount, chosen };
-        history.replaceState({ ...history.state, pagemeld: kept }, "", address.href);
+        const pagemeld = { module: filter.value, shown: results.childElementCount, chosen };
+        history.replaceState({ ...history.state, pagemeld }, "", address.href);
     }
 
     // Once the indexes are there: as it was when the reader left for a result.
     async function restoreQuery(query) {
-        const kept = history.state?.pagemeld;
         box.value = query;
         await needIndex();
         if (kept) {
