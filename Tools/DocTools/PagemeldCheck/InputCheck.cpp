@@ -11,7 +11,9 @@
 #include "Tools/DocTools/VantorPagemeld/Read/InputFile.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonReader.h"
+#include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
 
+#include <cerrno>
 #include <utility>
 
 namespace
@@ -73,30 +75,32 @@ public:
         const std::size_t invalid = FindInvalidUtf8(seen);
         if (invalid != kNone)
         {
-            m_findings.AddAtOffset(Rule::InvalidUtf8, invalid,
-                                   "byte " + Visible(seen.substr(invalid, 1)) +
-                                       " is not UTF-8: readers see a replacement character");
+            m_findings.Add(Rule::InvalidUtf8,
+                           "byte " + Visible(seen.substr(invalid, 1)) +
+                               " is not UTF-8: readers see a replacement character",
+                           invalid);
         }
         const std::size_t half = FindLoneHalf(seen);
         if (half != kNone)
         {
-            m_findings.AddAtOffset(
-                Rule::InvalidUtf8, half,
-                "half of a surrogate pair: readers see replacement characters, and "
-                "other programs may refuse the JSON outputs; write both halves or neither");
+            m_findings.Add(Rule::InvalidUtf8,
+                           "half of a surrogate pair: readers see replacement characters, and other programs "
+                           "may refuse the JSON outputs; write both halves or neither",
+                           half);
         }
         if (seen.size() + 1 < size)
         {
-            m_findings.AddAtOffset(Rule::TextAfterNul, seen.size(),
-                                   "a NUL byte ends the text; bytes after it that are not seen: " +
-                                       std::to_string(size - seen.size() - 1));
+            m_findings.Add(Rule::TextAfterNul,
+                           "a NUL byte ends the text; bytes after it that are not seen: " +
+                               std::to_string(size - seen.size() - 1),
+                           seen.size());
         }
     }
 
     void ReportRefusal(std::string_view seen, std::size_t size, const rapidjson::ParseResult& failure)
     {
-        m_findings.AddAtOffset(Rule::NotJson, failure.Offset(),
-                               DescribeParseFailure(seen, size, failure) + "; " + m_scope.Loss());
+        m_findings.Add(Rule::NotJson, DescribeParseFailure(seen, size, failure) + "; " + m_scope.Loss(),
+                       failure.Offset());
     }
 
     /// Returns whether the tool takes the document.
@@ -205,6 +209,13 @@ private:
     bool m_wasMergedReported = false;
 };
 
+/// Whether something is at path, or may be: a directory may hide what is in it.
+bool IsThere(const std::string& path)
+{
+    const FileStatus status = FileStatus::OfEntry(path);
+    return status.Exists() || status.Error() == EACCES;
+}
+
 /// Checks what was read, and returns what it holds.
 InputFacts CheckInputText(const InputText& text, const FileScope& scope, EarlierModules& earlier,
                           Report& report)
@@ -240,6 +251,6 @@ InputFacts CheckInput(const FileScope& scope, EarlierModules& earlier, Report& r
         return CheckInputText(text, scope, earlier, report);
     }
     InputFacts facts;
-    facts.state = InputFacts::State::Unreadable;
+    facts.state = IsThere(scope.file.path) ? InputFacts::State::Unreadable : InputFacts::State::Missing;
     return facts;
 }

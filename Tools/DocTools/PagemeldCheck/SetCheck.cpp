@@ -7,7 +7,6 @@
 #include "Tools/DocTools/PagemeldCheck/WriteCheck.h"
 
 #include <algorithm>
-#include <cerrno>
 
 namespace
 {
@@ -23,23 +22,6 @@ Modules ModulesOf(DocSet set, const std::vector<std::string>& roots, const Check
         modules.emplace_back(modules.size(), set, root, options);
     }
     return modules;
-}
-
-/// Whether something is at path, or may be: a directory may hide what is in it.
-bool IsThere(const std::string& path)
-{
-    const FileStatus status = FileStatus::OfEntry(path);
-    return status.Exists() || status.Error() == EACCES;
-}
-
-InputFacts CheckFile(const FileScope& scope, EarlierModules& earlier, Report& report)
-{
-    InputFacts facts = CheckInput(scope, earlier, report);
-    if (facts.state == InputFacts::State::Unreadable && !IsThere(scope.file.path))
-    {
-        facts.state = InputFacts::State::Missing;
-    }
-    return facts;
 }
 
 void ReportUnreadable(const FileScope& scope, const InputFacts& facts, Report& report)
@@ -58,7 +40,7 @@ void CheckModule(SetModule& module, EarlierModules& earlier, Report& report)
 {
     for (const auto& input : kInputs)
     {
-        module.FactsOf(input.id) = CheckFile(module.ScopeOf(input.id), earlier, report);
+        module.FactsOf(input.id) = CheckInput(module.ScopeOf(input.id), earlier, report);
     }
     if (!module.HasFiles())
     {

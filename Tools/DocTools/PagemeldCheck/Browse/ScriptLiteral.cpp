@@ -4,6 +4,7 @@
 #include <rapidjson/stringbuffer.h>
 
 #include <algorithm>
+#include <charconv>
 #include <cstddef>
 #include <cstdint>
 #include <utility>
@@ -29,18 +30,11 @@ bool IsOctalDigit(char c)
     return c >= '0' && c <= '7';
 }
 
-std::optional<std::uint32_t> ValueOfHexDigit(char c)
+std::optional<std::uint32_t> ValueOfHexDigits(std::string_view digits)
 {
-    if (c >= '0' && c <= '9')
-    {
-        return static_cast<std::uint32_t>(c - '0');
-    }
-    const int lower = c | 0x20;
-    if (lower >= 'a' && lower <= 'f')
-    {
-        return static_cast<std::uint32_t>(lower - 'a' + 10);
-    }
-    return std::nullopt;
+    std::uint32_t number = 0;
+    const auto [end, error] = std::from_chars(digits.begin(), digits.end(), number, 16);
+    return error == std::errc() && end == digits.end() ? std::optional(number) : std::nullopt;
 }
 
 bool IsHighSurrogate(std::uint32_t codePoint)
@@ -118,28 +112,14 @@ private:
 
     std::optional<std::uint32_t> TakeHexDigits(std::size_t count)
     {
-        std::uint32_t number = 0;
-        for (std::size_t i = 0; i < count; ++i)
-        {
-            const auto digit = m_rest.empty() ? std::nullopt : ValueOfHexDigit(Take(1).front());
-            if (!digit)
-            {
-                return std::nullopt;
-            }
-            number = number * 16 + *digit;
-        }
-        return number;
+        const std::string_view digits = Take(count);
+        return digits.size() == count ? ValueOfHexDigits(digits) : std::nullopt;
     }
 
     std::optional<std::uint32_t> TakeBracedCodePoint()
     {
-        std::optional<std::uint32_t> number = TakeHexDigits(1);
-        while (number && *number <= kMaxCodePoint && !TakeIf("}"))
-        {
-            const auto digit = TakeHexDigits(1);
-            number = digit ? std::optional<std::uint32_t>(*number * 16 + *digit) : std::nullopt;
-        }
-        return number && *number <= kMaxCodePoint ? number : std::nullopt;
+        const std::optional<std::uint32_t> number = ValueOfHexDigits(Take(m_rest.find('}')));
+        return TakeIf("}") && number <= kMaxCodePoint ? number : std::nullopt;
     }
 
     /// At most three digits, and no more than make a number below 256.

@@ -4,6 +4,8 @@
 #include <charconv>
 #include <iterator>
 
+#include <strings.h>
+
 // Inside this file a path is a URL path: "%" introduces a byte, and a name may be empty. It begins with "/"
 // or "./", and ends in a slash as long as names are added. Only the finished path is converted to names on
 // disk.
@@ -148,14 +150,11 @@ bool IsAddress(std::string_view link)
 {
     constexpr std::string_view kSchemes[] = {"http", "https", "ftp", "mailto"};
     const std::size_t colon = link.find(':');
-    if (colon == std::string_view::npos)
-    {
-        return false;
-    }
-    std::string scheme(link.substr(0, colon));
-    std::transform(scheme.begin(), scheme.end(), scheme.begin(),
-                   [](char c) { return IsLetter(c) ? static_cast<char>(c | 0x20) : c; });
-    return std::find(std::begin(kSchemes), std::end(kSchemes), scheme) != std::end(kSchemes);
+    return std::any_of(std::begin(kSchemes), std::end(kSchemes),
+                       [&](std::string_view scheme) {
+                           return scheme.size() == colon &&
+                                  ::strncasecmp(scheme.data(), link.data(), colon) == 0;
+                       });
 }
 
 std::string PercentEncoded(std::string_view path)

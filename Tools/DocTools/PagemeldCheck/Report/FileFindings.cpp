@@ -1,14 +1,6 @@
 #include "Tools/DocTools/PagemeldCheck/Report/FileFindings.h"
 
-void FileFindings::Add(Rule rule, std::string message)
-{
-    if (Item* item = AddItem(rule))
-    {
-        item->finding.message = std::move(message);
-    }
-}
-
-void FileFindings::AddAtOffset(Rule rule, std::size_t offset, std::string message)
+void FileFindings::Add(Rule rule, std::string message, std::optional<std::size_t> offset)
 {
     if (Item* item = AddItem(rule))
     {

@@ -39,11 +39,8 @@ public:
         }
     }
 
-    /// Adds what is wrong with the file as a whole.
-    void Add(Rule rule, std::string message);
-
-    /// Adds what is wrong at a byte of the text.
-    void AddAtOffset(Rule rule, std::size_t offset, std::string message);
+    /// Adds what is wrong at a byte of the text, or with the file as a whole.
+    void Add(Rule rule, std::string message, std::optional<std::size_t> offset = std::nullopt);
 
     /// Hands all findings to the report, after looking up the lines of those that have a place. document is
     /// what ParseJson made of text.

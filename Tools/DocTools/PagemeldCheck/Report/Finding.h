@@ -56,7 +56,7 @@ struct MissingModules
 struct Summary
 {
     std::size_t modules = 0;
-    std::size_t findings[3] = {}; ///< by level
+    std::size_t findings[static_cast<std::size_t>(Level::Count)] = {};
     MissingModules missing[static_cast<std::size_t>(DocSet::Count)];
 
     [[nodiscard]] std::size_t CountOf(Level level) const { return findings[static_cast<std::size_t>(level)]; }

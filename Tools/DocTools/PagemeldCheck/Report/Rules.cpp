@@ -1,7 +1,5 @@
 #include "Tools/DocTools/PagemeldCheck/Report/Rules.h"
 
-#include "Tools/DocTools/VantorPagemeld/System/EnumTable.h"
-
 #include <algorithm>
 #include <iterator>
 
@@ -118,17 +116,4 @@ const RuleRow* FindRule(std::string_view name)
     const auto* const found = std::find_if(std::begin(kRules), std::end(kRules),
                                            [&](const RuleRow& rule) { return name == rule.name; });
     return found == std::end(kRules) ? nullptr : found;
-}
-
-const char* NameOf(Level level)
-{
-    switch (level)
-    {
-    case Level::Error:
-        return "error";
-    case Level::Warning:
-        return "warning";
-    default:
-        return "note";
-    }
 }

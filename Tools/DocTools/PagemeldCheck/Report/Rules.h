@@ -1,5 +1,7 @@
 #pragma once
 
+#include "Tools/DocTools/VantorPagemeld/System/EnumTable.h"
+
 #include <cstddef>
 #include <string_view>
 
@@ -9,7 +11,25 @@ enum class Level
     Error,
     Warning,
     Note,
+    Count,
 };
+
+struct LevelRow
+{
+    Level id;
+    const char* name;
+    const char* color; ///< what makes a terminal show it
+};
+
+constexpr LevelRow kLevels[] = {{Level::Error, "error", "\033[1;31m"},
+                                {Level::Warning, "warning", "\033[1;35m"},
+                                {Level::Note, "note", "\033[1;36m"}};
+static_assert(HasRowOfEach(kLevels));
+
+constexpr const char* NameOf(Level level)
+{
+    return RowOf(kLevels, level).name;
+}
 
 /// One thing that the checker looks for.
 enum class Rule
@@ -68,6 +88,3 @@ const RuleRow& RowOf(Rule rule);
 
 /// Returns the rule of that name, or null.
 const RuleRow* FindRule(std::string_view name);
-
-/// Returns "error", "warning" or "note".
-const char* NameOf(Level level);

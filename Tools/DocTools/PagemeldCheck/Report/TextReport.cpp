@@ -5,19 +5,6 @@
 namespace
 {
 
-const char* ColorOf(Level level)
-{
-    switch (level)
-    {
-    case Level::Error:
-        return "\033[1;31m";
-    case Level::Warning:
-        return "\033[1;35m";
-    default:
-        return "\033[1;36m";
-    }
-}
-
 /// Returns a pointer after a space, cut if it is long; nothing for the root.
 std::string ShownPointer(const std::string& pointer)
 {
@@ -49,7 +36,7 @@ std::string TextLine(const Finding& finding, bool isColored)
     const RuleRow& rule = RowOf(finding.rule);
     const std::string level = NameOf(rule.level);
     line += line.empty() ? "" : ": ";
-    line += isColored ? ColorOf(rule.level) + level + ":\033[0m " : level + ": ";
+    line += isColored ? RowOf(kLevels, rule.level).color + level + ":\033[0m " : level + ": ";
     line += finding.message + " [" + rule.name + "]";
     return line + ShownPointer(finding.pointer.value_or(""));
 }
