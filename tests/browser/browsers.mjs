@@ -26,8 +26,6 @@ class Page {
 }
 
 class PuppeteerPage extends Page {
-    requests = [];
-
     static async open(executablePath) {
         const page = new PuppeteerPage();
         const browser = executablePath.includes("firefox") ? "firefox" : "chrome";
@@ -42,7 +40,6 @@ class PuppeteerPage extends Page {
         const old = this.tab;
         this.tab = await this.browser.newPage();
         this.tab.on("pageerror", (error) => { this.errors.push(String(error)); });
-        this.tab.on("request", (request) => { this.requests.push(request.url()); });
         this.tab.on("console", (message) => {
             if (message.type() === "error") {
                 this.errors.push(message.text());
@@ -53,7 +50,6 @@ class PuppeteerPage extends Page {
 
     async goto(url) {
         this.errors = [];
-        this.requests = [];
         await this.tab.goto(url);
     }
 
@@ -66,7 +62,7 @@ class PuppeteerPage extends Page {
 }
 
 const keys = { Tab: "\uE004", Enter: "\uE007", Escape: "\uE00C", ArrowLeft: "\uE012", ArrowUp: "\uE013",
-    ArrowRight: "\uE014", ArrowDown: "\uE015", Shift: "\uE008" };
+    ArrowRight: "\uE014", ArrowDown: "\uE015", PageDown: "\uE00F" };
 const writeConsole = "--enable-write-console-messages-to-stdout=true";
 
 async function findFreePort() {

@@ -14,6 +14,7 @@ const axe = fs.readFileSync(createRequire(import.meta.url).resolve("axe-core/axe
 const root = makeSite(pagemeld);
 let page;
 const plain = `${sea}/far/off/no theme.html`;
+const seaModule = "Manual/Gr\u00f6\u00dfe  #1";
 let base;
 
 const $ = (selector) => `document.querySelector("#pagemeld ${selector}")`;
@@ -67,8 +68,7 @@ async function checkWhole() {
     const dead = links.filter((link) => !link.startsWith(base) || !fs.existsSync(fileOf(link)));
     assert.deepEqual(dead, ["https://sea.invalid/?a#b", "https://[/latin.html"]);
     assert(links.length > 80 && links.includes(`${base}${toUrl(sea)}/50%25%20of%3F%20all.html#end`));
-    await expect(`[frames.length, typeof searchIndex, typeof p3, ${$("li a:not([target=_self])")}]`.replace("frames.length, ", ""),
-        ["undefined", "undefined", null]);
+    await expect(`[typeof searchIndex, typeof p3, ${$("li a:not([target=_self])")}]`, ["undefined", "undefined", null]);
 }
 
 // The boxes of all of the page's own elements.
@@ -126,10 +126,10 @@ const rows = { // what must hold, and how that is seen
         }])),
     ...Object.fromEntries(Object.entries(themes).map(([name, { isDark = false }]) =>
         [`at home in a page with ${name}`, () => checkTheme(name, isDark)])),
-    "nothing is loaded before the dialog opens": async () => {
-        await goto(plain);
-        await expect(`[document.querySelector("#pagemeld :is(iframe, li)") === null,
-            performance.getEntriesByType("resource").filter(({ name }) => /global_/.test(name)).length]`, [true, 0]);
+    "nothing is loaded before the dialog opens; its button is in the corner that the tag names": async () => {
+        await goto(`${sea}/far/off/policy.html`);
+        await expect(`[${opener}.offsetLeft, ${opener}.offsetTop, document.querySelectorAll("#pagemeld :is(iframe, li)").length,
+            performance.getEntriesByType("resource").filter(({ name }) => /global_/.test(name)).length]`, [12, 12, 0, 0]);
     },
     "a link within the page closes the dialog and goes there, also again": async () => {
         await goto(plain);
@@ -146,6 +146,7 @@ const rows = { // what must hold, and how that is seen
         await expect(`${stops} - document.querySelectorAll("a[href]:not(#pagemeld-corner *)").length`, 1);
         await page.press("/");
         await expect(focus, "input");
+        await page.until(`(${$("select")}.value = "${seaModule}", ${$("select")}.value)`); // once it can be chosen
         await search("pitching thes");
         await page.press("ArrowDown");
         await expect(focus, "Rolling");
@@ -153,7 +154,8 @@ const rows = { // what must hold, and how that is seen
         await page.until("document.title === 'Gr\u00f6\u00dfe'");
         await page.evaluate("history.back()");
         await page.until(`${dialog}?.open && ${found}[0] === "Rolling" && ${focus} === "Rolling"`);
-        await expect(`[${$("input")}.value, location.search]`, ["pitching thes", "?x&pagemeld=pitching%20thes"]);
+        await expect(`[${$("input")}.value, ${$("select")}.value, location.search]`,
+            ["pitching thes", seaModule, "?x&pagemeld=pitching%20thes"]);
         await page.press("Escape");
         await page.until(`!${dialog}.open && location.search === "?x"`);
         await expect(focus, "body");
@@ -169,9 +171,9 @@ const rows = { // what must hold, and how that is seen
         await search("wave");
         await checkAccess();
     },
-    "a link leads past a place of the page's own": async () => {
+    "the contents show the way to the page, and a link leads past them": async () => {
         await goto(`${sea}/far/off/own place.html`);
-        await page.until($("nav li"));
+        await page.until(`${$("details[open] [aria-current]")}?.text === "Place"`);
         await page.evaluate(`${$(".pagemeld-skip")}.focus()`);
         await page.press("Enter");
         await page.press("Tab");
@@ -187,37 +189,42 @@ const rows = { // what must hold, and how that is seen
         await expect(seen, [false, true]);
         await page.resize(1280, 800);
     },
-    "a click beside the dialog closes it": async () => {
+    "keys do not scroll the page below the dialog, and a click beside it closes it": async () => {
         await goto(`${plain}?pagemeld=wave`);
         await page.until(`${dialog}?.open && ${found}.length`);
+        await page.press("PageDown");
+        await delay(300);
+        await expect("[scrollY, document.documentElement.scrollHeight > 2000]", [0, true]);
         await page.click(640, 3);
         await page.until(`!${dialog}.open && !location.search`);
     },
     "a broken output is named, and a frame set is left alone": async () => {
         await goto("telemetry/Manual/index.html");
-        await page.until(`${$("input")}.focus() ?? ${status} === "Search is not available: global_index.js did not run"`);
+        await page.until(`${$("input")}.focus() ?? ${status}.endsWith("run")`);
         await page.until(`${$("nav")}.innerText.includes("Contents are not available: global_toc.js did not run")`);
+        await delay(500); // in which the other set's index, which is whole, would change the status
+        await expect(status, "Search is not available: global_index.js did not run");
         await page.goto(`${base}${toUrl(sea)}/far/off/frames.html`);
         await expect("document.querySelector('#pagemeld, .pagemeld-open, iframe, link') === null", true);
         page.errors = [];
     },
-    "the chosen module is kept": async () => {
-        await goto(plain);
-        await openDialog();
-        await page.until($("[value='Manual/charts']"));
-        await page.evaluate(`${$("select")}.value = "Manual/charts"`);
-        await search("r");
-        await page.evaluate(`${$(".pagemeld-results a")}.click()`);
-        await page.until(`!location.search`);
-        await page.evaluate("history.back()");
-        await page.until(`${dialog}?.open && ${$("select")}.value === "Manual/charts" && ${found}.length > 0`);
-    },
+    ...browser !== "chromium" ? {} : { "marked words are seen in forced colors, and nothing of it is printed": async () => {
+        await goto(`${plain}?pagemeld=pitch`);
+        await page.until($("mark"));
+        const session = await page.tab.createCDPSession();
+        await session.send("Emulation.setEmulatedMedia", { features: [{ name: "forced-colors", value: "active" }] });
+        await expect(`(({ color, backgroundColor }) => [color, backgroundColor])(getComputedStyle(${$("mark")}))`,
+            ["rgb(0, 0, 0)", "rgb(255, 255, 0)"]);
+        await session.send("Emulation.setEmulatedMedia", { media: "print" });
+        await expect(`[${opener}, ${$(".pagemeld-view")}].some((part) => part.checkVisibility())`, false);
+    } },
 };
 
 const server = spawn("python3", ["-um", "http.server", "--bind", "127.0.0.1", "--directory", root, "0"]);
 try {
     const line = await new Promise((resolve) => server.stdout.once("data", resolve));
     for (base of [`file://${root}/`, /http:[^)]+/.exec(line)[0]]) {
+        await page?.close();
         page = await openPage(browser);
         await page.resize(1280, 800);
         for (const [name, check] of Object.entries(rows)) {
@@ -226,13 +233,10 @@ try {
             assert.deepEqual(page.errors, []);
             await page.renew();
         }
-        await page.close();
     }
     console.log(`${2 * Object.keys(rows).length} passed, 0 failed`);
-} catch (error) {
-    await page?.close();
-    throw error;
 } finally {
+    await page?.close();
     server.kill();
     fs.rmSync(root, { recursive: true });
 }

@@ -11,7 +11,7 @@ const place = '<div id="pagemeld"></div>';
 const waves = Array.from({ length: 40 }, (_, i) => `waves/${i + 1}.html`);
 const node = (link, title, children = null) => ({ link, title, children });
 const toc = node("index.html", "Brackwater Manual", [
-    node("null", "Getting started", [node("far/off/latin.html#roll", "Roll"), node("far/off/latin.html", "Gr\u00f6\u00dfe")]),
+    node("null", "Getting started", [node("far/off/own place.html", "Place"), node("far/off/latin.html#roll", "Roll"), node("far/off/latin.html", "Gr\u00f6\u00dfe")]),
     node("https://sea.invalid/?a#b", "Outside"), node("https://[/latin.html", "Broken"),
     node("50% of? all.html#end", "Half"), node("far/off/no theme.html#end", "End"), node("File:x.html", "No scheme"),
     node("far/off/hostile.html", hostileTitle, waves.map((wave) => node(wave, "")))]);
@@ -24,7 +24,7 @@ const index = {
 
 // What hurts in other people's themes: their rules, and parts of the body that go with them.
 export const themes = {
-    "no theme": { css: "" },
+    "no theme": { css: "", script: `addEventListener("DOMContentLoaded", () => { history.replaceState({}, ""); });` },
     "a fixed sidebar": { css: "aside { position: fixed; z-index: 9999; inset: 0 auto 0 0; width: 300px; } main { margin-left: 300px; }" },
     "a fixed header": { css: "header { position: fixed; z-index: 99999; inset: 0 0 auto; height: 60px; } main { padding-top: 60px; }" },
     "a flex body": { css: "body { display: flex; gap: 30px; } body > * { flex: 1; min-width: 200px; }" },
@@ -49,7 +49,8 @@ const pages = {
     "far/off/strict.xhtml": `<html xmlns="http://www.w3.org/1999/xhtml"><head>${tag}</head><body>${place}</body></html>`,
     "far/off/based.html": `${tag}<base href="http://invalid.invalid/" target="_blank"><p>x</p>${place}`,
     "far/off/shared.html": `<script src="../../shared/pagemeld.js" defer data-docdata="../../docdata"></script><p>x</p>${place}`,
-    "far/off/policy.html": `<meta http-equiv="Content-Security-Policy" content="script-src 'self'">${tag}<p>x</p>`,
+    "far/off/policy.html": `<meta http-equiv="Content-Security-Policy" content="script-src 'self'">
+        ${tag.replace("defer", "data-corner='top left' defer")}<p>x</p>`,
     "far/off/own place.html": themePage("own place", { css: "" }, tag).replace("<main>", `${place}<main>`),
     "far/off/frames.html": `${tag}<frameset><frame src="about:blank"></frameset>`,
     "docdata/index.json": JSON.stringify(index), "docdata/toc.json": JSON.stringify(toc), "../../favicon.ico": "",
@@ -75,7 +76,6 @@ export function makeSite(pagemeld) {
         fs.cpSync("web", path.join(root, directory), { recursive: true }));
     execFileSync(path.resolve(pagemeld), ["-autopaths", root], { stdio: "ignore" });
     fs.writeFileSync(path.join(root, "telemetry/Manual/docdata/global_index.js"), "pages = [");
-    ["Manual/docdata/global_toc.js", "ScriptReference/docdata/global_index.js"].forEach((output) =>
-        fs.rmSync(path.join(root, "telemetry", output)));
+    fs.rmSync(path.join(root, "telemetry/Manual/docdata/global_toc.js"));
     return root;
 }
