@@ -132,7 +132,7 @@ GENERATORS = [
     ("index.html", '<meta name="generator" content="Doxygen 1.9">', "annotated.html",
      '<tr id="row_0_"><td><a href="b.html">B</a>'),
     ("index.html", "<META content='DocBook XSL' name='generator'>", "index.html",
-     '<dl class="toc"><dt><a href="b.html">B</a></dt></dl>'),
+     "<ul><li>" * 1999 + "</ul>" * 1999 + '<dl class="toc"><dt><a href="b.html">B</a></dt></dl>'),
     ("element-list", "", "overview-tree.html", LIST), ("objects.inv", "", "contents.html", LIST),
     ("book.js", "", "index.html", '<nav><ol><li><a href="b.html">B</a><li><ol><li><a href="c.html">C</a></ol></ol>'
                                   '</nav><a rel="next" href="c.html">Next</a>'),
@@ -141,7 +141,7 @@ TAG = '<script src="docdata/pagemeld.js" defer="defer"></script>'
 WIDE_TAG = TAG.replace(" defer", ' charset="utf-8" defer').encode("utf-16-le").decode()
 WIDE = ("\ufeff<p>\u010d".encode("utf-16-le"), "</body>".encode("utf-16-le") + b"!", WIDE_TAG)
 OLD_TAG = '<script src="docdata/pagemeld.js" defer data-docdata="../docdata"></script>'
-SLOW = b"<script " + b"src=docdata/pagemeld.js " * 50000 + b">x</script><meta " + b"name=generator " * 50000
+SLOW = b"<script " + b"src=docdata/pagemeld.js " * 20000 + b">x</script><meta " + b"name=generator " * 20000
 # A row is a page's name, what it has before and after the place of the tag, and the tag that it gets.
 SCRIPT = [
     ("plain.html", b"<body>x", b"</BODY ></html>", TAG), ("bytes.html", b"\xff\r\n", b"</body>", TAG),

@@ -3,6 +3,7 @@ from generators import PARTS, SKIP, SKIPPED_ROLES, SKIPPED_TAGS
 from markup import TOKEN, read_attributes
 
 LISTS = {"ul", "ol", "dl"}
+DEEPEST = 50  # level of items; of lists that are never closed each one would be deeper than the last
 
 
 class Item:
@@ -55,7 +56,8 @@ class ListReader:
         if name in LISTS:
             self.depth, self.item = self.depth + 1, None
         elif name in ("li", "dt") or row.startswith("row_") or "col-first" in classes:
-            self.item = Item(row.count("_") - 1 if row else max(self.depth, 1))
+            depth = row.count("_") - 1 if row else max(self.depth, 1)
+            self.item = Item(min(depth, DEEPEST))
             self.items.append(self.item)
         elif attributes.get("rel") in ("next", "prev"):
             self.item = None  # leads through the pages

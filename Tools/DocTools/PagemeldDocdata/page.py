@@ -13,7 +13,7 @@ NUMBER = re.compile(r"^[\dA-Z]+(\.\d+)*\.?\s+")  # of a section, before its name
 MAIN = "main"
 REDIRECT = "redirect"
 MARKED = re.compile(r"\b(?:id|class|name|role|http-equiv)\s*=", re.I)
-ADDRESS = re.compile(r"\burl\s*=", re.I)
+AFTER_SECONDS = re.compile(r"\s*[\d.]*[;,\s]+\S")  # the address to which a page refreshes itself
 
 # The texts end at the next tag of that kind, so that tags that are never closed take linear time.
 TITLE = re.compile(r"<title[^<>]*>((?:(?!</?title).){0,2000})</title", re.S | re.I)
@@ -44,7 +44,7 @@ def read_traits(name, attributes):
     part = next((PARTS[name, one] for one in values.get("class", "").split() if (name, one) in PARTS), "")
     if name == "main" or role == "main":
         part = MAIN
-    elif values.get("http-equiv", "").lower() == "refresh" and ADDRESS.search(values.get("content", "")):
+    elif values.get("http-equiv", "").lower() == "refresh" and AFTER_SECONDS.match(values.get("content", "")):
         part = REDIRECT
     return part, values.get("id") or name == "a" and values.get("name") or ""
 

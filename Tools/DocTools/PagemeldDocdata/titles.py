@@ -12,7 +12,7 @@ LOOK_ALIKES = {ord("\\"): "\u2216", 0x7F: "\u2421", **{code: 0x2400 + code for c
 # Titles of start pages that have only such words and numbers don't say of which module they are.
 GENERIC = set(
     "a an api and class contents documentation for guide hierarchy home index introduction list main manual of "
-    "overview package packages page pages project read reference readme start table the title to top tree user "
+    "overview package packages page pages project read readme redirect redirecting redirection reference start table the title to top tree user "
     "version welcome".split())
 
 
