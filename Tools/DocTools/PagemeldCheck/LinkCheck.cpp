@@ -18,6 +18,7 @@ struct SetPath
         : position(rootPosition),
           module(root, set),
           target(module.AsLinkTarget()),
+          webPath(WebPathOf(module.Text())),
           isPlain(IsPlain(module.Text()))
     {
     }
@@ -36,24 +37,27 @@ struct SetPath
     std::size_t position;
     ModulePath module;
     std::string target;
+    std::string webPath;
     bool isPlain;
 };
 
-/// Whether the prefix from one plain path to another is right for what RelativePrefix is: "../" for every
-/// step after the last '/' that both share, then the rest. Never true for a wrong one. It is wrong only if
-/// they share no '/', or if a name in "to" is the beginning of the other's: the walk then ends within that
-/// name.
-bool IsPlainlyRight(const SetPath& from, const SetPath& to)
+/// Returns whether the prefix from one plain path to another is right for what RelativePrefix is: "../" for
+/// every step after the last '/' that both share, then the rest. It is wrong if they share no '/'. Returns
+/// nothing if a name in "to" is the beginning of the other's, since the walk then ends within that name, or
+/// if a path is not plain.
+std::optional<bool> IsPlainlyRight(const SetPath& from, const SetPath& to)
 {
     if (!from.isPlain || !to.isPlain)
     {
-        return false;
+        return std::nullopt;
     }
     const std::string& source = from.module.Text();
     const auto difference = std::mismatch(source.begin(), source.end(), to.target.begin(), to.target.end());
-    const bool endsWithinName =
-        difference.first != source.end() && difference.second != to.target.end() && *difference.second == '/';
-    return !endsWithinName && std::find(source.begin(), difference.first, '/') != difference.first;
+    if (difference.first != source.end() && difference.second != to.target.end() && *difference.second == '/')
+    {
+        return std::nullopt;
+    }
+    return std::find(source.begin(), difference.first, '/') != difference.first;
 }
 
 /// Returns the prefix from one set directory to another as the scripts have it, or nothing if it breaks them.
@@ -95,19 +99,24 @@ WrongLinks FindWrongLinks(const std::vector<SetPath>& paths, const SetPath& from
     WrongLinks wrong;
     for (const SetPath& to : paths)
     {
-        if (to.position == from.position || IsPlainlyRight(from, to))
+        const std::optional<bool> isRight = IsPlainlyRight(from, to);
+        if (to.position == from.position || isRight == true)
         {
             continue;
         }
+        if (isRight == false && wrong.count > 0)
+        {
+            ++wrong.count;
+            continue;
+        }
         const std::optional<std::string> prefix = PrefixInScripts(from, to);
-        const std::string target = WebPathOf(to.module.Text());
         const std::optional<std::string> reached =
-            prefix ? FollowPrefix(from, *prefix) : target; // the other's fault
-        if (reached != target && wrong.count++ == 0)
+            prefix ? FollowPrefix(from, *prefix) : to.webPath; // the other's fault
+        if (reached != to.webPath && wrong.count++ == 0)
         {
             wrong.first = to.position;
             wrong.reached = reached.value_or("");
-            wrong.isHandled = FollowPrefix(from, EncodedPrefix(*prefix)) == target;
+            wrong.isHandled = FollowPrefix(from, EncodedPrefix(*prefix)) == to.webPath;
         }
     }
     return wrong;
