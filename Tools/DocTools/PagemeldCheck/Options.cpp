@@ -4,8 +4,8 @@
 #include "Tools/DocTools/PagemeldCheck/Report/Rules.h"
 
 #include <algorithm>
+#include <charconv>
 #include <cstdio>
-#include <cstdlib>
 #include <cstring>
 #include <string_view>
 
@@ -64,15 +64,13 @@ std::nullopt_t Refuse(const std::string& message)
 }
 
 /// Returns a number that consists only of digits.
-std::optional<std::size_t> ParseNumber(const char* text)
+std::optional<std::size_t> ParseNumber(std::string_view text)
 {
     constexpr std::size_t kMaxDigits = 18;
-    const std::size_t length = std::strlen(text);
-    if (length == 0 || length > kMaxDigits || std::strspn(text, "0123456789") != length)
-    {
-        return std::nullopt;
-    }
-    return std::strtoull(text, nullptr, 10);
+    std::size_t number = 0;
+    const auto [end, error] = std::from_chars(text.begin(), text.end(), number);
+    const bool isNumber = error == std::errc() && end == text.end() && text.size() <= kMaxDigits;
+    return isNumber ? std::optional(number) : std::nullopt;
 }
 
 /// Takes one option. Returns why it is unusable, or an empty text.

@@ -14,6 +14,7 @@
 #include <optional>
 #include <string_view>
 #include <tuple>
+#include <utility>
 
 namespace
 {
@@ -73,6 +74,14 @@ std::map<int, std::string> MergedModules(const OutputRow& output, const std::vec
     return merged;
 }
 
+/// What tells bodies of outputs apart: size and hash.
+using Fingerprint = std::pair<std::size_t, std::size_t>;
+
+Fingerprint FingerprintOf(std::string_view body)
+{
+    return {body.size(), std::hash<std::string_view>()(body)};
+}
+
 /// Compares the copies of one output with what a run would write, as far as that is known without merging:
 /// with its prefix lines, with the first whole copy and with the dates of the inputs.
 class CopyCheck
@@ -108,27 +117,10 @@ public:
     }
 
 private:
-    /// What tells bodies apart.
-    struct Fingerprint
-    {
-        explicit Fingerprint(std::string_view body)
-            : size(body.size()), hash(std::hash<std::string_view>()(body))
-        {
-        }
-
-        friend bool operator==(const Fingerprint& a, const Fingerprint& b)
-        {
-            return a.size == b.size && a.hash == b.hash;
-        }
-
-        std::size_t size;
-        std::size_t hash;
-    };
-
     /// A copy that is the same as a whole one is whole. So only the first JSON text is parsed.
     [[nodiscard]] bool IsWholeCopy(std::string_view body) const
     {
-        return m_first == Fingerprint(body) || IsWholeBody(m_output, body);
+        return m_first == FingerprintOf(body) || IsWholeBody(m_output, body);
     }
 
     void Compare(const SetModule& module, const ModuleFile& file, std::string_view head,
@@ -136,7 +128,7 @@ private:
     {
         if (!m_first)
         {
-            m_first.emplace(body);
+            m_first = FingerprintOf(body);
             m_firstRoot = Visible(module.root);
         }
         if (head != ExpectedHead(module))
@@ -145,7 +137,7 @@ private:
                 "its links were made for other modules, or for other names or places of them: run pagemeld "
                 "again");
         }
-        else if (!(m_first == Fingerprint(body)))
+        else if (m_first != FingerprintOf(body))
         {
             Add(Rule::OutputDiffers, file,
                 "has other content than in " + m_firstRoot +
