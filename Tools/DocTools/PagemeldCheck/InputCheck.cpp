@@ -29,25 +29,6 @@ bool IsMergedPage(const Value& entry)
     return entry.IsArray() && entry.Size() == 3 && entry[2].IsInt();
 }
 
-/// Whether the text at an escape begins that of half a surrogate pair: with "\\ud", and one of the digits.
-bool IsHalf(std::string_view text, std::string_view digits)
-{
-    const std::string_view start = text.substr(1, 2);
-    return (start == "ud" || start == "uD") && text.substr(3, 1).find_first_of(digits) == 0;
-}
-
-/// Returns the position of a second half without a first one, or npos. The parser takes it, though not a
-/// first half without a second, and the outputs hold bytes for it that are not UTF-8.
-std::size_t FindLoneHalf(std::string_view text)
-{
-    std::size_t i = text.find('\\');
-    while (i != kNone && !IsHalf(text.substr(i), "cdefCDEF"))
-    {
-        i = text.find('\\', i + (IsHalf(text.substr(i), "89abAB") ? 12 : 2));
-    }
-    return i;
-}
-
 std::set<std::string> NamesOf(const Value& object)
 {
     std::set<std::string> names;

@@ -44,6 +44,14 @@ Character ReadCharacter(std::string_view text)
     return isWellFormed ? Character{code, stream.Tell()} : Character{};
 }
 
+/// Whether a text that begins with an escape begins with that of half a surrogate pair: 'u', 'd', and one of
+/// the digits follow the backslash.
+bool IsHalf(std::string_view text, std::string_view digits)
+{
+    const std::string_view start = text.substr(1, 2);
+    return (start == "ud" || start == "uD") && text.substr(3, 1).find_first_of(digits) == 0;
+}
+
 bool IsUnsafe(std::uint32_t code)
 {
     return code < 0x20 || (code >= 0x7F && code <= 0x9F) || code == 0x061C ||
@@ -112,6 +120,16 @@ std::size_t FindInvalidUtf8(std::string_view text)
         i += length;
     }
     return kNone;
+}
+
+std::size_t FindLoneHalf(std::string_view json)
+{
+    std::size_t i = json.find('\\');
+    while (i != kNone && !IsHalf(json.substr(i), "cdefCDEF"))
+    {
+        i = json.find('\\', i + (IsHalf(json.substr(i), "89abAB") ? 12 : 2));
+    }
+    return i;
 }
 
 std::string Visible(std::string_view text)

@@ -12,6 +12,11 @@
 /// overlong forms don't count as UTF-8.
 std::size_t FindInvalidUtf8(std::string_view text);
 
+/// Returns the position in a JSON text of an escape that makes the second half of a surrogate pair without
+/// the first, or npos. The parser takes it, though not a first half alone, and makes bytes of it that are not
+/// UTF-8.
+std::size_t FindLoneHalf(std::string_view json);
+
 /// Returns text with control characters, marks that reverse the direction of text and bytes that are not
 /// UTF-8 as escapes: "\n", "\x1B", "\xE9", "\u202E". So are line and paragraph separators and byte order
 /// marks.
