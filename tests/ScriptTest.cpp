@@ -1,5 +1,6 @@
 #include "Tools/DocTools/VantorPagemeld/Render/IndexScript.h"
 #include "Tools/DocTools/VantorPagemeld/Render/TocScript.h"
+#include "Tools/DocTools/VantorPagemeld/System/ScopedFile.h"
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
 #include "tests/support/CapturedStderr.h"
 #include "tests/support/Files.h"

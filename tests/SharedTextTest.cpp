@@ -1,4 +1,4 @@
-#include "Tools/DocTools/VantorPagemeld/Write/OutputFile.h"
+#include "Tools/DocTools/VantorPagemeld/Write/SharedOutput.h"
 #include "tests/support/Files.h"
 #include "tests/support/TemporaryDirectory.h"
 
@@ -56,7 +56,7 @@ int Clone(int file, unsigned long request, int original)
     return 0;
 }
 
-TEST(SharedText, EveryFileIsWholeAndACloneWherePossible)
+TEST(SharedOutput, EveryFileIsWholeAndACloneWherePossible)
 {
     constexpr std::size_t kSize = (std::size_t{1} << 20) + 1;
     const struct
@@ -79,13 +79,13 @@ TEST(SharedText, EveryFileIsWholeAndACloneWherePossible)
         std::filesystem::create_symlink("/dev/full", directory / "full.tmp");
         std::filesystem::create_symlink(directory / "a", directory / "link to a.tmp");
         const std::string text = "[" + std::string(kSize - 2, 'x') + "]";
-        SharedText shared(BufferOf(text));
+        SharedOutput shared({[](const char*) {}, false}, BufferOf(text));
         s_refusal = c.refusal;
         s_cloneSizes.clear();
         for (const std::string name : c.names)
         {
             const std::string head = name == "head" ? "head" : "";
-            ReplaceOutput(directory / name, head, shared, {[](const char*) {}, false});
+            shared.Replace(directory / name, head);
             EXPECT_EQ(name != "full", std::filesystem::exists(directory / name)) << name << ": " << c.what;
             EXPECT_TRUE(name == "full" || ReadFile(directory / name) == head + text)
                 << name << ": " << c.what;

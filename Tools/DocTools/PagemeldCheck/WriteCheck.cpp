@@ -8,6 +8,9 @@
 namespace
 {
 
+/// A run ends where it can't open the temporary file of this output; without any other, it goes on.
+constexpr Output kEndsRun = Output::IndexScript;
+
 /// Whether any of the modules has a directory for the outputs of the set after this one.
 bool IsSetAfter(const std::vector<SetModule>& modules)
 {
@@ -78,9 +81,8 @@ private:
         const std::string obstacle = DescribeObstacle(file.path);
         if (!obstacle.empty())
         {
-            const bool endsRun = output.ifUnopened == OutputRow::IfUnopened::EndRun;
             Add(file, obstacle + " is in the place of the temporary file: " +
-                          (endsRun ? EndOfRun(module) : "the run keeps the old output"));
+                          (output.id == kEndsRun ? EndOfRun(module) : "the run keeps the old output"));
         }
         else if (FileStatus::Of(file.path).IsDevice())
         {

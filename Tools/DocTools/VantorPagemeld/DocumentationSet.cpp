@@ -6,53 +6,41 @@
 #include "Tools/DocTools/VantorPagemeld/Render/IndexScript.h"
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
 
-#include <vector>
+#include <iterator>
 
 namespace
 {
 
-/// What is written under the name of a row of kOutputs.
+/// What is written under the name of an output.
 struct Content
 {
-    const OutputKind& kind;
+    const OutputRow& output;
     const JsonCombiner& combiner;
-    SharedText body;
+    SharedOutput file;
 };
-
-Content Render(Output output, const IndexCombiner& index, const TocCombiner& toc)
-{
-    switch (output)
-    {
-    case Output::IndexJson:
-        return {RapidJsonIoUtil::kJsonFile, index, SharedText(RenderPrettyJson(index.combinedDocument))};
-    case Output::IndexScript:
-        return {IndexCombiner::kScriptFile, index, SharedText(RenderIndexScript(index.combinedDocument))};
-    case Output::TocJson:
-        return {RapidJsonIoUtil::kJsonFile, toc, SharedText(RenderPrettyJson(toc.combinedDocument))};
-    case Output::TocScript:
-    case Output::Count:
-        break;
-    }
-    return {TocCombiner::kScriptFile, toc, SharedText(RenderTocScript(toc.combinedDocument))};
-}
 
 /// Writes all outputs for each module in turn. Each body is rendered only once.
 void WriteOutputs(const std::list<std::string>& modulePaths, const IndexCombiner& index,
                   const TocCombiner& toc)
 {
-    std::vector<Content> contents;
-    for (const OutputRow& output : kOutputs)
-    {
-        contents.push_back(Render(output.id, index, toc));
-    }
+    using RapidJsonIoUtil::kJsonFile;
+    Content contents[std::size(kOutputs)] = {
+        {RowOf(kOutputs, Output::IndexJson), index, {kJsonFile, RenderPrettyJson(index.combinedDocument)}},
+        {RowOf(kOutputs, Output::IndexScript),
+         index,
+         {IndexCombiner::kScriptFile, RenderIndexScript(index.combinedDocument)}},
+        {RowOf(kOutputs, Output::TocJson), toc, {kJsonFile, RenderPrettyJson(toc.combinedDocument)}},
+        {RowOf(kOutputs, Output::TocScript),
+         toc,
+         {TocCombiner::kScriptFile, RenderTocScript(toc.combinedDocument)}},
+    };
     for (const std::string& path : modulePaths)
     {
-        for (const OutputRow& output : kOutputs)
+        for (auto& [output, combiner, file] : contents)
         {
-            auto& [kind, combiner, body] = contents[static_cast<std::size_t>(output.id)];
             const bool hasPrefixes = output.form == OutputRow::Form::Script;
-            const std::string head = hasPrefixes ? combiner.PrefixLines(path.c_str()) : "";
-            ReplaceOutput(ModulePath(path).PathOf(output), head, body, kind);
+            file.Replace(ModulePath(path).PathOf(output),
+                         hasPrefixes ? combiner.PrefixLines(path.c_str()) : "");
         }
     }
 }

@@ -10,16 +10,6 @@ namespace
 
 constexpr Diagnostics kDiagnostics("./Tools/DocTools/VantorPagemeld/IndexCombiner");
 
-bool ReportAndStop(const FoundFault& found)
-{
-    const StructureFaultRow& row = RowOf(found.fault);
-    if (row.text != nullptr)
-    {
-        kDiagnostics.Warning(row.number, "%s\n", row.text);
-    }
-    return false;
-}
-
 void EndRun(const char* path)
 {
     // This message deliberately has no line break.
@@ -41,7 +31,8 @@ IndexCombiner::IndexCombiner()
 
 bool IndexCombiner::VerifyJSONStructure(const rapidjson::Value& document)
 {
-    return CheckIndexStructure(document, ReportAndStop);
+    return CheckIndexStructure(document,
+                               [](const FoundFault& found) { return WarnAndStop(kDiagnostics, found); });
 }
 
 void IndexCombiner::AppendJsonDocument(rapidjson::Document& document)
@@ -64,8 +55,7 @@ void IndexCombiner::AddModuleIndexToEachEntry(rapidjson::Document& document, int
 bool IndexCombiner::OutputJsonValueAsJs(const char* modulePath, const rapidjson::Document& document,
                                         const char* outputPath)
 {
-    SharedText script(RenderIndexScript(document));
-    return WriteOutput(outputPath, PrefixLines(modulePath), script, kScriptFile);
+    return SharedOutput(kScriptFile, RenderIndexScript(document)).Write(outputPath, PrefixLines(modulePath));
 }
 
 void IndexCombiner::CombineInfoJson(rapidjson::Value& combined, rapidjson::Value& input, int pageOffset)

@@ -2,7 +2,7 @@
 
 #include "Tools/DocTools/VantorPagemeld/JsonCombiner.h"
 #include "Tools/DocTools/VantorPagemeld/Merge/IndexMerge.h"
-#include "Tools/DocTools/VantorPagemeld/Write/OutputFile.h"
+#include "Tools/DocTools/VantorPagemeld/Write/SharedOutput.h"
 
 #include <optional>
 

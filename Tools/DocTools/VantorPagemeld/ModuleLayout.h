@@ -65,24 +65,16 @@ struct OutputRow
         Script, ///< begins with the module's prefix lines
     };
 
-    /// What a run does when it can't open the file.
-    enum class IfUnopened
-    {
-        KeepOld, ///< reports it, and goes on
-        EndRun,
-    };
-
     Output id;
     const char* name;
     Form form;
-    IfUnopened ifUnopened;
 };
 
 constexpr OutputRow kOutputs[] = {
-    {Output::IndexJson, "global_index.json", OutputRow::Form::Json, OutputRow::IfUnopened::KeepOld},
-    {Output::IndexScript, "global_index.js", OutputRow::Form::Script, OutputRow::IfUnopened::EndRun},
-    {Output::TocJson, "global_toc.json", OutputRow::Form::Json, OutputRow::IfUnopened::KeepOld},
-    {Output::TocScript, "global_toc.js", OutputRow::Form::Script, OutputRow::IfUnopened::KeepOld},
+    {Output::IndexJson, "global_index.json", OutputRow::Form::Json},
+    {Output::IndexScript, "global_index.js", OutputRow::Form::Script},
+    {Output::TocJson, "global_toc.json", OutputRow::Form::Json},
+    {Output::TocScript, "global_toc.js", OutputRow::Form::Script},
 };
 static_assert(HasRowOfEach(kOutputs));
 

@@ -71,8 +71,7 @@ std::string OutputJsonValueToString(const rapidjson::Value& value)
 
 bool OutputJsonValueToFile(const rapidjson::Value& value, const char* path)
 {
-    SharedText json(RenderPrettyJson(value));
-    return WriteOutput(path, "", json, kJsonFile);
+    return SharedOutput(kJsonFile, RenderPrettyJson(value)).Write(path, "");
 }
 
 } // namespace RapidJsonIoUtil

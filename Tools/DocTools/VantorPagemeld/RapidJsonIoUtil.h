@@ -1,6 +1,6 @@
 #pragma once
 
-#include "Tools/DocTools/VantorPagemeld/Write/OutputFile.h"
+#include "Tools/DocTools/VantorPagemeld/Write/SharedOutput.h"
 
 #include <rapidjson/document.h>
 

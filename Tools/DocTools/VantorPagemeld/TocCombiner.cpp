@@ -10,13 +10,6 @@ namespace
 
 constexpr Diagnostics kDiagnostics("./Tools/DocTools/VantorPagemeld/TocCombiner");
 
-bool ReportAndStop(const FoundFault& found)
-{
-    const StructureFaultRow& row = RowOf(found.fault);
-    kDiagnostics.Warning(row.number, "%s\n", row.text);
-    return false;
-}
-
 void ReportUnopened(const char* path)
 {
     kDiagnostics.Error(314, "Failed to open output file %s\n", path);
@@ -36,9 +29,9 @@ TocCombiner::TocCombiner()
 
 bool TocCombiner::VerifyJSONStructure(const rapidjson::Value& node)
 {
-    return CheckTocNode(node, JsonPointer(), ReportAndStop,
-                        [this](const rapidjson::Value& child, const JsonPointer&)
-                        { return VerifyJSONStructure(child); });
+    return CheckTocNode(
+        node, JsonPointer(), [](const FoundFault& found) { return WarnAndStop(kDiagnostics, found); },
+        [this](const rapidjson::Value& child, const JsonPointer&) { return VerifyJSONStructure(child); });
 }
 
 void TocCombiner::AppendJsonDocument(rapidjson::Document& document)
@@ -62,8 +55,8 @@ bool TocCombiner::OutputJsonValueAsJs(const char* modulePath, const rapidjson::D
     {
         return false;
     }
-    SharedText script(RenderTocScript(document, m_layout));
-    return WriteOutput(outputPath, PrefixLines(modulePath), script, kScriptFile);
+    return SharedOutput(kScriptFile, RenderTocScript(document, m_layout))
+        .Write(outputPath, PrefixLines(modulePath));
 }
 
 bool TocCombiner::SameLinkAndTitle(rapidjson::Value& a, rapidjson::Value& b)

@@ -3,7 +3,7 @@
 #include "Tools/DocTools/VantorPagemeld/JsonCombiner.h"
 #include "Tools/DocTools/VantorPagemeld/Merge/TocMerge.h"
 #include "Tools/DocTools/VantorPagemeld/Render/TocScript.h"
-#include "Tools/DocTools/VantorPagemeld/Write/OutputFile.h"
+#include "Tools/DocTools/VantorPagemeld/Write/SharedOutput.h"
 
 #include <optional>
 

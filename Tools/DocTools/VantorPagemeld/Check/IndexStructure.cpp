@@ -2,16 +2,20 @@
 
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 
+#include <algorithm>
 #include <cstdint>
+#include <iterator>
 
 namespace
 {
 
-using rapidjson::SizeType;
 using rapidjson::Value;
+using Member = Value::Member;
+using Fault = StructureFault;
+using Count = std::int64_t;
 
 /// The size that a missing array is given, so that numbers that refer to it are not reported as well.
-constexpr std::int64_t kUnbounded = INT64_MAX;
+constexpr Count kUnbounded = INT64_MAX;
 
 bool IsPair(const Value& entry)
 {
@@ -19,169 +23,118 @@ bool IsPair(const Value& entry)
 }
 
 /// Compares as an unsigned number: a negative one is out of bounds too.
-bool IsBelow(const Value& number, std::int64_t count)
+bool IsBelow(const Value& number, Count count)
 {
     return static_cast<std::uint32_t>(number.GetInt()) < count;
 }
 
-std::optional<StructureFault> FindPageFault(const Value& page)
+/// What an entry must fulfil, once it fulfils the requirements before this one. The count is that of the
+/// array which a number of the entry points into.
+template <typename Entry>
+struct Requirement
 {
-    if (!IsPair(page))
-    {
-        return StructureFault::PageNotPair;
-    }
-    if (!page[0].IsString() || !page[1].IsString())
-    {
-        return StructureFault::PageNotStrings;
-    }
-    return std::nullopt;
-}
+    Fault fault;
+    bool (*isMet)(const Entry& entry, Count count);
+};
 
-std::optional<StructureFault> FindInfoFault(const Value& entry, std::int64_t pageCount)
-{
-    if (!IsPair(entry))
-    {
-        return StructureFault::InfoNotPair;
-    }
-    if (!entry[0].IsString())
-    {
-        return StructureFault::InfoTextNotString;
-    }
-    if (!entry[1].IsInt())
-    {
-        return StructureFault::InfoPageNotInt;
-    }
-    if (!IsBelow(entry[1], pageCount))
-    {
-        return StructureFault::InfoPageOutOfBounds;
-    }
-    return std::nullopt;
-}
+constexpr Requirement<Value> kPage[] = {
+    {Fault::PageNotPair, [](const Value& page, Count) { return IsPair(page); }},
+    {Fault::PageNotStrings,
+     [](const Value& page, Count) { return page[0].IsString() && page[1].IsString(); }},
+};
+
+constexpr Requirement<Value> kInfo[] = {
+    {Fault::InfoNotPair, [](const Value& info, Count) { return IsPair(info); }},
+    {Fault::InfoTextNotString, [](const Value& info, Count) { return info[0].IsString(); }},
+    {Fault::InfoPageNotInt, [](const Value& info, Count) { return info[1].IsInt(); }},
+    {Fault::InfoPageOutOfBounds,
+     [](const Value& info, Count pageCount) { return IsBelow(info[1], pageCount); }},
+};
+
+constexpr Requirement<Value> kPosting[] = {
+    {Fault::PostingNotInt, [](const Value& posting, Count) { return posting.IsInt(); }},
+    {Fault::PostingOutOfBounds, IsBelow},
+};
 
 // Keys of parsed text are strings: other keys can only occur in a document that was made by hand.
 
-std::optional<StructureFault> FindCommonFault(const Value::Member& word)
-{
-    if (!word.name.IsString())
-    {
-        return StructureFault::CommonKeyNotString;
-    }
-    if (!word.value.IsInt() || word.value.GetInt() != 1)
-    {
-        return StructureFault::CommonValueNotOne;
-    }
-    return std::nullopt;
-}
+constexpr Requirement<Member> kCommonWord[] = {
+    {Fault::CommonKeyNotString, [](const Member& word, Count) { return word.name.IsString(); }},
+    {Fault::CommonValueNotOne,
+     [](const Member& word, Count) { return word.value.IsInt() && word.value.GetInt() == 1; }},
+};
 
-std::optional<StructureFault> FindTermFault(const Value::Member& term)
-{
-    if (!term.name.IsString())
-    {
-        return StructureFault::TermNotString;
-    }
-    if (!term.value.IsArray())
-    {
-        return StructureFault::TermNotArray;
-    }
-    return std::nullopt;
-}
+constexpr Requirement<Member> kTerm[] = {
+    {Fault::TermNotString, [](const Member& term, Count) { return term.name.IsString(); }},
+    {Fault::TermNotArray, [](const Member& term, Count) { return term.value.IsArray(); }},
+};
 
-std::optional<StructureFault> FindPostingFault(const Value& posting, std::int64_t infoCount)
+template <typename Entry, std::size_t size>
+std::optional<Fault> FindFault(const Requirement<Entry> (&requirements)[size], const Entry& entry,
+                               Count count = kUnbounded)
 {
-    if (!posting.IsInt())
+    for (const Requirement<Entry>& requirement : requirements)
     {
-        return StructureFault::PostingNotInt;
-    }
-    if (!IsBelow(posting, infoCount))
-    {
-        return StructureFault::PostingOutOfBounds;
-    }
-    return std::nullopt;
-}
-
-bool CheckPages(const Value& pages, const JsonPointer& pointer, const FaultHandler& onFault)
-{
-    for (SizeType i = 0; i < pages.Size(); ++i)
-    {
-        if (!HandOver(FindPageFault(pages[i]), {pointer, i}, pages[i], onFault))
+        if (!requirement.isMet(entry, count))
         {
-            return false;
+            return requirement.fault;
         }
     }
-    return true;
+    return std::nullopt;
 }
 
-bool CheckInfo(const Value& info, std::int64_t pageCount, const JsonPointer& pointer,
-               const FaultHandler& onFault)
+template <std::size_t size>
+bool CheckEntries(const Requirement<Value> (&requirements)[size], const Value& entries, Count count,
+                  const JsonPointer& pointer, const FaultHandler& onFault)
 {
-    for (SizeType i = 0; i < info.Size(); ++i)
-    {
-        if (!HandOver(FindInfoFault(info[i], pageCount), {pointer, i}, info[i], onFault))
-        {
-            return false;
-        }
-    }
-    return true;
+    return CheckElements(
+        entries, pointer,
+        [&](const Value& entry, const JsonPointer& entryPointer)
+        { return HandOver(FindFault(requirements, entry, count), entryPointer, entry, onFault); });
 }
 
 bool CheckCommon(const Value& common, const JsonPointer& pointer, const FaultHandler& onFault)
 {
-    for (const auto& word : common.GetObject())
-    {
-        if (!HandOver(FindCommonFault(word), {pointer, BytesOf(word.name)}, word.value, onFault))
-        {
-            return false;
-        }
-    }
-    return true;
+    return std::all_of(
+        common.MemberBegin(), common.MemberEnd(),
+        [&](const Member& word) {
+            return HandOver(FindFault(kCommonWord, word), {pointer, BytesOf(word.name)}, word.value, onFault);
+        });
 }
 
-bool CheckPostings(const Value& postings, std::int64_t infoCount, const JsonPointer& pointer,
-                   const FaultHandler& onFault)
+bool CheckTerm(const Member& term, Count infoCount, const JsonPointer& pointer, const FaultHandler& onFault)
 {
-    for (SizeType i = 0; i < postings.Size(); ++i)
-    {
-        if (!HandOver(FindPostingFault(postings[i], infoCount), {pointer, i}, postings[i], onFault))
-        {
-            return false;
-        }
-    }
-    return true;
+    const std::optional<Fault> fault = FindFault(kTerm, term);
+    return fault ? HandOver(fault, pointer, term.value, onFault)
+                 : CheckEntries(kPosting, term.value, infoCount, pointer, onFault);
 }
 
-bool CheckSearchIndex(const Value& searchIndex, std::int64_t infoCount, const JsonPointer& pointer,
+bool CheckSearchIndex(const Value& searchIndex, Count infoCount, const JsonPointer& pointer,
                       const FaultHandler& onFault)
 {
-    for (const auto& term : searchIndex.GetObject())
-    {
-        const JsonPointer termPointer(pointer, BytesOf(term.name));
-        const auto fault = FindTermFault(term);
-        if (fault ? !HandOver(fault, termPointer, term.value, onFault)
-                  : !CheckPostings(term.value, infoCount, termPointer, onFault))
-        {
-            return false;
-        }
-    }
-    return true;
+    return std::all_of(searchIndex.MemberBegin(), searchIndex.MemberEnd(),
+                       [&](const Member& term) {
+                           return CheckTerm(term, infoCount, {pointer, BytesOf(term.name)}, onFault);
+                       });
 }
 
-std::int64_t CountOf(const Value* array)
+struct MemberRow
+{
+    const char* name;
+    rapidjson::Type type;
+    Fault notOfType;
+};
+
+constexpr MemberRow kMembers[] = {
+    {"pages", rapidjson::kArrayType, Fault::PagesNotArray},
+    {"info", rapidjson::kArrayType, Fault::InfoNotArray},
+    {"common", rapidjson::kObjectType, Fault::CommonNotObject},
+    {"searchIndex", rapidjson::kObjectType, Fault::SearchIndexNotObject},
+};
+
+Count CountOf(const Value* array)
 {
     return array == nullptr ? kUnbounded : array->Size();
-}
-
-/// Looks for a member of a type. Sets found to it, or to null after handing over the fault. Returns whether
-/// to go on.
-bool RequireMember(const Value& document, const char* name, rapidjson::Type type, StructureFault notOfType,
-                   const FaultHandler& onFault, const Value*& found)
-{
-    found = FindMember(document, name);
-    if (found != nullptr && found->GetType() == type)
-    {
-        return true;
-    }
-    found = nullptr;
-    return HandOverMember(notOfType, JsonPointer(), document, name, onFault);
 }
 
 } // namespace
@@ -191,24 +144,25 @@ bool CheckIndexStructure(const Value& document, const FaultHandler& onFault)
     const JsonPointer root;
     if (!document.IsObject())
     {
-        return HandOver(StructureFault::NotAnObject, root, document, onFault);
+        return HandOver(Fault::NotAnObject, root, document, onFault);
     }
-    const Value* pages = nullptr;
-    const Value* info = nullptr;
-    const Value* common = nullptr;
-    const Value* searchIndex = nullptr;
-    // Each step hands over its faults and says whether to go on. One that lacks its member has nothing to
-    // look at. The types of all members come before the content of any.
-    return RequireMember(document, "pages", rapidjson::kArrayType, StructureFault::PagesNotArray, onFault,
-                         pages) &&
-           RequireMember(document, "info", rapidjson::kArrayType, StructureFault::InfoNotArray, onFault,
-                         info) &&
-           RequireMember(document, "common", rapidjson::kObjectType, StructureFault::CommonNotObject, onFault,
-                         common) &&
-           RequireMember(document, "searchIndex", rapidjson::kObjectType,
-                         StructureFault::SearchIndexNotObject, onFault, searchIndex) &&
-           (pages == nullptr || CheckPages(*pages, {root, "pages"}, onFault)) &&
-           (info == nullptr || CheckInfo(*info, CountOf(pages), {root, "info"}, onFault)) &&
+    // The types of all members come before the content of any.
+    const Value* members[std::size(kMembers)] = {};
+    for (std::size_t i = 0; i < std::size(kMembers); ++i)
+    {
+        const Value* const member = FindMember(document, kMembers[i].name);
+        if (member != nullptr && member->GetType() == kMembers[i].type)
+        {
+            members[i] = member;
+        }
+        else if (!HandOverMember(kMembers[i].notOfType, root, document, kMembers[i].name, onFault))
+        {
+            return false;
+        }
+    }
+    const auto& [pages, info, common, searchIndex] = members;
+    return (pages == nullptr || CheckEntries(kPage, *pages, kUnbounded, {root, "pages"}, onFault)) &&
+           (info == nullptr || CheckEntries(kInfo, *info, CountOf(pages), {root, "info"}, onFault)) &&
            (common == nullptr || CheckCommon(*common, {root, "common"}, onFault)) &&
            (searchIndex == nullptr ||
             CheckSearchIndex(*searchIndex, CountOf(info), {root, "searchIndex"}, onFault));

@@ -39,17 +39,9 @@ std::string EscapedPointerName(std::string_view name)
     std::string escaped;
     for (const char c : name)
     {
-        switch (c)
-        {
-        case '~':
-            escaped += "~0";
-            break;
-        case '/':
-            escaped += "~1";
-            break;
-        default:
-            escaped += c;
-        }
+        const bool isEscaped = c == '~' || c == '/';
+        escaped += isEscaped ? '~' : c;
+        escaped += isEscaped ? (c == '~' ? "0" : "1") : "";
     }
     return escaped;
 }
@@ -67,6 +59,16 @@ bool HandOverMember(StructureFault fault, const JsonPointer& pointer, const rapi
     const rapidjson::Value* const member = FindMember(object, name);
     return member == nullptr ? onFault({fault, pointer, object, nullptr})
                              : onFault({fault, {pointer, name}, *member, member});
+}
+
+bool WarnAndStop(const Diagnostics& diagnostics, const FoundFault& found)
+{
+    const StructureFaultRow& row = RowOf(found.fault);
+    if (row.text != nullptr)
+    {
+        diagnostics.Warning(row.number, "%s\n", row.text);
+    }
+    return false;
 }
 
 std::string JsonPointer::Text() const

@@ -1,5 +1,7 @@
 #pragma once
 
+#include "Tools/DocTools/VantorPagemeld/System/Diagnostics.h"
+
 #include <rapidjson/document.h>
 
 #include <functional>
@@ -98,3 +100,20 @@ inline bool HandOver(std::optional<StructureFault> fault, const JsonPointer& poi
 /// Hands over the fault of a member, or its absence from the object at pointer. Returns whether to go on.
 bool HandOverMember(StructureFault fault, const JsonPointer& pointer, const rapidjson::Value& object,
                     const char* name, const FaultHandler& onFault);
+
+/// A fault handler of the tool: reports the fault as a warning, if it has a message, and stops.
+bool WarnAndStop(const Diagnostics& diagnostics, const FoundFault& found);
+
+/// Calls `check(element, pointer)` for each element of an array. Returns false as soon as check does.
+template <typename Check>
+bool CheckElements(const rapidjson::Value& array, const JsonPointer& pointer, Check check)
+{
+    for (rapidjson::SizeType i = 0; i < array.Size(); ++i)
+    {
+        if (!check(array[i], JsonPointer(pointer, i)))
+        {
+            return false;
+        }
+    }
+    return true;
+}

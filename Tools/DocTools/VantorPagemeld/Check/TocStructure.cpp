@@ -15,18 +15,6 @@ bool RequireString(const Value& node, const JsonPointer& pointer, const char* na
     return (member != nullptr && member->IsString()) || HandOverMember(fault, pointer, node, name, onFault);
 }
 
-bool CheckChildren(const Value& children, const JsonPointer& pointer, const ChildCheck& checkChild)
-{
-    for (rapidjson::SizeType i = 0; i < children.Size(); ++i)
-    {
-        if (!checkChild(children[i], {pointer, i}))
-        {
-            return false;
-        }
-    }
-    return true;
-}
-
 bool CheckSubtree(const Value& node, const JsonPointer& pointer, const FaultHandler& onFault)
 {
     return CheckTocNode(node, pointer, onFault,
@@ -53,7 +41,7 @@ bool CheckTocNode(const Value& node, const JsonPointer& pointer, const FaultHand
     {
         return HandOverMember(StructureFault::ChildrenNotList, pointer, node, "children", onFault);
     }
-    return children->IsNull() || CheckChildren(*children, {pointer, "children"}, checkChild);
+    return children->IsNull() || CheckElements(*children, {pointer, "children"}, checkChild);
 }
 
 bool CheckTocStructure(const Value& root, const FaultHandler& onFault)
