@@ -4,7 +4,7 @@
 #include <cstdarg>
 #include <cstdio>
 #include <cstdlib>
-#include <new>
+#include <string>
 
 #include <fcntl.h>
 #include <unistd.h>
@@ -12,43 +12,22 @@
 namespace
 {
 
-/// A message that is put together in memory, and written to standard error at the end of its life. Standard
-/// error has no buffer, so what is handed over in one piece is written by one call.
-class Message
+/// Standard error has no buffer: what is handed over in one piece is written by one call.
+__attribute__((format(printf, 2, 0))) void Write(std::string message, const char* format,
+                                                 std::va_list arguments)
 {
-public:
-    Message() : m_stream(::open_memstream(&m_text, &m_size))
-    {
-        if (m_stream == nullptr)
-        {
-            throw std::bad_alloc();
-        }
-    }
+    const std::size_t start = message.size();
+    std::va_list sameArguments;
+    va_copy(sameArguments, arguments);
+    message.resize(start + static_cast<std::size_t>(std::vsnprintf(nullptr, 0, format, arguments)));
+    (void)std::vsnprintf(message.data() + start, message.size() - start + 1, format, sameArguments);
+    va_end(sameArguments);
+    (void)std::fwrite(message.data(), 1, message.size(), stderr);
+}
 
-    ~Message()
-    {
-        (void)std::fclose(m_stream);
-        (void)std::fwrite(m_text, 1, m_size, stderr);
-        std::free(m_text);
-    }
-
-    Message(const Message&) = delete;
-    Message& operator=(const Message&) = delete;
-
-    [[nodiscard]] std::FILE* Stream() const { return m_stream; }
-
-private:
-    char* m_text = nullptr;
-    std::size_t m_size = 0;
-    std::FILE* m_stream;
-};
-
-__attribute__((format(printf, 4, 0))) void Report(const char* level, const char* sourceFile, int number,
-                                                  const char* format, std::va_list arguments)
+std::string Prefix(const char* level, const char* sourceFile, int number)
 {
-    const Message message;
-    (void)std::fprintf(message.Stream(), "%s: %s:%d ", level, sourceFile, number);
-    (void)std::vfprintf(message.Stream(), format, arguments);
+    return std::string(level) + ": " + sourceFile + ":" + std::to_string(number) + " ";
 }
 
 } // namespace
@@ -57,7 +36,7 @@ void Diagnostics::Warning(int number, const char* format, ...) const
 {
     std::va_list arguments;
     va_start(arguments, format);
-    Report("WARNING", m_sourceFile, number, format, arguments);
+    Write(Prefix("WARNING", m_sourceFile, number), format, arguments);
     va_end(arguments);
 }
 
@@ -65,7 +44,7 @@ void Diagnostics::Error(int number, const char* format, ...) const
 {
     std::va_list arguments;
     va_start(arguments, format);
-    Report("ERROR", m_sourceFile, number, format, arguments);
+    Write(Prefix("ERROR", m_sourceFile, number), format, arguments);
     va_end(arguments);
 }
 
@@ -73,17 +52,16 @@ void Diagnostics::CriticalAndExit(int number, const char* format, ...) const
 {
     std::va_list arguments;
     va_start(arguments, format);
-    Report("CRITICAL", m_sourceFile, number, format, arguments);
+    Write(Prefix("CRITICAL", m_sourceFile, number), format, arguments);
     va_end(arguments);
     std::exit(-1);
 }
 
 void ReportProgress(const char* format, ...)
 {
-    const Message message;
     std::va_list arguments;
     va_start(arguments, format);
-    (void)std::vfprintf(message.Stream(), format, arguments);
+    Write("", format, arguments);
     va_end(arguments);
 }
 
