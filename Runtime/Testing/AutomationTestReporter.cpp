@@ -110,10 +110,3 @@ void AutomationTestReporter::ReportTestStatusOnFinish(const TestDetails& details
                                                   details.filename, details.lineNumber),
         kSourceFile, 110);
 }
-
-void AutomationTestReporter::ReportSummary(int /*totalTests*/, int /*failedTestCount*/, int /*failureCount*/,
-                                           float /*seconds*/)
-{
-}
-
-void AutomationTestReporter::ReportIgnoredTests(std::vector<DisabledTestInfo>& /*ignoredTests*/) {}

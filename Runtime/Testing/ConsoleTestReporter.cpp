@@ -5,6 +5,7 @@
 
 #include <algorithm>
 #include <cstdio>
+#include <tuple>
 
 using UnitTest::TestDetails;
 
@@ -41,15 +42,8 @@ core::string DescribePass(const NativeTestReporter& reporter, float seconds)
 
 void PrintFailure(const NativeTestReporter::Failure& failure)
 {
-    const char* const file = failure.filename.c_str();
-    if (failure.message.empty())
-    {
-        printf_console("\tCHECK FAILURE: (%s:%i)\n", file, failure.line);
-    }
-    else
-    {
-        printf_console("\tCHECK FAILURE: %s (%s:%i)\n", failure.message.c_str(), file, failure.line);
-    }
+    const core::string message = failure.message.empty() ? "" : failure.message + " ";
+    printf_console("\tCHECK FAILURE: %s(%s:%i)\n", message.c_str(), failure.filename.c_str(), failure.line);
     printf_console("%s", ""); // on purpose: the log handler sees an empty message after each failure
 }
 
@@ -61,15 +55,11 @@ const char* TestsWere(std::size_t count)
 /// Whether a goes before b in the report on ignored tests.
 bool GroupByBugAndReason(const DisabledTestInfo& a, const DisabledTestInfo& b)
 {
-    if (a.caseNumber != b.caseNumber)
-    {
-        return a.caseNumber > b.caseNumber;
-    }
-    if (a.reason != b.reason)
-    {
-        return a.reason > b.reason;
-    }
-    return GetDisplayedTestName(a.details).size() < GetDisplayedTestName(b.details).size();
+    const auto lengthOfName = [](const DisabledTestInfo& info)
+    { return GetDisplayedTestName(info.details).size(); };
+    // The first two descend, so a and b change places in them.
+    return std::make_tuple(b.caseNumber, b.reason, lengthOfName(a)) <
+           std::make_tuple(a.caseNumber, a.reason, lengthOfName(b));
 }
 
 bool ShareLine(const DisabledTestInfo& a, const DisabledTestInfo& b)

@@ -11,11 +11,6 @@ float ToSmallerUnit(float seconds, float unitsPerSecond)
     return rounded;
 }
 
-bool NativeTestReporter::Failure::operator==(const Failure& other) const
-{
-    return filename == other.filename && line == other.line && message == other.message;
-}
-
 void NativeTestReporter::ReportTestStart(const TestDetails& details)
 {
     if (!suppressNameOutput)

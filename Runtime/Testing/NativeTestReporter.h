@@ -3,6 +3,7 @@
 #include "Runtime/Testing/TestReporter.h"
 
 #include <map>
+#include <tuple>
 #include <vector>
 
 /// Returns seconds in a smaller unit, rounded to single precision also where the processor computes with more
@@ -20,7 +21,10 @@ public:
         int line;
         core::string message;
 
-        bool operator==(const Failure& other) const;
+        bool operator==(const Failure& other) const
+        {
+            return std::tie(filename, line, message) == std::tie(other.filename, other.line, other.message);
+        }
     };
 
     using IntraTestHandler = void (*)(const UnitTest::TestDetails& details, float seconds);

@@ -76,9 +76,7 @@ void PlatformSpecificIntraTestHandler(const UnitTest::TestDetails& /*details*/, 
 
 int RunNativeTests(const core::string& filter)
 {
-    const core::string categoryFilter;
-    const core::string& nameFilter = filter;
-    return RunNativeTests(categoryFilter, nameFilter);
+    return RunNativeTests("", filter);
 }
 
 int RunNativeTests(const core::string& categoryFilter, const core::string& nameFilter)
@@ -127,11 +125,7 @@ bool LogEntryHandlerForTests(LogType /*type*/, const char* /*format*/, std::va_l
     static std::mutex mutex;
     const std::lock_guard<std::mutex> lock(mutex);
     const NativeTestReporter* const reporter = Testing::g_TestReporter;
-    if (reporter == nullptr || !reporter->testInProgress)
-    {
-        return true;
-    }
-    return !reporter->testStarted;
+    return reporter == nullptr || !reporter->testInProgress || !reporter->testStarted;
 }
 
 bool IsNativeTestExpectingAssertionFailure(const char* /*text*/)

@@ -87,7 +87,18 @@ public:
     /// Calls visit with every test: first the product of each factory, which lives for that call only, then
     /// the test objects.
     template <class Visitor>
-    void ForEach(Visitor&& visit) const;
+    void ForEach(Visitor&& visit) const
+    {
+        for (const TestFactory* factory = m_factoryHead; factory != nullptr; factory = factory->next)
+        {
+            const std::unique_ptr<const Test> test(factory->create(factory->argument));
+            visit(test.get());
+        }
+        for (const Test* test = m_head; test != nullptr; test = test->m_nextTest)
+        {
+            visit(test);
+        }
+    }
 
 private:
     Test* m_head = nullptr;
@@ -101,19 +112,5 @@ struct ListAdder
 {
     ListAdder(TestList& tests, TestFactory* factory) { tests.AddFactory(factory); }
 };
-
-template <class Visitor>
-void TestList::ForEach(Visitor&& visit) const
-{
-    for (const TestFactory* factory = m_factoryHead; factory != nullptr; factory = factory->next)
-    {
-        const std::unique_ptr<const Test> test(factory->create(factory->argument));
-        visit(test.get());
-    }
-    for (const Test* test = m_head; test != nullptr; test = test->m_nextTest)
-    {
-        visit(test);
-    }
-}
 
 } // namespace UnitTest

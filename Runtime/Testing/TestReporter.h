@@ -1,6 +1,7 @@
 #pragma once
 
 #include "Runtime/Testing/TestDetails.h"
+#include "Runtime/Utilities/TextConversion.h"
 
 #include <variant>
 
@@ -14,15 +15,20 @@ public:
     /// The text starts with room for capacity bytes, and may outgrow it.
     explicit MemoryOutStream(int capacity = 256) { m_text.reserve(static_cast<std::size_t>(capacity)); }
 
-    MemoryOutStream& operator<<(const core::string& text);
-    MemoryOutStream& operator<<(int number);
-    MemoryOutStream& operator<<(long number);
-    MemoryOutStream& operator<<(long long number);
+    MemoryOutStream& operator<<(const core::string& text)
+    {
+        m_text += text;
+        return *this;
+    }
+
+    MemoryOutStream& operator<<(int number) { return *this << Format("%i", number); }
+    MemoryOutStream& operator<<(long number) { return *this << static_cast<long long>(number); }
+    MemoryOutStream& operator<<(long long number) { return *this << Format("%lld", number); }
 
     /// Writes an "f" after the digits, on purpose: 1.5 shows as 1.500000f.
-    MemoryOutStream& operator<<(float number);
+    MemoryOutStream& operator<<(float number) { return *this << Format("%ff", static_cast<double>(number)); }
 
-    MemoryOutStream& operator<<(double number);
+    MemoryOutStream& operator<<(double number) { return *this << Format("%f", number); }
 
     /// Returns what was written; valid until the next write.
     [[nodiscard]] const char* GetText() const { return m_text.c_str(); }

@@ -41,7 +41,18 @@ public:
     /// Runs every test of the suite (of all suites for null) for which predicate(test) is true, then
     /// finishes. Returns the number of failures.
     template <class Predicate>
-    int RunTestsIf(const TestList& tests, const char* suiteName, Predicate& predicate) const;
+    int RunTestsIf(const TestList& tests, const char* suiteName, Predicate& predicate) const
+    {
+        tests.ForEach(
+            [&](const Test* test)
+            {
+                if (IsTestInSuite(test, suiteName) && predicate(test))
+                {
+                    RunTest(m_results.get(), test);
+                }
+            });
+        return Finish();
+    }
 
     /// Returns whether the test belongs to the suite; always true for null.
     [[nodiscard]] bool IsTestInSuite(const Test* test, const char* suiteName) const;
@@ -57,19 +68,5 @@ private:
     std::unique_ptr<TestResults> m_results; ///< a pointer, since the operations that count are const
     TimerImplPosix m_timer;
 };
-
-template <class Predicate>
-int TestRunner::RunTestsIf(const TestList& tests, const char* suiteName, Predicate& predicate) const
-{
-    tests.ForEach(
-        [&](const Test* test)
-        {
-            if (IsTestInSuite(test, suiteName) && predicate(test))
-            {
-                RunTest(m_results.get(), test);
-            }
-        });
-    return Finish();
-}
 
 } // namespace UnitTest

@@ -11,15 +11,13 @@
         class Test##name : public UnitTest::Test                                                             \
         {                                                                                                    \
         public:                                                                                              \
-            Test##name()                                                                                     \
-                : Test(UnitTest::TestDetails(#name, #suite, Testing::kUnitTestCategory, file, line))         \
-            {                                                                                                \
-            }                                                                                                \
+            using Test::Test;                                                                                \
             void RunImpl() const override;                                                                   \
         };                                                                                                   \
         UnitTest::Test* CreateTest##name(void* /*argument*/)                                                 \
         {                                                                                                    \
-            return new Test##name;                                                                           \
+            return new Test##name(                                                                           \
+                UnitTest::TestDetails(#name, #suite, Testing::kUnitTestCategory, file, line));               \
         }                                                                                                    \
     }                                                                                                        \
     void Suite##suite##kUnitTestCategory::Test##name::RunImpl() const

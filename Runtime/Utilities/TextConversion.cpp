@@ -4,6 +4,7 @@
 #include <cstdarg>
 #include <cstdint>
 #include <cstdio>
+#include <iterator>
 
 namespace
 {
@@ -36,14 +37,10 @@ constexpr Utf8Form kForms[] = {
 /// Returns the form that the first byte announces, or null.
 const Utf8Form* FindForm(std::uint32_t lead)
 {
-    for (const Utf8Form& form : kForms)
-    {
-        if ((lead & form.leadMask) == form.lead)
-        {
-            return &form;
-        }
-    }
-    return nullptr;
+    const auto* const found =
+        std::find_if(std::begin(kForms), std::end(kForms),
+                     [lead](const Utf8Form& form) { return (lead & form.leadMask) == form.lead; });
+    return found == std::end(kForms) ? nullptr : found;
 }
 
 bool IsExcluded(std::uint32_t character)
