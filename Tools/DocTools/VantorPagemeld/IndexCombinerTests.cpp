@@ -19,10 +19,8 @@ constexpr const char* kSampleB = "{\"pages\":\n[[\"B\", \"B\"]],\n\"info\": \n[[
 UNIT_TEST(IndexCombiner, TryGetJsonDocFromString_ValidString_ReturnsTrue, kFile, 30)
 {
     rapidjson::Document document;
-    bool success = RapidJsonIoUtil::TryGetJsonDocFromString(kSampleA, document);
-    UnitTest::CheckAt(34, success, "success");
-    success = RapidJsonIoUtil::TryGetJsonDocFromString(kSampleB, document);
-    UnitTest::CheckAt(36, success, "success");
+    UnitTest::CheckAt(34, RapidJsonIoUtil::TryGetJsonDocFromString(kSampleA, document), "success");
+    UnitTest::CheckAt(36, RapidJsonIoUtil::TryGetJsonDocFromString(kSampleB, document), "success");
 }
 
 UNIT_TEST(IndexCombiner, AppendJsonDocument_OneValueJson_ProducesThatJson, kFile, 39)

@@ -19,10 +19,8 @@ constexpr const char* kSimpleToc = "{\"link\":\"toc\",\"title\":\"toc\",\"childr
 UNIT_TEST(TocCombiner, TryGetJsonDocFromString_ValidString_ReturnsTrue, kFile, 27)
 {
     rapidjson::Document document;
-    bool success = RapidJsonIoUtil::TryGetJsonDocFromString(kTrivialToc, document);
-    UnitTest::CheckAt(31, success, "success");
-    success = RapidJsonIoUtil::TryGetJsonDocFromString(kSimpleToc, document);
-    UnitTest::CheckAt(33, success, "success");
+    UnitTest::CheckAt(31, RapidJsonIoUtil::TryGetJsonDocFromString(kTrivialToc, document), "success");
+    UnitTest::CheckAt(33, RapidJsonIoUtil::TryGetJsonDocFromString(kSimpleToc, document), "success");
 }
 
 UNIT_TEST(TocCombiner, AppendJsonDocument_OneValueJson_ProducesThatJson, kFile, 36)

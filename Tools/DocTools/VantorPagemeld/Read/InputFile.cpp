@@ -6,6 +6,7 @@
 #include <algorithm>
 #include <cerrno>
 #include <new>
+#include <utility>
 
 #include <fcntl.h>
 #include <unistd.h>
@@ -76,19 +77,14 @@ InputText ReadInputFile(const char* path)
     }
     text.outcome = InputText::Outcome::NotWhole;
     text.size = SizeOf(file.get());
-    text.bytes = AllocateText(text.size);
-    if (text.bytes == nullptr)
+    std::unique_ptr<char[]> bytes = AllocateText(text.size);
+    const auto size = bytes == nullptr ? 0 : static_cast<std::size_t>(text.size);
+    text.bytesRead = std::fread(bytes.get(), 1, size, file.get());
+    if (bytes != nullptr && text.bytesRead == size)
     {
-        return text;
+        bytes[size] = '\0';
+        text.bytes = std::move(bytes);
+        text.outcome = InputText::Outcome::Read;
     }
-    const auto size = static_cast<std::size_t>(text.size);
-    text.bytesRead = std::fread(text.bytes.get(), 1, size, file.get());
-    if (text.bytesRead != size)
-    {
-        text.bytes.reset();
-        return text;
-    }
-    text.bytes[size] = '\0';
-    text.outcome = InputText::Outcome::Read;
     return text;
 }

@@ -7,60 +7,47 @@
 #include <cmath>
 
 // The library parses into a document without any limit on nesting: a recursion over what it accepted, its own
-// included, could overflow the stack. So its reader hands the events to a builder, which counts levels,
-// refuses what no writer could write, and passes the rest on to the document. That costs two comparisons for
-// an array or object and one for a string or double. A text that is refused is parsed twice, since only a
-// document's own parse sets its error.
+// included, could overflow the stack. So its reader hands the events to a builder, a document that counts
+// levels and refuses what no writer could write. That costs two comparisons for an array or object and one
+// for a string or double. A text that is refused is parsed twice, since only a document's own parse sets its
+// error.
 
 namespace
 {
 
-/// Hands parse events on to a document, and ends the parse at the first one that breaks a limit.
-class LimitedDocumentBuilder
+/// A document that is built of parse events, and ends the parse at the first one that breaks a limit.
+class LimitedBuilder : public rapidjson::Document
 {
 public:
-    explicit LimitedDocumentBuilder(rapidjson::Document& document) : m_document(document) {}
-
-    bool Null() { return m_document.Null(); }
-    bool Bool(bool value) { return m_document.Bool(value); }
-    bool Int(int value) { return m_document.Int(value); }
-    bool Uint(unsigned value) { return m_document.Uint(value); }
-    bool Int64(std::int64_t value) { return m_document.Int64(value); }
-    bool Uint64(std::uint64_t value) { return m_document.Uint64(value); }
+    explicit LimitedBuilder(AllocatorType& allocator) : GenericDocument(&allocator) {}
 
     /// Some numbers above the largest double arrive as an infinity, which no writer could write.
-    bool Double(double value) { return std::isfinite(value) && m_document.Double(value); }
-
-    bool RawNumber(const char* text, rapidjson::SizeType length, bool copy)
-    {
-        return m_document.RawNumber(text, length, copy);
-    }
+    bool Double(double value) { return std::isfinite(value) && GenericDocument::Double(value); }
 
     bool String(const char* text, rapidjson::SizeType length, bool copy)
     {
-        return length <= kMaxStringBytes && m_document.String(text, length, copy);
+        return length <= kMaxStringBytes && GenericDocument::String(text, length, copy);
     }
 
     bool Key(const char* text, rapidjson::SizeType length, bool copy) { return String(text, length, copy); }
-    bool StartObject() { return Enter() && m_document.StartObject(); }
-    bool StartArray() { return Enter() && m_document.StartArray(); }
+    bool StartObject() { return Enter() && GenericDocument::StartObject(); }
+    bool StartArray() { return Enter() && GenericDocument::StartArray(); }
 
     bool EndObject(rapidjson::SizeType memberCount)
     {
         --m_depth;
-        return m_document.EndObject(memberCount);
+        return GenericDocument::EndObject(memberCount);
     }
 
     bool EndArray(rapidjson::SizeType elementCount)
     {
         --m_depth;
-        return m_document.EndArray(elementCount);
+        return GenericDocument::EndArray(elementCount);
     }
 
 private:
     bool Enter() { return ++m_depth <= kMaxNestingDepth; }
 
-    rapidjson::Document& m_document;
     std::uint32_t m_depth = 0;
 };
 
@@ -100,17 +87,17 @@ rapidjson::ParseResult ParseJson(const char* text, rapidjson::Document& document
     const std::optional<std::string> guardedText = GuardNumbers(text);
     const char* const readableText = guardedText ? guardedText->c_str() : text;
     rapidjson::Reader reader;
-    const auto read = [&](rapidjson::Document& target)
+    document.Parse("null"); // a failed parse would keep an old value, and a good one an old error
+    LimitedBuilder builder(document.GetAllocator());
+    const auto read = [&](rapidjson::Document& /*builder*/)
     {
         rapidjson::StringStream stream(readableText);
-        LimitedDocumentBuilder builder(target);
         return !reader.Parse(stream, builder).IsError();
     };
-
-    document.Parse("null"); // a failed parse would keep an old value, and a good one an old error
-    document.Populate(read);
+    builder.Populate(read);
     if (!reader.HasParseError())
     {
+        static_cast<rapidjson::Value&>(document) = static_cast<rapidjson::Value&>(builder); // moves
         return {};
     }
     const rapidjson::ParseResult failure(reader.GetParseErrorCode(), reader.GetErrorOffset());

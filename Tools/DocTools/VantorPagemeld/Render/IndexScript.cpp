@@ -9,7 +9,7 @@ namespace
 void AppendPage(TextBuffer& script, const rapidjson::Value& page)
 {
     AppendText(script, "[");
-    AppendPrefixVariable(script, page[2].GetInt());
+    AppendText(script, PrefixVariable(page[2].GetInt()));
     AppendText(script, " + ");
     AppendPathLiteral(script, CStringOf(page[0]));
     AppendText(script, ", ");

@@ -28,12 +28,12 @@ std::string_view TailAfter(std::string_view toModule, std::size_t split)
     return tail;
 }
 
-std::string VariableName(int moduleIndex)
+} // namespace
+
+std::string PrefixVariable(int moduleIndex)
 {
     return "p" + std::to_string(moduleIndex);
 }
-
-} // namespace
 
 std::string RelativePrefix(std::string_view fromModule, std::string_view toModule)
 {
@@ -53,12 +53,7 @@ std::string RenderPrefixLines(std::string_view fromModule, const std::map<int, s
     std::string lines;
     for (const auto& [moduleIndex, path] : modulePathTable)
     {
-        lines += "var " + VariableName(moduleIndex) + " = \"" + RelativePrefix(fromModule, path) + "\";\n";
+        lines += "var " + PrefixVariable(moduleIndex) + " = \"" + RelativePrefix(fromModule, path) + "\";\n";
     }
     return lines;
-}
-
-void AppendPrefixVariable(TextBuffer& script, int moduleIndex)
-{
-    AppendText(script, VariableName(moduleIndex));
 }

@@ -1,13 +1,14 @@
 #pragma once
 
-#include "Tools/DocTools/VantorPagemeld/Render/TextBuffer.h"
-
 #include <map>
 #include <string>
 #include <string_view>
 
 // The variables p0, p1, ... of the scripts. Each holds the path to one merged module, so that the scripts of
 // two modules differ in these lines alone.
+
+/// Returns the name of a module's variable.
+std::string PrefixVariable(int moduleIndex);
 
 /// Returns the path from the directory fromModule to toModule as the web pages use it: "../" for every '/' in
 /// fromModule after the common start, then the rest of toModule.
@@ -22,6 +23,3 @@ std::string RelativePrefix(std::string_view fromModule, std::string_view toModul
 /// the module's variable to its relative prefix seen from fromModule. Nothing in a path is escaped, on
 /// purpose.
 std::string RenderPrefixLines(std::string_view fromModule, const std::map<int, std::string>& modulePathTable);
-
-/// Appends the name of a module's variable.
-void AppendPrefixVariable(TextBuffer& script, int moduleIndex);

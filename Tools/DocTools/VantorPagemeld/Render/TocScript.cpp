@@ -3,6 +3,7 @@
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 #include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"
 
+#include <initializer_list>
 #include <optional>
 #include <string_view>
 
@@ -65,11 +66,7 @@ public:
     {
         AppendIndent(indent);
         AppendTitleLiteral(m_script, text);
-        AppendText(m_script, extra);
-        if (newLine)
-        {
-            AppendText(m_script, "\n");
-        }
+        Append({extra, newLine ? "\n" : ""});
     }
 
 private:
@@ -78,8 +75,7 @@ private:
         AppendNodeStart(node, indent);
         AppendChildren(node["children"], indent);
         AppendIndent(indent);
-        AppendText(m_script, "}");
-        AppendLineBreak();
+        Append({"}", m_lineBreak});
     }
 
     /// Appends a node up to its children. Never inlined: its many locals would enlarge the stack frame of the
@@ -87,8 +83,7 @@ private:
     [[gnu::noinline]] void AppendNodeStart(const rapidjson::Value& node, int indent)
     {
         AppendIndent(indent);
-        AppendText(m_script, "{");
-        AppendLineBreak();
+        Append({"{", m_lineBreak});
         AppendString("link", ": ", indent + 1, false);
         AppendLink(node);
         AppendString("title", ": ", indent + 1, false);
@@ -107,12 +102,10 @@ private:
         }
         if (link != kLinkOfGroup)
         {
-            AppendPrefixVariable(m_script, *module);
-            AppendText(m_script, "+");
+            Append({PrefixVariable(*module), "+"});
         }
         AppendPathLiteral(m_script, link);
-        AppendText(m_script, ",");
-        AppendLineBreak();
+        Append({",", m_lineBreak});
     }
 
     void AppendChildren(const rapidjson::Value& children, int indent)
@@ -123,13 +116,12 @@ private:
         }
         else
         {
-            AppendText(m_script, "[");
-            AppendLineBreak();
+            Append({"[", m_lineBreak});
             AppendValue(children, indent + 2);
             AppendIndent(indent + 1);
             AppendText(m_script, "]");
         }
-        AppendLineBreak();
+        AppendText(m_script, m_lineBreak);
     }
 
     void AppendList(const rapidjson::Value& list, int indent)
@@ -140,8 +132,7 @@ private:
             if (i + 1 < list.Size())
             {
                 AppendIndent(indent + 2);
-                AppendText(m_script, ",");
-                AppendLineBreak();
+                Append({",", m_lineBreak});
             }
         }
     }
@@ -154,16 +145,17 @@ private:
         }
     }
 
-    void AppendLineBreak()
+    void Append(std::initializer_list<std::string_view> texts)
     {
-        if (m_layout.lineBreaks)
+        for (const std::string_view text : texts)
         {
-            AppendText(m_script, "\n");
+            AppendText(m_script, text);
         }
     }
 
     TextBuffer& m_script;
     const TocScriptLayout& m_layout;
+    const std::string_view m_lineBreak = m_layout.lineBreaks ? "\n" : "";
 };
 
 } // namespace

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cerrno>
 #include <cstdio>
 #include <string>
 #include <utility>
@@ -11,12 +12,12 @@ class FileStatus
 {
 public:
     /// Of what is at path, after following links.
-    static FileStatus Of(const std::string& path);
+    static FileStatus Of(const std::string& path) { return Ask(::stat, path.c_str()); }
 
     /// Of what is at path itself, which may be a link.
-    static FileStatus OfEntry(const std::string& path);
+    static FileStatus OfEntry(const std::string& path) { return Ask(::lstat, path.c_str()); }
 
-    static FileStatus Of(std::FILE* file);
+    static FileStatus Of(std::FILE* file) { return Ask(::fstat, ::fileno(file)); }
 
     /// Whether something is there. Otherwise every other question about it is answered by no.
     [[nodiscard]] bool Exists() const { return m_error == 0; }
@@ -39,6 +40,14 @@ public:
 
 private:
     FileStatus() = default;
+
+    template <class Call, class Subject>
+    static FileStatus Ask(Call call, Subject subject)
+    {
+        FileStatus status;
+        status.m_error = call(subject, &status.m_status) == 0 ? 0 : errno;
+        return status;
+    }
 
     struct stat m_status = {};
     int m_error = 0;
