@@ -42,16 +42,6 @@ struct GetLengthsOfLongestSuiteAndTestNamesState
     int longestTestNameLength = 0;
 };
 
-bool ShouldReportPerformanceData(const TestFilter& filter)
-{
-    const std::vector<core::string>& prefixes = filter.categoryPrefixes;
-    return !HasARGV("dontReportPerformanceData") &&
-           (prefixes.empty() ||
-            std::any_of(prefixes.begin(), prefixes.end(),
-                        [](const core::string& prefix)
-                        { return BeginsWithIgnoringCase(Testing::kPerformanceTestCategory, prefix); }));
-}
-
 std::unique_ptr<NativeTestReporter> CreateReporter(const TestFilter& filter)
 {
     if (!HasARGV("automated"))
@@ -59,7 +49,8 @@ std::unique_ptr<NativeTestReporter> CreateReporter(const TestFilter& filter)
         return std::make_unique<ConsoleTestReporter>();
     }
     auto reporter = std::make_unique<AutomationTestReporter>();
-    reporter->reportPerformanceData = ShouldReportPerformanceData(filter);
+    reporter->reportPerformanceData =
+        !HasARGV("dontReportPerformanceData") && filter.SelectsCategory(Testing::kPerformanceTestCategory);
     return reporter;
 }
 

@@ -18,11 +18,6 @@ TestDetails::TestDetails(const char* test, const char* suite, const char* testCa
 {
 }
 
-TestDetails::TestDetails(const TestDetails& details, int line) : TestDetails(details)
-{
-    lineNumber = line;
-}
-
 bool HasCategory(const TestDetails& details)
 {
     return details.category != nullptr && *details.category != '\0';

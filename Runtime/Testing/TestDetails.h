@@ -44,7 +44,7 @@ struct TestDetails
                 const TestAttributes* testAttributes = nullptr);
 
     /// The same test at another line: that of a failing check.
-    TestDetails(const TestDetails& details, int line);
+    TestDetails(const TestDetails& details, int line) : TestDetails(details) { lineNumber = line; }
 
     const char* suiteName = nullptr;
     const char* testName = nullptr;

@@ -28,15 +28,6 @@ bool HasPrefixedName(const TestDetails& details, std::string_view prefix)
     return BeginsWith(details.suiteName, prefix) || BeginsWith(details.testName, prefix);
 }
 
-bool IsCategorySelected(const TestDetails& details, const std::vector<core::string>& categoryPrefixes)
-{
-    const char* const category =
-        UnitTest::HasCategory(details) ? details.category : Testing::kUnitTestCategory;
-    return categoryPrefixes.empty() || std::any_of(categoryPrefixes.begin(), categoryPrefixes.end(),
-                                                   [category](const core::string& prefix)
-                                                   { return BeginsWithIgnoringCase(category, prefix); });
-}
-
 bool MatchesName(std::string_view filter, std::string_view suiteName, std::string_view testName)
 {
     const std::size_t fullStop = filter.find('.');
@@ -61,15 +52,6 @@ bool IsIgnoredByAttribute(const TestDetails& details)
             std::any_of(details.attributes->begin(), details.attributes->end(), IsConditionThatHolds));
 }
 
-void SetReason(DisabledTestInfo& info, const TestAttribute& attribute)
-{
-    info.kind = attribute.type + 1;
-    if (attribute.text != nullptr)
-    {
-        info.reason = attribute.text;
-    }
-}
-
 /// Describes why a test is ignored. If attributes of several types give a reason, the highest type counts.
 /// Only the first attribute of each type gives one: if the first condition does not hold but a later one
 /// does, the test is ignored without a reason. That is intentional.
@@ -77,19 +59,17 @@ DisabledTestInfo DescribeIgnored(const TestDetails& details)
 {
     DisabledTestInfo info;
     info.details = details;
-    if (const TestAttribute* attribute = FindAttribute(details, TestAttribute::kIgnoredForCase))
+    for (const int type :
+         {TestAttribute::kIgnoredForCase, TestAttribute::kIgnored, TestAttribute::kIgnoredIf})
     {
-        SetReason(info, *attribute);
-        info.caseNumber = attribute->caseNumber;
-    }
-    if (const TestAttribute* attribute = FindAttribute(details, TestAttribute::kIgnored))
-    {
-        SetReason(info, *attribute);
-    }
-    const TestAttribute* const condition = FindAttribute(details, TestAttribute::kIgnoredIf);
-    if (condition != nullptr && IsConditionThatHolds(condition))
-    {
-        SetReason(info, *condition);
+        const TestAttribute* const attribute = FindAttribute(details, type);
+        if (attribute == nullptr || (type == TestAttribute::kIgnoredIf && !IsConditionThatHolds(attribute)))
+        {
+            continue;
+        }
+        info.kind = type + 1;
+        info.reason = attribute->text != nullptr ? attribute->text : info.reason;
+        info.caseNumber = type == TestAttribute::kIgnoredForCase ? attribute->caseNumber : info.caseNumber;
     }
     return info;
 }
@@ -133,7 +113,7 @@ bool TestFilter::Filter(const UnitTest::Test* test) const
     {
         return false;
     }
-    if (!IsCategorySelected(details, categoryPrefixes))
+    if (!SelectsCategory(HasCategory(details) ? details.category : Testing::kUnitTestCategory))
     {
         return false;
     }
@@ -142,6 +122,13 @@ bool TestFilter::Filter(const UnitTest::Test* test) const
     return nameFilters.empty() ||
            std::any_of(nameFilters.begin(), nameFilters.end(),
                        [&](const core::string& filter) { return MatchesName(filter, suiteName, testName); });
+}
+
+bool TestFilter::SelectsCategory(const char* category) const
+{
+    return categoryPrefixes.empty() || std::any_of(categoryPrefixes.begin(), categoryPrefixes.end(),
+                                                   [category](const core::string& prefix)
+                                                   { return BeginsWithIgnoringCase(category, prefix); });
 }
 
 bool TestFilter::IsIgnored(const UnitTest::Test* test)

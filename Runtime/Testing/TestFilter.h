@@ -15,6 +15,8 @@ public:
     /// Returns whether the category and the names select the test, which may still be ignored.
     bool Filter(const UnitTest::Test* test) const;
 
+    [[nodiscard]] bool SelectsCategory(const char* category) const;
+
     /// Returns whether an attribute or the prefix "DISABLED_" of one of its names keeps the test from
     /// running.
     static bool IsIgnored(const UnitTest::Test* test);

@@ -49,7 +49,12 @@ public:
     [[nodiscard]] int GetType() const { return static_cast<int>(m_value.index()); }
 
     /// Returns the value as the console shows it: numbers as MemoryOutStream writes them, a text as it is.
-    [[nodiscard]] core::string AsString() const;
+    [[nodiscard]] core::string AsString() const
+    {
+        MemoryOutStream stream;
+        std::visit([&stream](const auto& value) { stream << value; }, m_value);
+        return stream.GetText();
+    }
 
 private:
     Value m_value;

@@ -8,11 +8,6 @@ namespace
 std::FILE* consoleStream = nullptr;
 LogEntryHandler logEntryHandler = nullptr;
 
-bool IsAccepted(const char* format, std::va_list arguments)
-{
-    return logEntryHandler == nullptr || logEntryHandler(LogType::Console, format, arguments);
-}
-
 } // namespace
 
 void SetLogEntryHandler(LogEntryHandler handler)
@@ -31,7 +26,7 @@ void printf_console(const char* format, ...)
     std::va_list sameArguments;
     va_start(arguments, format);
     va_copy(sameArguments, arguments);
-    if (IsAccepted(format, arguments))
+    if (logEntryHandler == nullptr || logEntryHandler(LogType::Console, format, arguments))
     {
         std::FILE* const stream = consoleStream == nullptr ? stdout : consoleStream;
         (void)std::vfprintf(stream, format, sameArguments);
