@@ -3,7 +3,6 @@
 #include "Tools/DocTools/VantorPagemeld/IndexCombiner.h"
 #include "Tools/DocTools/VantorPagemeld/ModuleLayout.h"
 #include "Tools/DocTools/VantorPagemeld/RapidJsonIoUtil.h"
-#include "Tools/DocTools/VantorPagemeld/Render/IndexScript.h"
 #include "Tools/DocTools/VantorPagemeld/TocCombiner.h"
 
 #include <iterator>
@@ -23,16 +22,12 @@ struct Content
 void WriteOutputs(const std::list<std::string>& modulePaths, const IndexCombiner& index,
                   const TocCombiner& toc)
 {
-    using RapidJsonIoUtil::kJsonFile;
+    using RapidJsonIoUtil::JsonOutput;
     Content contents[std::size(kOutputs)] = {
-        {RowOf(kOutputs, Output::IndexJson), index, {kJsonFile, RenderPrettyJson(index.combinedDocument)}},
-        {RowOf(kOutputs, Output::IndexScript),
-         index,
-         {IndexCombiner::kScriptFile, RenderIndexScript(index.combinedDocument)}},
-        {RowOf(kOutputs, Output::TocJson), toc, {kJsonFile, RenderPrettyJson(toc.combinedDocument)}},
-        {RowOf(kOutputs, Output::TocScript),
-         toc,
-         {TocCombiner::kScriptFile, RenderTocScript(toc.combinedDocument)}},
+        {RowOf(kOutputs, Output::IndexJson), index, JsonOutput(index.combinedDocument)},
+        {RowOf(kOutputs, Output::IndexScript), index, index.ScriptOutput(index.combinedDocument)},
+        {RowOf(kOutputs, Output::TocJson), toc, JsonOutput(toc.combinedDocument)},
+        {RowOf(kOutputs, Output::TocScript), toc, toc.ScriptOutput(toc.combinedDocument)},
     };
     for (const std::string& path : modulePaths)
     {

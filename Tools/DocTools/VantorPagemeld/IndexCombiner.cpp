@@ -18,8 +18,6 @@ void EndRun(const char* path)
 
 } // namespace
 
-const OutputKind IndexCombiner::kScriptFile = {EndRun, false};
-
 IndexCombiner::IndexCombiner()
 {
     defaultJson = "{\"pages\":[],\n\"info\": [],\n\"common\": {},\n\"searchIndex\": {}}\n";
@@ -55,7 +53,12 @@ void IndexCombiner::AddModuleIndexToEachEntry(rapidjson::Document& document, int
 bool IndexCombiner::OutputJsonValueAsJs(const char* modulePath, const rapidjson::Document& document,
                                         const char* outputPath)
 {
-    return SharedOutput(kScriptFile, RenderIndexScript(document)).Write(outputPath, PrefixLines(modulePath));
+    return ScriptOutput(document).Write(outputPath, PrefixLines(modulePath));
+}
+
+SharedOutput IndexCombiner::ScriptOutput(const rapidjson::Document& document) const
+{
+    return {{EndRun, false}, RenderIndexScript(document)};
 }
 
 void IndexCombiner::CombineInfoJson(rapidjson::Value& combined, rapidjson::Value& input, int pageOffset)

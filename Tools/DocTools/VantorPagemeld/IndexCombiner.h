@@ -12,9 +12,6 @@
 class IndexCombiner : public JsonCombiner
 {
 public:
-    /// The kind of file that OutputJsonValueAsJs writes.
-    static const OutputKind kScriptFile;
-
     /// Starts with an empty search index.
     IndexCombiner();
 
@@ -30,6 +27,9 @@ public:
     /// Ends the process with status 255 when the file can't be opened.
     bool OutputJsonValueAsJs(const char* modulePath, const rapidjson::Document& document,
                              const char* outputPath) override;
+
+    /// Returns what OutputJsonValueAsJs writes after the prefix lines, for many files.
+    [[nodiscard]] SharedOutput ScriptOutput(const rapidjson::Document& document) const;
 
     /// Moves the entries of input to the end of combined, their page numbers raised by pageOffset.
     void CombineInfoJson(rapidjson::Value& combined, rapidjson::Value& input, int pageOffset);

@@ -20,7 +20,7 @@ JsonCombiner::~JsonCombiner()
 
 bool JsonCombiner::CombineJson(const std::list<std::string>& modulePaths, const std::string& fileName)
 {
-    ++m_callCount;
+    m_hasMerged = false;
     int nextModuleIndex = 0;
     for (const std::string& path : modulePaths)
     {
@@ -44,8 +44,7 @@ bool JsonCombiner::ContinuesMerging(const rapidjson::Document& document)
 {
     // Other callers of AppendJsonDocument bring documents of their own.
     const bool isModule = !moduleDocuments.empty() && moduleDocuments.back().get() == &document;
-    const int call = isModule ? m_callCount : 0;
-    return std::exchange(m_mergedCall, call) == call && isModule;
+    return std::exchange(m_hasMerged, isModule) && isModule;
 }
 
 void JsonCombiner::SetModulePathAtIndex(int moduleIndex, const std::string& path)

@@ -84,6 +84,6 @@ public:
     rapidjson::Document combinedDocument;
 
 private:
-    int m_callCount = 0;  ///< of CombineJson
-    int m_mergedCall = 0; ///< the one whose document was last passed to ContinuesMerging; 0 if it was of none
+    /// Whether the document that was last passed to ContinuesMerging is of the running call of CombineJson.
+    bool m_hasMerged = false;
 };

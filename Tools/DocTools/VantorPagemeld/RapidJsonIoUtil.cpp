@@ -9,25 +9,6 @@ namespace
 
 constexpr Diagnostics kDiagnostics("./Tools/DocTools/VantorPagemeld/RapidJsonIoUtil");
 
-/// Returns the text of the file at path, or null after a warning when it can't be read.
-std::unique_ptr<char[]> ReadOrWarn(const char* path)
-{
-    InputText text = ReadInputFile(path);
-    switch (text.outcome)
-    {
-    case InputText::Outcome::NotOpened:
-        kDiagnostics.Warning(47, "Unable to read %s\n", path);
-        break;
-    case InputText::Outcome::NotWhole:
-        kDiagnostics.Warning(60, "Unable to read entire file %s, requested %d, got %d bytes\n", path,
-                             static_cast<int>(text.size), static_cast<int>(text.bytesRead));
-        break;
-    case InputText::Outcome::Read:
-        break;
-    }
-    return std::move(text.bytes);
-}
-
 void ReportUnopened(const char* path)
 {
     kDiagnostics.Warning(23, "Failed to open %s for writing\n", path);
@@ -38,16 +19,22 @@ void ReportUnopened(const char* path)
 namespace RapidJsonIoUtil
 {
 
-const OutputKind kJsonFile = {ReportUnopened, true};
-
 bool TryGetJsonDocFromFile(const char* path, rapidjson::Document& document)
 {
-    const std::unique_ptr<char[]> text = ReadOrWarn(path);
-    if (text == nullptr)
+    const InputText text = ReadInputFile(path);
+    switch (text.outcome)
     {
+    case InputText::Outcome::NotOpened:
+        kDiagnostics.Warning(47, "Unable to read %s\n", path);
         return false;
+    case InputText::Outcome::NotWhole:
+        kDiagnostics.Warning(60, "Unable to read entire file %s, requested %d, got %d bytes\n", path,
+                             static_cast<int>(text.size), static_cast<int>(text.bytesRead));
+        return false;
+    case InputText::Outcome::Read:
+        break;
     }
-    const rapidjson::ParseResult result = ParseJson(text.get(), document);
+    const rapidjson::ParseResult result = ParseJson(text.bytes.get(), document);
     if (result.IsError())
     {
         kDiagnostics.Error(71, "Failed to parse JSON file %s, error at offset: %d\n", path,
@@ -69,9 +56,14 @@ std::string OutputJsonValueToString(const rapidjson::Value& value)
     return text.GetString();
 }
 
+SharedOutput JsonOutput(const rapidjson::Value& value)
+{
+    return {{ReportUnopened, true}, RenderPrettyJson(value)};
+}
+
 bool OutputJsonValueToFile(const rapidjson::Value& value, const char* path)
 {
-    return SharedOutput(kJsonFile, RenderPrettyJson(value)).Write(path, "");
+    return JsonOutput(value).Write(path, "");
 }
 
 } // namespace RapidJsonIoUtil

@@ -31,7 +31,7 @@ std::string OutputJsonValueToString(const rapidjson::Value& value);
 /// written, even if the disk filled up meanwhile: this is intentional.
 bool OutputJsonValueToFile(const rapidjson::Value& value, const char* path);
 
-/// The kind of file that OutputJsonValueToFile writes.
-extern const OutputKind kJsonFile;
+/// Returns what OutputJsonValueToFile writes, for many files.
+SharedOutput JsonOutput(const rapidjson::Value& value);
 
 } // namespace RapidJsonIoUtil

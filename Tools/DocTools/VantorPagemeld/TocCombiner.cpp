@@ -17,8 +17,6 @@ void ReportUnopened(const char* path)
 
 } // namespace
 
-const OutputKind TocCombiner::kScriptFile = {ReportUnopened, false};
-
 TocCombiner::TocCombiner()
 {
     if (!RapidJsonIoUtil::TryGetJsonDocFromString(defaultJson.c_str(), combinedDocument))
@@ -55,8 +53,12 @@ bool TocCombiner::OutputJsonValueAsJs(const char* modulePath, const rapidjson::D
     {
         return false;
     }
-    return SharedOutput(kScriptFile, RenderTocScript(document, m_layout))
-        .Write(outputPath, PrefixLines(modulePath));
+    return ScriptOutput(document).Write(outputPath, PrefixLines(modulePath));
+}
+
+SharedOutput TocCombiner::ScriptOutput(const rapidjson::Document& document) const
+{
+    return {{ReportUnopened, false}, RenderTocScript(document, m_layout)};
 }
 
 bool TocCombiner::SameLinkAndTitle(rapidjson::Value& a, rapidjson::Value& b)

@@ -12,9 +12,6 @@
 class TocCombiner : public JsonCombiner
 {
 public:
-    /// The kind of file that OutputJsonValueAsJs writes.
-    static const OutputKind kScriptFile;
-
     /// Starts with an empty object.
     TocCombiner();
 
@@ -32,6 +29,9 @@ public:
     /// without a file when the root has no link or no title.
     bool OutputJsonValueAsJs(const char* modulePath, const rapidjson::Document& document,
                              const char* outputPath) override;
+
+    /// Returns what OutputJsonValueAsJs writes after the prefix lines, for many files.
+    [[nodiscard]] SharedOutput ScriptOutput(const rapidjson::Document& document) const;
 
     /// Whether two nodes count as the same entry: equal links and equal titles, each as NUL-terminated text.
     bool SameLinkAndTitle(rapidjson::Value& a, rapidjson::Value& b);

@@ -3,9 +3,6 @@
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 #include "Tools/DocTools/VantorPagemeld/System/EnumTable.h"
 
-#include <algorithm>
-#include <vector>
-
 namespace
 {
 
@@ -73,15 +70,13 @@ bool WarnAndStop(const Diagnostics& diagnostics, const FoundFault& found)
 
 std::string JsonPointer::Text() const
 {
-    std::vector<const JsonPointer*> steps;
+    std::string reversed;
     for (const JsonPointer* pointer = this; pointer->m_parent != nullptr; pointer = pointer->m_parent)
     {
-        steps.push_back(pointer);
+        const std::string step = pointer->StepText();
+        reversed.append(step.rbegin(), step.rend()).append("/");
     }
-    std::string text;
-    std::for_each(steps.rbegin(), steps.rend(),
-                  [&](const JsonPointer* step) { text.append("/").append(step->StepText()); });
-    return text;
+    return {reversed.rbegin(), reversed.rend()};
 }
 
 std::string JsonPointer::StepText() const

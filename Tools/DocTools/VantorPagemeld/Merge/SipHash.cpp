@@ -7,15 +7,11 @@
 namespace
 {
 
-std::uint64_t RandomWord(std::random_device& device)
-{
-    return static_cast<std::uint64_t>(device()) << 32 | device();
-}
-
 SipKey DrawKey()
 {
     std::random_device device;
-    return {RandomWord(device), RandomWord(device)};
+    const auto drawWord = [&device] { return static_cast<std::uint64_t>(device()) << 32 | device(); };
+    return {drawWord(), drawWord()};
 }
 
 constexpr std::uint64_t RotateLeft(std::uint64_t value, int bits)

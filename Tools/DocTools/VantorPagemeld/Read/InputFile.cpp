@@ -31,12 +31,8 @@ int OpenDescriptor(const char* path)
 ScopedFile OpenForReading(const char* path)
 {
     const int descriptor = OpenDescriptor(path);
-    if (descriptor < 0)
-    {
-        return nullptr;
-    }
-    ScopedFile file(::fdopen(descriptor, "rb"));
-    if (file == nullptr)
+    ScopedFile file(descriptor < 0 ? nullptr : ::fdopen(descriptor, "rb"));
+    if (file == nullptr && descriptor >= 0)
     {
         (void)::close(descriptor);
     }

@@ -53,19 +53,13 @@ private:
 
 /// A stream that holds nothing and is at a given offset: parsing it fails there. This is the
 /// only way to give a document an error that one of our own limits found.
-struct FailedStream
+struct FailedStream : rapidjson::StringStream
 {
-    using Ch = char;
+    explicit FailedStream(std::size_t failure) : GenericStringStream(""), offset(failure) {}
+
+    [[nodiscard]] std::size_t Tell() const { return offset; }
 
     std::size_t offset;
-
-    [[nodiscard]] char Peek() const { return '\0'; }
-    [[nodiscard]] std::size_t Tell() const { return offset; }
-    char Take() { return '\0'; }
-    char* PutBegin() { return nullptr; }
-    void Put(char) {}
-    void Flush() {}
-    std::size_t PutEnd(char*) { return 0; }
 };
 
 /// Leaves the document null, with the failure as its parse error.
@@ -73,7 +67,7 @@ void RecordFailure(rapidjson::Document& document, const char* text, const rapidj
 {
     if (failure.Code() == rapidjson::kParseErrorTermination)
     {
-        FailedStream stream{failure.Offset()};
+        FailedStream stream(failure.Offset());
         document.ParseStream(stream);
         return;
     }

@@ -72,16 +72,10 @@ std::size_t FindStringEnd(const std::string& text, std::size_t start)
 /// Makes an exponent of count digits one of at most nine significant digits, with zeros before them.
 void CutExponent(std::string& text, std::size_t start, std::size_t count)
 {
-    if (count <= kMaxExponentDigits)
+    const std::size_t cut = count - std::min(count, kMaxExponentDigits);
+    if (text.find_first_not_of('0', start) < start + cut)
     {
-        return;
-    }
-    const auto first = text.begin() + static_cast<std::ptrdiff_t>(start);
-    const auto kept = first + static_cast<std::ptrdiff_t>(count - kMaxExponentDigits);
-    if (std::any_of(first, kept, [](char digit) { return digit != '0'; }))
-    {
-        std::fill(first, kept, '0');
-        std::fill_n(kept, kMaxExponentDigits, '9');
+        text.replace(start, count, std::string(cut, '0') + std::string(kMaxExponentDigits, '9'));
     }
 }
 

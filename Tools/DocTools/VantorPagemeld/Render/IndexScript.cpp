@@ -3,13 +3,15 @@
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 #include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"
 
+// The paths of pages are expressions, so no JSON writer can write pages. The three other members are JSON.
+
 namespace
 {
 
 void AppendPage(TextBuffer& script, const rapidjson::Value& page)
 {
     AppendText(script, "[");
-    AppendText(script, PrefixVariable(page[2].GetInt()));
+    AppendText(script, PrefixVariable(page[2].GetInt())); // the module, which tagging has appended
     AppendText(script, " + ");
     AppendPathLiteral(script, CStringOf(page[0]));
     AppendText(script, ", ");

@@ -14,6 +14,7 @@ std::size_t FindSplit(std::string_view fromModule, std::string_view toModule)
     const auto common = static_cast<std::size_t>(difference.second - toModule.begin());
     if (common == toModule.size() || toModule[common] != '/')
     {
+        // The names diverge within, as "charts" and "chapters" do: the directory that holds both counts.
         const std::size_t slash = toModule.substr(0, common).rfind('/');
         return slash == std::string_view::npos ? 0 : slash;
     }
@@ -23,6 +24,7 @@ std::size_t FindSplit(std::string_view fromModule, std::string_view toModule)
 /// Returns toModule after the split and after every '/' that is there.
 std::string_view TailAfter(std::string_view toModule, std::size_t split)
 {
+    // There are two in a row where a root was typed with a '/' at its end.
     std::string_view tail = toModule.substr(split);
     tail.remove_prefix(std::min(tail.find_first_not_of('/'), tail.size()));
     return tail;

@@ -12,14 +12,15 @@ std::string_view TextOf(const TextBuffer& buffer)
 
 void AppendText(TextBuffer& buffer, std::string_view text)
 {
-    if (!text.empty())
+    if (!text.empty()) // an empty view may be of null, from which memcpy must not copy even nothing
     {
         std::memcpy(buffer.Push(text.size()), text.data(), text.size());
     }
 }
 
-void AppendEscapingQuotes(TextBuffer& buffer, std::string_view text)
+void AppendTitleLiteral(TextBuffer& buffer, const char* text)
 {
+    AppendText(buffer, "\"");
     std::string_view rest = text;
     for (std::size_t quote = rest.find('"'); quote != std::string_view::npos; quote = rest.find('"'))
     {
@@ -28,12 +29,6 @@ void AppendEscapingQuotes(TextBuffer& buffer, std::string_view text)
         rest.remove_prefix(quote + 1);
     }
     AppendText(buffer, rest);
-}
-
-void AppendTitleLiteral(TextBuffer& buffer, const char* text)
-{
-    AppendText(buffer, "\"");
-    AppendEscapingQuotes(buffer, text);
     AppendText(buffer, "\"");
 }
 
@@ -47,7 +42,7 @@ void AppendPathLiteral(TextBuffer& buffer, const char* text)
 void AppendCompactJson(TextBuffer& buffer, const rapidjson::Value& value)
 {
     rapidjson::Writer<TextBuffer> writer(buffer);
-    value.Accept(writer);
+    value.Accept(writer); // can't fail: the reader refuses the infinities that no writer takes
 }
 
 TextBuffer RenderPrettyJson(const rapidjson::Value& value)

@@ -17,11 +17,9 @@ using TextBuffer = rapidjson::StringBuffer;
 /// Appends text at the end. Bytes are taken as they are, NUL included.
 void AppendText(TextBuffer& buffer, std::string_view text);
 
-/// Appends text with a backslash before every double quote. That is the whole escape rule of the scripts'
-/// titles: backslashes, control characters and bytes above 0x7F pass as they are, on purpose.
-void AppendEscapingQuotes(TextBuffer& buffer, std::string_view text);
-
-/// Appends a title as the scripts hold it: in double quotes, with AppendEscapingQuotes.
+/// Appends a title as the scripts hold it: in double quotes, with a backslash before every one inside. That
+/// is the whole escape rule: backslashes, control characters and bytes above 0x7F pass as they are, on
+/// purpose.
 void AppendTitleLiteral(TextBuffer& buffer, const char* text);
 
 /// Appends a page path or link as the scripts hold it: in double quotes, deliberately not escaped at all.
