@@ -66,15 +66,15 @@ struct OutputRow
     };
 
     Output id;
-    const char* name;
     Form form;
+    const char* name;
 };
 
 constexpr OutputRow kOutputs[] = {
-    {Output::IndexJson, "global_index.json", OutputRow::Form::Json},
-    {Output::IndexScript, "global_index.js", OutputRow::Form::Script},
-    {Output::TocJson, "global_toc.json", OutputRow::Form::Json},
-    {Output::TocScript, "global_toc.js", OutputRow::Form::Script},
+    {Output::IndexJson, OutputRow::Form::Json, "global_index.json"},
+    {Output::IndexScript, OutputRow::Form::Script, "global_index.js"},
+    {Output::TocJson, OutputRow::Form::Json, "global_toc.json"},
+    {Output::TocScript, OutputRow::Form::Script, "global_toc.js"},
 };
 static_assert(HasRowOfEach(kOutputs));
 
