@@ -252,7 +252,6 @@ TEST(CheckerAgreement, TellsWhenARunWouldChangeItsOutputs)
         "rm -r */Manual/docdata/[it]*.json",
         "sed -i '/^var p0/d' third/Manual/docdata/global_index.js",
         "sed -i 's/^var p0.*/var p0 = \"nonsense\";/' first/Manual/docdata/global_toc.js",
-        "truncate -s -9 second/Manual/docdata/global_index.json",
         "truncate -s -1 third/Manual/docdata/global_toc.js",
     };
     std::map<std::string, int> toldCounts;

@@ -18,12 +18,6 @@
 TEST(PagemeldCheck, ShowsFindingsInTheFormAskedFor)
 {
     ExpectReports({
-        {"CHECK -n 1 @/a @/b # A limit cuts each rule of a file",
-         {{"b/Manual/docdata/index.json", Index("1,2,\"\351\"")}},
-         R"(@/b/Manual/docdata/index.json:1:11: error: page entry is 1, not [path, title]; "b" will be missing from the search of Manual [structure] /pages/0
-@/b/Manual/docdata/index.json:1:16: warning: byte \xE9 is not UTF-8: readers see a replacement character [invalid-utf8]
-@/b/Manual/docdata/index.json: error: 2 more of this rule; --limit=0 shows all [structure]
-2 modules, 3 errors, 1 warning; missing from the search of Manual: b, status 1)"},
         {"CHECK -n 1 -f json @/a @/b # A limit is said in JSON",
          {{"b/Manual/docdata/index.json", Index("1,2,3")}},
          R"({"level":"error","rule":"structure","file":"@/b/Manual/docdata/index.json","line":1,"column":11,"offset":10,"pointer":"/pages/0","module":"@/b","set":"Manual","message":"page entry is 1, not [path, title]; \"b\" will be missing from the search of Manual"}
