@@ -1,4 +1,5 @@
 #include "Tools/DocTools/VantorPagemeld/Write/SharedOutput.h"
+
 #include "tests/support/Files.h"
 #include "tests/support/TemporaryDirectory.h"
 
