@@ -29,7 +29,7 @@
         create("div", { class: "pagemeld-finder" }, form, status, results, more), contents);
     const dialog = create("dialog", { id: "pagemeld", "aria-label": "All modules" });
 
-    const kept = history.state?.pagemeld; // before the page's own scripts replace it, as Sphinx's do
+    let kept = history.state?.pagemeld; // before the page's own scripts replace it, as Sphinx's do
     const needIndex = once(loadIndexes);
     const needContents = once(loadContents);
     const lookups = []; // of the sets that are loaded, the own one first
@@ -108,6 +108,7 @@
     }
 
     function listen() {
+        addEventListener("pageshow", focusChosen); // Back to a page that the browser kept may lose the focus
         addEventListener("keydown", onKey);
         ["keydown", "keypress", "keyup"].forEach((type) => addEventListener(type, onDialogKey, true));
         box.onfocus = needIndex;
@@ -183,54 +184,41 @@
         return true;
     }
 
-    // The set being read, then the other one, unless the tag names the sets to search and leaves it out.
+    // The set being read, then the other one, unless the tag names the sets to search and leaves it out. The contents end
+    // with the other set: its first page of this module.
     async function loadIndexes() {
         status.textContent = "Loading the search index";
-        const own = await loadLookup(docdata);
-        if (!own) {
+        if (!await addIndex(docdata)) {
             status.textContent = "Search is not available: global_index.js did not run";
             return;
         }
-        join(own);
-        const set = OTHER_SET[own.set];
-        const isAsked = set && (tag.dataset.sets ?? set).includes(set);
-        const other = isAsked ? await loadLookup(new URL(`../../${set}/docdata/`, docdata)) : null;
-        if (other) {
-            join(other);
+        const set = OTHER_SET[lookups[0].set];
+        const from = new URL(`../../${set}/docdata/`, docdata);
+        if (set && (tag.dataset.sets ?? set).includes(set) && await addIndex(from)) {
+            const first = lookups[1].pages[lookups[1].prefixes.indexOf("")];
             await needContents();
-            offerSet(other);
+            contents.append(first ? createLink(first[0], set, [], from) : "");
         }
     }
 
-    // Loads the search index in a docdata. Returns null if it did not run.
-    async function loadLookup(from) {
+    // Adds the search index in a docdata. The results that are shown stay where they are. Returns whether the index ran.
+    async function addIndex(from) {
         const [source, all] = await run(`${from}global_index.js`, new URL("pagemeld-search.js", ownAddress));
-        if (!["pages", "info", "common", "searchIndex", "prepareIndex"].every((name) => source[name])) {
-            return null;
+        const hasRun = ["pages", "info", "common", "searchIndex", "prepareIndex"].every((name) => source[name]);
+        if (hasRun) {
+            const nameOfModule = (prefix) => [prefix, nameOf(createLink(prefix, "", [prefix], from), -3)];
+            const modules = Object.fromEntries(["", ...all].map(nameOfModule));
+            search = source;
+            lookups.push({ ...await finish(source.prepareIndex(source, all)), from, set: nameOf(from, -3), modules });
+            addToFilter(lookups.at(-1));
+            findAll(found.pages.slice(0, results.childElementCount));
         }
-        search = source;
-        const moduleOf = (prefix) => nameOf(createLink(prefix, "", [prefix], from), -3);
-        const modules = Object.fromEntries(["", ...all].map((prefix) => [prefix, moduleOf(prefix)]));
-        return { ...await finish(source.prepareIndex(source, all)), from, set: nameOf(from, -3), modules };
-    }
-
-    // The results that are shown stay where they are; those of the other set come after them.
-    function join(lookup) {
-        lookups.push(lookup);
-        addToFilter(lookup);
-        findAll(found.pages.slice(0, results.childElementCount));
-    }
-
-    // The contents end with the other set: its first page of this module.
-    function offerSet({ set, from, pages, prefixes }) {
-        const first = pages[prefixes.indexOf("")];
-        contents.append(first ? createLink(first[0], set, [], from) : "");
+        return hasRun;
     }
 
     function addToFilter({ set, modules }) {
-        const values = [set, ...Object.values(modules).map((name) => `${set}/${name}`).sort()];
-        const each = values.filter((value, i) => value !== values[i - 1]);
-        filter.append(...each.map((value) => create("option", { value }, value)));
+        const values = new Set([set, ...Object.values(modules).map((name) => `${set}/${name}`).sort()]);
+        filter.append(...Array.from(values, (value) => create("option", { value }, value)));
         filter.parentElement.hidden = filter.length < 4; // all, this set, and one module are the same
     }
 
@@ -246,15 +234,15 @@
     }
 
     function findAll(shown) {
-        const isShown = ({ page, weighed }) =>
-            shown.some((one) => one.page === page && one.weighed.lookup === weighed.lookup);
+        const isShown = ({ page, asked }) =>
+            shown.some((one) => one.page === page && one.asked.lookup === asked.lookup);
         found = search.findPages(lookups, box.value, accepts);
         found.pages = shown.concat(found.pages.filter((page) => !isShown(page)));
         const { length } = found.pages;
         const whole = found.pages.filter(({ isWhole }) => isWhole).length;
         const count = ["Nothing", "1 page"][length] ?? `${length} pages`;
         const rest = whole === length ? "" : `, ${whole || "none"} with all words`;
-        status.textContent = found.query.keys.length > 0 ? `${count} found${rest}` : "";
+        status.textContent = found.words.length > 0 ? `${count} found${rest}` : "";
         showResults(shown.length);
     }
 
@@ -271,9 +259,9 @@
     }
 
     function createResult(page) {
-        const { set, modules, from, prefixes } = page.weighed.lookup;
+        const { set, modules, from, prefixes } = page.asked.lookup;
         const prefix = prefixes[page.page];
-        const shown = search.describePage(page, found.query);
+        const shown = search.describePage(page);
         const linkTo = ({ link, title }) => createLink(link, title, [prefix], from);
         const result = create("li", {}, linkTo(shown), " ",
             create("span", {}, lookups.length > 1 ? `${modules[prefix]}, ${set}` : modules[prefix]),
@@ -290,20 +278,26 @@
         const address = new URL(document.URL);
         const others = address.search.replace(/[?&]pagemeld=[^&]*/, "");
         address.search = others + (query ? `${others && "&"}pagemeld=${encodeURIComponent(query)}` : "");
-        const pagemeld = { module: filter.value, shown: results.childElementCount, chosen };
-        history.replaceState({ ...history.state, pagemeld }, "", address.href);
+        kept = { module: filter.value, shown: results.childElementCount, chosen };
+        history.replaceState({ ...history.state, pagemeld: kept }, "", address.href);
     }
 
     // Once the indexes are there: as it was when the reader left for a result.
     async function restoreQuery(query) {
+        const before = kept;
         box.value = query;
         await needIndex();
-        if (kept) {
+        if (before) {
+            kept = before;
             filter.value = kept.module;
             update();
             showResults(kept.shown);
-            [...results.querySelectorAll("a")].find(({ href }) => href === kept.chosen)?.focus();
+            focusChosen();
         }
+    }
+
+    function focusChosen() {
+        [...results.querySelectorAll("a")].find(({ href }) => href === kept?.chosen)?.focus();
     }
 
     async function loadContents() {
