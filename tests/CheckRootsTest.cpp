@@ -25,7 +25,8 @@ TEST(PagemeldCheck, FindsModulesAsARunDoes)
          R"(@/c: error: no directory below it has Manual/docdata: nothing will be combined [no-modules]
 0 modules, 1 error, 0 warnings, status 1)"},
         {"CHECK -d @ # What looks like a module and is not taken is named",
-         {{"c/.h/ScriptReference/docdata", kDirectory},
+         {{"ScriptReference/docdata", kDirectory},
+          {"c/.h/ScriptReference/docdata", kDirectory},
           {"c/.i/Manual", kDirectory},
           {"c/k", kLink + "c/.h"},
           {"c/l", kLink + "a"}, // which is found under its own name
@@ -41,6 +42,7 @@ TEST(PagemeldCheck, FindsModulesAsARunDoes)
           {"c/w/x/y/Manual/docdata", kDirectory},
           {"c/w/x/y/z/Manual/docdata", kDirectory}},
          R"(@/c/w/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
+@: warning: is a module itself, which is not looked for: its pages will be missing [passed-over]
 @/c/.h: warning: a hidden module is not taken: its pages will be missing [passed-over]
 @/c/k: warning: a link to a module is not followed: its pages will be missing [passed-over]
 @/c/n: warning: a link to a directory of modules is not followed: their pages will be missing [passed-over]
@@ -49,7 +51,7 @@ TEST(PagemeldCheck, FindsModulesAsARunDoes)
 @/c/u/Manual: warning: has pages but no docdata, so it is not taken: its pages will be missing [passed-over]
 @/c/v: warning: has docdata itself, which belongs one level deeper, into a directory Manual: its pages will be missing [passed-over]
 @/c/w/x/y: warning: a module inside @/c/w is not looked for: its pages will be missing [passed-over]
-3 modules, 0 errors, 8 warnings, status 0)"},
+3 modules, 0 errors, 9 warnings, status 0)"},
         {"chmod 0 c; AS_USER CHECK -d @ # What may hold modules can be listed",
          {{"c/d", kModule}},
          R"(@/c: warning: can't be listed, so the modules below it are not found [passed-over]
@@ -101,28 +103,30 @@ TEST(PagemeldCheck, FollowsLinksFromRootToRoot)
           {"n/x\"y", kModule},
           {"n/\xE9", kModule}},
          R"(@/n/m1: error: links to @/n/a\d and 1 more will lead to @/n/ad/Manual: rename the directory [wrong-link-path]
-@/n/m12: error: links to @/n/m1 and 2 more will lead to @/n/m12/Manual: one name begins with the other: rename one [wrong-link-path]
-@/n/m2/: error: links to @/n/m1 and 3 more will lead to @/m1/Manual: give the roots without a slash at the end [wrong-link-path]
+@/n/m12: error: links to @/n/m1 and 2 more will lead to @/n/m12/Manual: rename m12, which begins with m1 [wrong-link-path]
+@/n/m2/: error: links to @/n/m1 and 3 more will lead to @/m1/Manual: give the roots without "/./", "/../", "//" and a slash at the end [wrong-link-path]
 @/n/a\d: error: links to @/n/\xE9 will lead elsewhere: rename the directory [wrong-link-path]
 @/n/x"y: error: a quote, backslash or line break in the path breaks both scripts of @/n/m1: rename the directory [wrong-link-path]
 @/n/\xE9: error: links to @/n/a\d will lead to @/n/ad/Manual: rename the directory [wrong-link-path]
 6 modules, 6 errors, 0 warnings, status 1)"},
-        {"CHECK @/a @/b%41 @/c# # The page script encodes what else leads elsewhere",
-         {{"b%41", kModule}, {"c#", kModule}},
-         R"(@/a: error: links to @/b%41 and 1 more will lead to @/bA/Manual without the page script: rename the directory [wrong-link-path]
-@/b%41: error: links to @/c# will lead to @/c without the page script: rename the directory [wrong-link-path]
-@/c#: error: links to @/b%41 will lead to @/bA/Manual without the page script: rename the directory [wrong-link-path]
+        {"CHECK @/a @/a# @/b%41 # The page script encodes what else leads elsewhere",
+         {{"b%41", kModule}, {"a#", kModule}},
+         R"(@/a: error: links to @/a# and 1 more will lead to @/a without the page script: rename the directory [wrong-link-path]
+@/a#: error: links to @/a and 1 more will lead to @/a#/Manual: rename a#, which begins with a [wrong-link-path]
+@/b%41: error: links to @/a# will lead to @/a without the page script: rename the directory [wrong-link-path]
 3 modules, 3 errors, 0 warnings, status 1)"},
-        {"CHECK @/n/./a @/n/b # Steps that can be left out are left out",
+        {"CHECK n/./a n/b a # Steps that can be left out are left out, and roots share a directory",
          {{"n/a", kModule}, {"n/b", kModule}},
-         R"(@/n/./a: error: links to @/n/b will lead to @/b/Manual: give the roots without "/./", "/../" and "//" [wrong-link-path]
-2 modules, 1 error, 0 warnings, status 1)"},
+         R"(n/./a: error: links to n/b will lead to b/Manual: give the roots without "/./", "/../", "//" and a slash at the end [wrong-link-path]
+n/b: error: links to a will lead to n/a/Manual: give absolute paths [wrong-link-path]
+a: error: links to n/./a and 1 more will lead to a/n/a/Manual: give absolute paths [wrong-link-path]
+3 modules, 3 errors, 0 warnings, status 1)"},
         {"CHECK @/a @/a/ScriptReference-1 # Links of both sets are followed",
          {{"a/ScriptReference/docdata", kDirectory},
           {"a/ScriptReference-1", kModule},
           {"a/ScriptReference-1/ScriptReference/docdata", kDirectory}},
          R"(@/a/ScriptReference/docdata: note: has neither index.json nor toc.json: the module adds nothing to ScriptReference [set-empty]
-@/a/ScriptReference-1: error: links to @/a will lead to @/a/ScriptReference-1: one name begins with the other: rename one [wrong-link-path]
+@/a/ScriptReference-1: error: links to @/a will lead to @/a/ScriptReference-1: rename ScriptReference-1, which begins with ScriptReference [wrong-link-path]
 @/a/ScriptReference-1/ScriptReference/docdata: note: has neither index.json nor toc.json: the module adds nothing to ScriptReference [set-empty]
 2 modules, 1 error, 0 warnings, status 1)"},
     });

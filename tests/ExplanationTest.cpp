@@ -36,7 +36,7 @@ TEST(Explanation, NamesWhatUsuallyCausesAParseFailure)
         {R"("\ud83d")",
          R"(half of a surrogate pair, as cutting a text leaves it: write both halves or neither; refused at byte 1, at "\\ud83d\"")"},
         {R"("\uZZ12")",
-         R"(\u needs four hexadecimal digits; a backslash that is meant as one must be doubled; refused at byte 1, at "\\uZZ12\"")"},
+         R"(\u needs four hexadecimal digits; every backslash that is meant as one must be doubled; in a title or path, use another character; refused at byte 1, at "\\uZZ12\"")"},
         {"[",
          R"(the text ends too early: it was cut, or brackets are left open: write the file again; refused at byte 1, at the end of the text)"},
         {"[1,\n]", R"(there is a comma before the closing bracket; refused at byte 4, at "]")"},

@@ -33,12 +33,18 @@ bool IsPage(std::string_view name)
     return name.size() > kEnd.size() && name.substr(name.size() - kEnd.size()) == kEnd;
 }
 
+/// Whether the name is that of a directory itself, or of the one above it.
+bool IsDots(std::string_view name)
+{
+    return name == "." || name == "..";
+}
+
 template <typename Test>
 bool HasEntry(const std::string& directory, Test test)
 {
     const SortedListing listing(directory.c_str());
     return std::any_of(listing.begin(), listing.end(),
-                       [&](const dirent* entry) { return test(entry->d_name); });
+                       [&](const dirent* entry) { return !IsDots(entry->d_name) && test(entry->d_name); });
 }
 
 /// Looks for what a walk below a directory does not take, although it looks like a module.
@@ -86,7 +92,7 @@ private:
     /// are not looked for: a link can lead anywhere.
     void LookAtUnfollowed(const std::string& path, std::string_view name, bool isItself)
     {
-        if (name == "." || name == ".." || !FileStatus::Of(path).IsDirectory())
+        if (IsDots(name) || !FileStatus::Of(path).IsDirectory())
         {
             return;
         }
@@ -204,6 +210,11 @@ std::vector<std::string> DiscoverRoots(const std::string& directory, Report& rep
     {
         report.Add(Finding::OfRun(Rule::NoModules, directory,
                                   DescribeNoModules(converted) + ": nothing will be combined"));
+    }
+    else if (IsModule(converted))
+    {
+        report.Add(Finding::OfRun(Rule::PassedOver, directory,
+                                  "is a module itself, which is not looked for: its pages will be missing"));
     }
     if (FileStatus::Of(converted).IsDirectory())
     {

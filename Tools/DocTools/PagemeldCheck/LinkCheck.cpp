@@ -14,50 +14,66 @@ namespace
 /// The directory of a root's set as the scripts and the web see it.
 struct SetPath
 {
-    SetPath(std::size_t rootPosition, const std::string& root, DocSet set)
+    SetPath(std::size_t rootPosition, const std::string& rootAsTyped, DocSet set)
         : position(rootPosition),
+          root(rootAsTyped),
           module(root, set),
           target(module.AsLinkTarget()),
           webPath(WebPathOf(module.Text())),
-          isPlain(IsPlain(module.Text()))
+          plainFrom(FindPlainRest(module.Text()))
     {
     }
 
-    /// Whether every name in the path is itself in a URL and in a script, and no step can be left out.
-    /// A space that begins a URL is lost.
-    static bool IsPlain(const std::string& path)
+    /// Whether a name is itself in a URL and in a script, and is a step that can't be left out. A space that
+    /// begins a URL is lost.
+    static bool IsPlain(std::string_view name)
     {
-        const std::string steps = "/" + path + "/";
-        return std::none_of(path.begin(), path.end(), [](char c) { return c >= '\0' && c < ' '; }) &&
-               steps.find("/ ") == std::string::npos && path.find_first_of("%#?:\"\\") == std::string::npos &&
-               FindInvalidUtf8(path) == std::string::npos && steps.find("/./") == std::string::npos &&
-               steps.find("/../") == std::string::npos && path.find("//") == std::string::npos;
+        return !name.empty() && name != "." && name != ".." && name.front() != ' ' &&
+               std::none_of(name.begin(), name.end(), [](char c) { return c >= '\0' && c < ' '; }) &&
+               name.find_first_of("%#?:\"\\") == std::string_view::npos &&
+               FindInvalidUtf8(name) == std::string_view::npos;
+    }
+
+    /// Returns where the rest of a path begins that consists of plain names.
+    static std::size_t FindPlainRest(std::string_view path)
+    {
+        std::size_t rest = path.size() + 1;
+        while (rest > 0)
+        {
+            const std::string_view before = path.substr(0, rest - 1);
+            const std::size_t name = before.rfind('/') + 1; // 0 if there is no '/'
+            if (!IsPlain(before.substr(name)))
+            {
+                break;
+            }
+            rest = name;
+        }
+        return rest;
     }
 
     std::size_t position;
+    const std::string& root;
     ModulePath module;
     std::string target;
     std::string webPath;
-    bool isPlain;
+    std::size_t plainFrom;
 };
 
-/// Returns whether the prefix from one plain path to another is right for what RelativePrefix is: "../" for
-/// every step after the last '/' that both share, then the rest. It is wrong if they share no '/'. Returns
-/// nothing if a name in "to" is the beginning of the other's, since the walk then ends within that name, or
-/// if a path is not plain.
+/// Returns whether the prefix from one path to another is right for what RelativePrefix is: "../" for every
+/// step after the last '/' that both share, then the rest. It is wrong if they share no '/'. Returns nothing
+/// if a name in "to" is the beginning of the other's, since the walk then ends within that name, or if what
+/// follows that '/' is not plain. What comes before it is not in the prefix.
 std::optional<bool> IsPlainlyRight(const SetPath& from, const SetPath& to)
 {
-    if (!from.isPlain || !to.isPlain)
-    {
-        return std::nullopt;
-    }
     const std::string& source = from.module.Text();
     const auto difference = std::mismatch(source.begin(), source.end(), to.target.begin(), to.target.end());
     if (difference.first != source.end() && difference.second != to.target.end() && *difference.second == '/')
     {
         return std::nullopt;
     }
-    return std::find(source.begin(), difference.first, '/') != difference.first;
+    const auto length = static_cast<std::size_t>(difference.first - source.begin());
+    const std::size_t shared = std::string_view(source).substr(0, length).rfind('/') + 1;
+    return shared < std::max(from.plainFrom, to.plainFrom) ? std::nullopt : std::optional(shared > 0);
 }
 
 /// Returns the prefix from one set directory to another as the scripts have it, or nothing if it breaks them.
@@ -88,7 +104,7 @@ std::optional<std::string> FollowPrefix(const SetPath& from, const std::string& 
 /// Where the links from a root lead, if it is not where they should.
 struct WrongLinks
 {
-    std::size_t first = 0; ///< the position of the first root that is not reached
+    const SetPath* first = nullptr; ///< that is not reached
     std::size_t count = 0;
     std::string reached;    ///< instead of the first; empty if it is not a directory at all
     bool isHandled = false; ///< whether the page script, which encodes prefixes, gets to the first
@@ -114,7 +130,7 @@ WrongLinks FindWrongLinks(const std::vector<SetPath>& paths, const SetPath& from
             prefix ? FollowPrefix(from, *prefix) : to.webPath; // the other's fault
         if (reached != to.webPath && wrong.count++ == 0)
         {
-            wrong.first = to.position;
+            wrong.first = &to;
             wrong.reached = reached.value_or("");
             wrong.isHandled = FollowPrefix(from, EncodedPrefix(*prefix)) == to.webPath;
         }
@@ -132,59 +148,53 @@ std::string DisplayedWebPath(std::string_view webPath)
     return Visible(webPath.substr(0, webPath.find_last_not_of('/') + 1));
 }
 
-bool EndsInSlash(const std::string& root)
+/// Returns what a path has after the last '/' that it shares with another; all of it if it shares none.
+std::string RestOf(const std::string& path, const std::string& other)
 {
-    return !root.empty() && root.back() == '/';
+    const auto difference = std::mismatch(path.begin(), path.end(), other.begin(), other.end()).first;
+    return path.substr(std::string(path.begin(), difference).rfind('/') + 1);
 }
 
-/// Whether one of the paths begins with all bytes of the other.
-bool IsBeginning(const std::string& a, const std::string& b)
+/// Whether the path has a step that leads nowhere, or back, as a slash at the end of a root makes.
+bool HasEmptySteps(const std::string& path)
 {
-    const std::size_t length = std::min(a.size(), b.size());
-    return a.compare(0, length, b, 0, length) == 0;
+    const std::string steps = "/" + path;
+    return steps.find("/./") != std::string::npos || steps.find("/../") != std::string::npos ||
+           steps.find("//") != std::string::npos;
 }
 
-/// Whether the path has a step that leads nowhere, or back.
-bool HasEmptySteps(const std::string& root)
+std::string Remedy(const SetPath& from, const SetPath& to)
 {
-    return ("/" + root).find("/./") != std::string::npos || root.find("/../") != std::string::npos ||
-           root.find("//") != std::string::npos;
-}
-
-std::string Remedy(const std::string& from, const std::string& to)
-{
-    if (EndsInSlash(from) || EndsInSlash(to))
+    const std::string fromRest = RestOf(from.module.Text(), to.module.Text());
+    const std::string toRest = RestOf(to.module.Text(), from.module.Text());
+    const std::string fromName = fromRest.substr(0, fromRest.find('/'));
+    const std::string toName = toRest.substr(0, toRest.find('/'));
+    if (fromName != toName && !toName.empty() && fromName.compare(0, toName.size(), toName) == 0)
     {
-        return "give the roots without a slash at the end";
+        return "rename " + Visible(fromName) + ", which begins with " + Visible(toName);
     }
-    if (IsBeginning(from, to))
+    if (toRest == to.module.Text())
     {
-        return "one name begins with the other: rename one";
+        return "give absolute paths";
     }
-    const bool isSpecial =
-        to.find_first_of("%#?\"\\\n\r\t") != std::string::npos || FindInvalidUtf8(to) != std::string::npos;
-    if (!isSpecial && (HasEmptySteps(from) || HasEmptySteps(to)))
-    {
-        return "give the roots without \"/./\", \"/../\" and \"//\"";
-    }
-    return isSpecial || (from[0] == '/' && to[0] == '/') ? "rename the directory" : "give absolute paths";
+    return HasEmptySteps(fromRest) || HasEmptySteps(toRest)
+               ? "give the roots without \"/./\", \"/../\", \"//\" and a slash at the end"
+               : "rename the directory";
 }
 
-std::string DescribeWrongLinks(const std::vector<std::string>& roots, std::size_t from,
-                               const WrongLinks& wrong)
+std::string DescribeWrongLinks(const SetPath& from, const WrongLinks& wrong)
 {
-    const std::string& to = roots[wrong.first];
     const std::string others = wrong.count > 1 ? " and " + std::to_string(wrong.count - 1) + " more" : "";
     const std::string lead =
         wrong.reached.empty() ? " will lead elsewhere" : " will lead to " + DisplayedWebPath(wrong.reached);
-    return "links to " + Visible(to) + others + lead + (wrong.isHandled ? " without the page script" : "") +
-           ": " + Remedy(roots[from], to);
+    return "links to " + Visible(wrong.first->root) + others + lead +
+           (wrong.isHandled ? " without the page script" : "") + ": " + Remedy(from, *wrong.first);
 }
 
 /// Returns the first set directory in whose scripts the prefix to another one breaks the string, or null.
 const SetPath* FindBroken(const std::vector<SetPath>& paths, const SetPath& to)
 {
-    if (to.isPlain)
+    if (to.module.Text().find_first_of("\"\\\n\r") == std::string::npos)
     {
         return nullptr;
     }
@@ -194,16 +204,15 @@ const SetPath* FindBroken(const std::vector<SetPath>& paths, const SetPath& to)
 }
 
 /// Returns what is wrong with the links from or to one set directory, or an empty text.
-std::string FindFault(const std::vector<std::string>& roots, const std::vector<SetPath>& paths,
-                      const SetPath& path)
+std::string FindFault(const std::vector<SetPath>& paths, const SetPath& path)
 {
     if (const SetPath* const from = FindBroken(paths, path))
     {
-        return "a quote, backslash or line break in the path breaks both scripts of " +
-               Visible(roots[from->position]) + ": rename the directory";
+        return "a quote, backslash or line break in the path breaks both scripts of " + Visible(from->root) +
+               ": rename the directory";
     }
     const WrongLinks wrong = FindWrongLinks(paths, path);
-    return wrong.count == 0 ? "" : DescribeWrongLinks(roots, path.position, wrong);
+    return wrong.count == 0 ? "" : DescribeWrongLinks(path, wrong);
 }
 
 std::vector<SetPath> PathsOf(DocSet set, const std::vector<std::string>& roots)
@@ -229,11 +238,11 @@ void CheckLinks(const std::vector<std::string>& roots, Report& report)
         const std::vector<SetPath> paths = PathsOf(set.id, roots);
         for (const SetPath& path : paths)
         {
-            const std::string fault = isReported[path.position] ? "" : FindFault(roots, paths, path);
+            const std::string fault = isReported[path.position] ? "" : FindFault(paths, path);
             if (!fault.empty())
             {
                 isReported[path.position] = true;
-                report.Add(Finding::OfRoot(Rule::WrongLinkPath, path.position, roots[path.position], fault));
+                report.Add(Finding::OfRoot(Rule::WrongLinkPath, path.position, path.root, fault));
             }
         }
     }

@@ -1,9 +1,9 @@
 #include "Tools/DocTools/PagemeldCheck/MergedContents.h"
 
+#include "Tools/DocTools/PagemeldCheck/Browse/WebPath.h"
 #include "Tools/DocTools/VantorPagemeld/Merge/SipHash.h"
 #include "Tools/DocTools/VantorPagemeld/Read/JsonDocument.h"
 
-#include <cstring>
 #include <string_view>
 #include <utility>
 
@@ -20,9 +20,11 @@ using rapidjson::Value;
 namespace
 {
 
+/// Whether the link is one of the module. An address leads to the same from every module.
 bool HasPage(const Value& node)
 {
-    return std::strcmp(CStringOf(*FindMember(node, "link")), "null") != 0;
+    const std::string_view link = CStringOf(*FindMember(node, "link"));
+    return link != "null" && !IsAddress(link);
 }
 
 /// Returns the hash of a way that goes on with a text.

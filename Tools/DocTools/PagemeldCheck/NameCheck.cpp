@@ -78,7 +78,7 @@ void CheckTerms(const Value& terms, FileFindings& findings)
             [&]
             {
                 return "terms that readers can't find by the whole word, since words are looked up as "
-                       "letters, digits and _ in lower case: " +
+                       "letters, digits and _ in lower case (the page script ignores case): " +
                        std::to_string(unfound) + ", first " + findings.Quote(term);
             });
     }

@@ -140,7 +140,7 @@ std::string DescribeCause(std::string_view text, std::size_t size, const rapidjs
     case rapidjson::kParseErrorStringEscapeInvalid:
         return DescribeStringCharacter(text[failure.Offset()]);
     case rapidjson::kParseErrorStringUnicodeEscapeInvalidHex:
-        return "\\u needs four hexadecimal digits; a backslash that is meant as one must be doubled";
+        return "\\u needs four hexadecimal digits; " + DescribeStringCharacter('\\');
     case rapidjson::kParseErrorStringUnicodeSurrogateInvalid:
         return "half of a surrogate pair, as cutting a text leaves it: write both halves or neither";
     default:
