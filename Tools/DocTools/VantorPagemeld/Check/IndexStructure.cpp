@@ -69,9 +69,9 @@ constexpr Requirement<Member> kTerm[] = {
     {Fault::TermNotArray, [](const Member& term, Count) { return term.value.IsArray(); }},
 };
 
-template <typename Entry, std::size_t size>
-std::optional<Fault> FindFault(const Requirement<Entry> (&requirements)[size], const Entry& entry,
-                               Count count = kUnbounded)
+/// The table is a template argument, so that the compiler sees the functions that it calls.
+template <const auto& requirements, typename Entry>
+std::optional<Fault> FindFault(const Entry& entry, Count count = kUnbounded)
 {
     for (const Requirement<Entry>& requirement : requirements)
     {
@@ -83,14 +83,13 @@ std::optional<Fault> FindFault(const Requirement<Entry> (&requirements)[size], c
     return std::nullopt;
 }
 
-template <std::size_t size>
-bool CheckEntries(const Requirement<Value> (&requirements)[size], const Value& entries, Count count,
-                  const JsonPointer& pointer, const FaultHandler& onFault)
+template <const auto& requirements>
+bool CheckEntries(const Value& entries, Count count, const JsonPointer& pointer, const FaultHandler& onFault)
 {
     return CheckElements(
         entries, pointer,
         [&](const Value& entry, const JsonPointer& entryPointer)
-        { return HandOver(FindFault(requirements, entry, count), entryPointer, entry, onFault); });
+        { return HandOver(FindFault<requirements>(entry, count), entryPointer, entry, onFault); });
 }
 
 bool CheckCommon(const Value& common, const JsonPointer& pointer, const FaultHandler& onFault)
@@ -98,15 +97,15 @@ bool CheckCommon(const Value& common, const JsonPointer& pointer, const FaultHan
     return std::all_of(
         common.MemberBegin(), common.MemberEnd(),
         [&](const Member& word) {
-            return HandOver(FindFault(kCommonWord, word), {pointer, BytesOf(word.name)}, word.value, onFault);
+            return HandOver(FindFault<kCommonWord>(word), {pointer, BytesOf(word.name)}, word.value, onFault);
         });
 }
 
 bool CheckTerm(const Member& term, Count infoCount, const JsonPointer& pointer, const FaultHandler& onFault)
 {
-    const std::optional<Fault> fault = FindFault(kTerm, term);
+    const std::optional<Fault> fault = FindFault<kTerm>(term);
     return fault ? HandOver(fault, pointer, term.value, onFault)
-                 : CheckEntries(kPosting, term.value, infoCount, pointer, onFault);
+                 : CheckEntries<kPosting>(term.value, infoCount, pointer, onFault);
 }
 
 bool CheckSearchIndex(const Value& searchIndex, Count infoCount, const JsonPointer& pointer,
@@ -161,8 +160,8 @@ bool CheckIndexStructure(const Value& document, const FaultHandler& onFault)
         }
     }
     const auto& [pages, info, common, searchIndex] = members;
-    return (pages == nullptr || CheckEntries(kPage, *pages, kUnbounded, {root, "pages"}, onFault)) &&
-           (info == nullptr || CheckEntries(kInfo, *info, CountOf(pages), {root, "info"}, onFault)) &&
+    return (pages == nullptr || CheckEntries<kPage>(*pages, kUnbounded, {root, "pages"}, onFault)) &&
+           (info == nullptr || CheckEntries<kInfo>(*info, CountOf(pages), {root, "info"}, onFault)) &&
            (common == nullptr || CheckCommon(*common, {root, "common"}, onFault)) &&
            (searchIndex == nullptr ||
             CheckSearchIndex(*searchIndex, CountOf(info), {root, "searchIndex"}, onFault));
