@@ -54,7 +54,7 @@ std::unique_ptr<NativeTestReporter> CreateReporter(const TestFilter& filter)
     return reporter;
 }
 
-/// Ends with the run, even if a test ends the run by an exception.
+/// Clears g_TestReporter when the run ends, even by an exception from a test.
 struct KnownReporter
 {
     ~KnownReporter() { Testing::g_TestReporter = nullptr; }

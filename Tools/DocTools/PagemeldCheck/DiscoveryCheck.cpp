@@ -15,8 +15,8 @@
 
 #include <strings.h>
 
-// What the walk of pagemeld passes over in silence. It is walked again here, so that the tool's own walk asks
-// the file system for nothing that it does not need.
+// pagemeld's search for modules passes over some in silence. The directories are walked again here to find
+// these, so that its own walk asks the file system for nothing that it does not need.
 
 namespace
 {
@@ -88,8 +88,8 @@ public:
     }
 
 private:
-    /// Reports a hidden or linked directory that is a module, or a link to one that holds some. Deeper ones
-    /// are not looked for: a link can lead anywhere.
+    /// Reports a hidden or linked directory that is a module, or a link to a directory that holds modules.
+    /// Those deeper below it are not looked for: a link can lead anywhere.
     void LookAtUnfollowed(const std::string& path, std::string_view name, bool isItself)
     {
         if (IsDots(name) || !FileStatus::Of(path).IsDirectory())

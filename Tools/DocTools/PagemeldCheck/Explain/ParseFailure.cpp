@@ -26,7 +26,7 @@ bool FollowsComma(std::string_view text, std::size_t offset)
     return last != std::string_view::npos && text[last] == ',';
 }
 
-/// Returns what is wrong with the file as a whole.
+/// Returns what is wrong with the file as a whole, or an empty text.
 std::string DescribeEncoding(std::string_view text, std::size_t size)
 {
     if (BeginsWith(text, "\xFF\xFE") || BeginsWith(text, "\xFE\xFF") || (text.size() == 1 && size > 1))

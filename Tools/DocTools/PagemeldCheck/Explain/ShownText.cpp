@@ -44,8 +44,8 @@ Character ReadCharacter(std::string_view text)
     return isWellFormed ? Character{code, stream.Tell()} : Character{};
 }
 
-/// Whether a text that begins with an escape begins with that of half a surrogate pair: 'u', 'd', and one of
-/// the digits follow the backslash.
+/// Whether the escape that begins text is that of half a surrogate pair: its backslash is followed by 'u',
+/// 'd' and one of the digits.
 bool IsHalf(std::string_view text, std::string_view digits)
 {
     const std::string_view start = text.substr(1, 2);

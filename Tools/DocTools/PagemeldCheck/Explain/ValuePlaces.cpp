@@ -129,7 +129,8 @@ private:
 
 void FindOffsets(const char* text, const std::vector<SoughtValue>& sought)
 {
-    // Numbers as strings, because the library's conversion can't take all that ParseJson accepts.
+    // Numbers are read as strings: this is the text before ParseJson changed those that the library can't
+    // convert.
     constexpr unsigned kFlags = rapidjson::kParseIterativeFlag | rapidjson::kParseNumbersAsStringsFlag;
     TrackedStream stream(text);
     PlaceFinder finder(text, stream, sought);

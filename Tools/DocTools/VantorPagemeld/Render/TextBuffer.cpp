@@ -21,7 +21,7 @@ void AppendText(TextBuffer& buffer, std::string_view text)
 void AppendTitleLiteral(TextBuffer& buffer, const char* text)
 {
     AppendText(buffer, "\"");
-    std::string_view rest = text;
+    std::string_view rest = text; // up to the first NUL: what comes after it is in no script
     for (std::size_t quote = rest.find('"'); quote != std::string_view::npos; quote = rest.find('"'))
     {
         AppendText(buffer, rest.substr(0, quote));
@@ -48,7 +48,7 @@ void AppendCompactJson(TextBuffer& buffer, const rapidjson::Value& value)
 TextBuffer RenderPrettyJson(const rapidjson::Value& value)
 {
     TextBuffer buffer;
-    rapidjson::PrettyWriter<TextBuffer> writer(buffer);
+    rapidjson::PrettyWriter<TextBuffer> writer(buffer); // four spaces a level unless told otherwise
     value.Accept(writer);
     return buffer;
 }

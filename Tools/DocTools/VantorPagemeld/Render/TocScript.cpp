@@ -102,6 +102,7 @@ private:
         }
         if (link != kLinkOfGroup)
         {
+            // The browser joins the two texts, so that the body is the same for all modules.
             Append({PrefixVariable(*module), "+"});
         }
         AppendPathLiteral(m_script, link);
@@ -117,7 +118,7 @@ private:
         else
         {
             Append({"[", m_lineBreak});
-            AppendValue(children, indent + 2);
+            AppendValue(children, indent + 2); // nothing between the brackets if it is neither list nor node
             AppendIndent(indent + 1);
             AppendText(m_script, "]");
         }
@@ -131,6 +132,7 @@ private:
             AppendValue(list[i], indent + 2);
             if (i + 1 < list.Size())
             {
+                // With line breaks, each node has ended its line: the comma gets one of its own.
                 AppendIndent(indent + 2);
                 Append({",", m_lineBreak});
             }
