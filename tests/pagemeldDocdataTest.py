@@ -125,7 +125,8 @@ TITLES = [
 # A row is the start page's title and heading, more options, and the name of the entry of module "lib".
 MODULE_NAMES = [("Main Page", "Overview", [], "lib"), ("3.11.2 Documentation", "", [], "lib"),
                 ("Overview", "The Lib", [], "The Lib"), ("Lib", "", [], "Lib"), ("Lib", "", ["--title", "L"], "L")]
-REPEATS = '<li><a href="index.html">Home</a><li><a href="c.html">index.html</a>'
+REPEATS = ('<li><a href="index.html">Home</a><li><a href="c.html">index.html</a>'
+           '<li><a href="search.html">Search Page</a>')
 LIST = f'<ul>{REPEATS}<li><a href="b.html">B</a></li><li><a href="#">Menu</a></li></ul>'
 # A row is what makes a generator known, the page with its list, and the list.
 GENERATORS = [
@@ -141,7 +142,8 @@ TAG = '<script src="docdata/pagemeld.js" defer="defer"></script>'
 WIDE_TAG = TAG.replace(" defer", ' charset="utf-8" defer').encode("utf-16-le").decode()
 WIDE = ("\ufeff<p>\u010d".encode("utf-16-le"), "</body>".encode("utf-16-le") + b"!", WIDE_TAG)
 OLD_TAG = '<script src="docdata/pagemeld.js" defer data-docdata="../docdata"></script>'
-SLOW = b"<script " + b"src=docdata/pagemeld.js " * 20000 + b">x</script><meta " + b"name=generator " * 20000
+SLOW = b"<script " + b"src=docdata/pagemeld.js " * 20000 + b">x</script><meta " + b"name=generator " * 20000 + (
+    b"><meta http-equiv=refresh content='" + b" " * 200000 + b"'>")
 # A row is a page's name, what it has before and after the place of the tag, and the tag that it gets.
 SCRIPT = [
     ("plain.html", b"<body>x", b"</BODY ></html>", TAG), ("bytes.html", b"\xff\r\n", b"</body>", TAG),
@@ -261,7 +263,8 @@ class PagemeldDocdata(unittest.TestCase):
         for known_by, content, page, contents in GENERATORS:
             with self.subTest(known_by, page=page), tempfile.TemporaryDirectory() as parent:
                 self.directory = os.path.join(parent, "Manual")
-                pages = {"index.html": "", "b.html": "<title>B</title>", "c.html": "C", known_by: content}
+                pages = {"index.html": "", "b.html": "<title>B</title>", "c.html": "C",
+                         "search.html": "<title>Search</title>", known_by: content}
                 self.write({**pages, page: pages.get(page, "") + contents})
                 below = [node("c.html", "C")] if "C</a>" in contents else []
                 self.assertEqual([node("b.html", "B", *below)], self.make()[1]["children"][0]["children"])

@@ -8,7 +8,7 @@ from generators import DIRECTORY_PAGES, GENERATED
 from markup import squeeze
 from messages import warn
 from search_index import UNWRITABLE
-from titles import make_title
+from titles import is_generic, make_title
 
 SCHEME = re.compile("[a-zA-Z][a-zA-Z0-9+.-]*:")
 
@@ -34,20 +34,25 @@ def resolve(address, base, paths):
     return own if own in paths else path, unquote(fragment)
 
 
+def has_entry(path, titles):
+    """Returns whether links to a page become entries: it is in the set, and no generated "Index" or "Search"."""
+    return path in titles and not (GENERATED.fullmatch(path) and is_generic(titles[path]))
+
+
 def list_links(items, base, titles, directory):
-    """Returns the items of the lists of the page base as rows; those that lead to no page of the set are "null"."""
+    """Returns the items of the lists of the page base as rows; those that lead to no page for an entry are "null"."""
     rows, missing = [], set()
     for item in items:
         path, fragment = resolve("//" if item.address is None else item.address, base, titles)
-        is_page = path in titles
-        title = make_title(squeeze("".join(item.pieces[item.link_start if is_page else 0:])), f"{directory}/{base}")
-        if is_page:
+        is_entry = has_entry(path, titles)
+        title = make_title(squeeze("".join(item.pieces[item.link_start if is_entry else 0:])), f"{directory}/{base}")
+        if is_entry:
             link = f"{path}#{fragment}" if fragment and not UNWRITABLE.search(fragment) else path
             rows.append(Row(item.depth, link, title or titles[path]))
         else:
             rows.append(Row(item.depth, "null", title))
             missing.add(path)
-    for path in sorted(missing - {""}):
+    for path in sorted(missing - {""} - titles.keys()):
         warn(f"{directory}/{base}: links to {ascii(path)}, which is not a page of the set, are left out")
     return rows
 

@@ -10,10 +10,11 @@ from sections import OpenSection, Section
 from words import find_words
 
 NUMBER = re.compile(r"^[\dA-Z]+(\.\d+)*\.?\s+")  # of a section, before its name
+LONGEST_TITLE = 2000
 MAIN = "main"
 REDIRECT = "redirect"
 MARKED = re.compile(r"\b(?:id|class|name|role|http-equiv)\s*=", re.I)
-AFTER_SECONDS = re.compile(r"\s*[\d.]*[;,\s]+\S")  # the address to which a page refreshes itself
+AFTER_SECONDS = re.compile(r"[\d.]*[;,\s]+\S")  # the address to which a page refreshes itself
 
 # The texts end at the next tag of that kind, so that tags that are never closed take linear time.
 TITLE = re.compile(r"<title[^<>]*>((?:(?!</?title).){0,2000})</title", re.S | re.I)
@@ -44,7 +45,7 @@ def read_traits(name, attributes):
     part = next((PARTS[name, one] for one in values.get("class", "").split() if (name, one) in PARTS), "")
     if name == "main" or role == "main":
         part = MAIN
-    elif values.get("http-equiv", "").lower() == "refresh" and AFTER_SECONDS.match(values.get("content", "")):
+    elif values.get("http-equiv", "").lower() == "refresh" and AFTER_SECONDS.match(values.get("content", "").strip()):
         part = REDIRECT
     return part, values.get("id") or name == "a" and values.get("name") or ""
 
@@ -156,7 +157,7 @@ class PageReader:
         elif self.anchor and "".join(self.data[self.anchor_at:]).strip():
             self.anchor = ""
         if block == "title":
-            self.title = self.title or text
+            self.title = self.title or text[:LONGEST_TITLE]
         elif block not in LEVELS and block != UNUSED:
             self.section.add(text, block == TEXT)
         self.data.clear()

@@ -11,9 +11,9 @@ HEAD = re.compile(r"\s[-\u2013\u2014|\u00b7]\s+|:\s+")
 LOOK_ALIKES = {ord("\\"): "\u2216", 0x7F: "\u2421", **{code: 0x2400 + code for code in range(0x20)}}
 # Titles of start pages that have only such words and numbers don't say of which module they are.
 GENERIC = set(
-    "a an api and class contents documentation for guide hierarchy home index introduction list main manual of "
-    "overview package packages page pages project read readme redirect redirecting redirection reference start table the title to top tree user "
-    "version welcome".split())
+    "a an and api class contents documentation for guide hierarchy home index introduction list main manual of "
+    "overview package packages page pages project read readme redirect redirecting redirection reference search "
+    "start table the title to top tree user version welcome".split())
 
 
 def replace_unwritable(text):
