@@ -38,7 +38,7 @@ constexpr RuleRow kRules[] = {
      "The module is missing from search or contents.", "Fix the text at the place shown."},
     {Rule::Structure, Level::Error, "structure", "a file breaks its format",
      "The module is missing from search or contents.",
-     "Fix every entry shown; docs/FORMATS.md has the formats."},
+     "Fix every entry shown; pagemeld(5) has the formats."},
     {Rule::MergedInput, Level::Error, "merged-input", "an input is an output of an earlier run",
      "The module is missing from the search, or its contents lead to other modules.",
      "Put the module's own file in its place."},
