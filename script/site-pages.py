@@ -2,7 +2,8 @@
 """Makes the pages of our guides and manual pages: site-pages.py BUILD SITE
 
 The manual pages and the README to install are taken from the build directory BUILD. Each module of SITE gets the set
-directory Manual. Ends with an error if a page links to a heading that is not there, or to a file that is neither in the site nor a picture.
+directory Manual. Ends with an error if a page links to a heading that is not there, or to a file that is neither in the
+site nor a picture.
 """
 import html
 import os
