@@ -282,12 +282,12 @@
         history.replaceState({ ...history.state, pagemeld: kept }, "", address.href);
     }
 
-    // Once the indexes are there: as it was when the reader left for a result.
+    // Once the indexes are there: as it was when the reader left for a result, unless a query is typed meanwhile.
     async function restoreQuery(query) {
         const before = kept;
         box.value = query;
         await needIndex();
-        if (before) {
+        if (before && box.value === query) {
             kept = before;
             filter.value = kept.module;
             update();
