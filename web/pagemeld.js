@@ -40,11 +40,11 @@
 
     async function start() {
         const query = new URLSearchParams(location.search).get("pagemeld");
-        const isSeenAtOnce = query || document.getElementById("pagemeld");
+        const isSeenAtOnce = query || document.querySelector("div#pagemeld");
         if (document.readyState === "loading" || (!isSeenAtOnce && document.readyState !== "complete")) {
             await new Promise((done) => { addEventListener("load", done); }); // XHTML does not defer scripts
         }
-        const place = document.getElementById("pagemeld");
+        const place = document.querySelector("div#pagemeld");
         if (document.body?.localName !== "body") {
             return; // a frame set
         }

@@ -12,6 +12,7 @@ import { hostileTitle, makeSite, sea, themes } from "./site.mjs";
 const [pagemeld, browser] = process.argv.slice(2);
 const axe = fs.readFileSync(createRequire(import.meta.url).resolve("axe-core/axe.min.js"), "utf8");
 const root = makeSite(pagemeld);
+const ownSite = path.resolve("build/site"); // of script/site
 let page;
 const plain = `${sea}/far/off/no theme.html`;
 const seaModule = "Manual/Gr\u00f6\u00dfe  #1";
@@ -208,6 +209,12 @@ const rows = { // what must hold, and how that is seen
         await expect("document.querySelector('#pagemeld, .pagemeld-open, iframe, link') === null", true);
         page.errors = [];
     },
+    ...!fs.existsSync(ownSite) ? {} : { "our own documentation answers a question": async () => {
+        await goto("own/pagemeld/Manual/index.html");
+        await openDialog();
+        await search("what does status 255 mean");
+        await expect(`${found}[0]`, "Messages");
+    } },
     ...browser !== "chromium" ? {} : { "marked words are seen in forced colors, and nothing of it is printed": async () => {
         await goto(`${plain}?pagemeld=pitch`);
         await page.until($("mark"));
@@ -220,6 +227,11 @@ const rows = { // what must hold, and how that is seen
     } },
 };
 
+if (fs.existsSync(ownSite)) {
+    fs.symlinkSync(ownSite, path.join(root, "own"));
+} else {
+    console.error("SKIPPED: our own documentation is not tested, because build/site is missing");
+}
 const server = spawn("python3", ["-um", "http.server", "--bind", "127.0.0.1", "--directory", root, "0"]);
 try {
     const line = await new Promise((resolve) => server.stdout.once("data", resolve));
