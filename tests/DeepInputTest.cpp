@@ -4,7 +4,6 @@
 #include "tests/support/Repeated.h"
 
 #include <gtest/gtest.h>
-#include <rapidjson/prettywriter.h>
 
 #include <functional>
 
@@ -38,16 +37,6 @@ void RunOnSmallStack(std::function<void()> function)
     ::pthread_attr_destroy(&attributes);
 }
 
-/// Returns the pretty form without its spaces, which can take more than half a gigabyte.
-std::string Lines(const rapidjson::Value& value)
-{
-    TextBuffer text;
-    rapidjson::PrettyWriter<TextBuffer> writer(text);
-    writer.SetIndent(' ', 0);
-    EXPECT_TRUE(value.Accept(writer));
-    return text.GetString();
-}
-
 void MergeDeepTocs()
 {
     constexpr std::size_t kLevels = kMaxNestingDepth / 2;
@@ -69,26 +58,17 @@ void MergeDeepTocs()
 
 TEST(DeepInput, ArraysAndObjectsAreReadCopiedAndWritten)
 {
-    const struct
-    {
-        std::string text;
-        std::string lines;
-    } cases[] = {
-        {Repeated("[", kMaxNestingDepth) + Repeated("]", kMaxNestingDepth),
-         Repeated("[\n", kMaxNestingDepth - 1) + "[]" + Repeated("\n]", kMaxNestingDepth - 1)},
-        {Repeated("{\"a\":", kMaxNestingDepth - 1) + "{}" + Repeated("}", kMaxNestingDepth - 1),
-         Repeated("{\n\"a\": ", kMaxNestingDepth - 1) + "{}" + Repeated("\n}", kMaxNestingDepth - 1)},
-    };
-    for (const auto& c : cases)
+    for (const std::string& text :
+         {Repeated("[", kMaxNestingDepth) + Repeated("]", kMaxNestingDepth),
+          Repeated("{\"a\":", kMaxNestingDepth - 1) + "{}" + Repeated("}", kMaxNestingDepth - 1)})
     {
         RunOnSmallStack(
             [&]
             {
-                const rapidjson::Document document = ParsedJson(c.text);
+                const rapidjson::Document document = ParsedJson(text);
                 rapidjson::Document::AllocatorType allocator;
                 const rapidjson::Value copy(document, allocator);
-                EXPECT_EQ(c.text, RapidJsonIoUtil::OutputJsonValueToString(copy));
-                EXPECT_EQ(c.lines, Lines(copy));
+                EXPECT_EQ(text, RapidJsonIoUtil::OutputJsonValueToString(copy));
             });
     }
 }

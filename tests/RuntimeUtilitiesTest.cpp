@@ -34,7 +34,6 @@ TEST(ConvertNonPrintableCharsToHex, KeepsPrintableAsciiAndWellFormedSequences)
         const char* text;
         const char* expected;
     } cases[] = {
-        {"", ""},
         {"a \n~\x1F\x7F%\x01", "a %0A~%1F%7F%%01"},
         {"\x80\xBFz", "%80%BFz"},
         {"\xC2\x80\xDF\xBF", "\xC2\x80\xDF\xBF"},

@@ -6,7 +6,7 @@ void PositionTable::Add(Hash hash)
 {
     if (hash)
     {
-        if (2 * (m_taken + 1) > m_slots.size())
+        if (2 * m_taken >= m_slots.size())
         {
             Grow();
         }
