@@ -68,6 +68,18 @@ std::uint32_t MergedContents::Add(std::uint64_t way, std::uint32_t module)
     return position;
 }
 
+std::vector<std::uint64_t> MergedContents::WaysTo(const Value& children, std::uint64_t parent) const
+{
+    std::vector<std::uint64_t> ways;
+    ways.reserve(children.Size());
+    for (const Value& child : children.GetArray())
+    {
+        ways.push_back(WayTo(parent, child));
+        m_positions.Prefetch(ways.back());
+    }
+    return ways;
+}
+
 void MergedContents::MergeChildren(const Source& source, const Value& node, const JsonPointer& pointer,
                                    std::uint32_t position, bool isHidden)
 {
@@ -77,15 +89,15 @@ void MergedContents::MergeChildren(const Source& source, const Value& node, cons
         return;
     }
     const bool isTakenWhole = !std::exchange(m_entries[position].hasList, true);
+    const std::vector<std::uint64_t> ways = WaysTo(children, m_entries[position].way);
     const JsonPointer list(pointer, "children");
     for (rapidjson::SizeType i = 0; i < children.Size(); ++i)
     {
         const JsonPointer child(list, i);
-        const std::uint64_t way = WayTo(m_entries[position].way, children[i]);
-        const std::uint32_t known = Find(way);
+        const std::uint32_t known = Find(ways[i]);
         if (known == PositionTable::kNotFound)
         {
-            MergeChildren(source, children[i], child, Add(way, source.module), isHidden);
+            MergeChildren(source, children[i], child, Add(ways[i], source.module), isHidden);
         }
         else if (!isTakenWhole)
         {

@@ -37,6 +37,8 @@ private:
 
     [[nodiscard]] std::uint32_t Find(std::uint64_t way) const;
     std::uint32_t Add(std::uint64_t way, std::uint32_t module);
+    [[nodiscard]] std::vector<std::uint64_t> WaysTo(const rapidjson::Value& children,
+                                                    std::uint64_t parent) const;
     void MergeChildren(const Source& source, const rapidjson::Value& node, const JsonPointer& pointer,
                        std::uint32_t position, bool isHidden);
     void Report(const Source& source, const rapidjson::Value& node, const JsonPointer& pointer,

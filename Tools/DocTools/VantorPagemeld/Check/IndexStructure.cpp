@@ -69,16 +69,16 @@ constexpr Requirement<Member> kTerm[] = {
     {Fault::TermNotArray, [](const Member& term, Count) { return term.value.IsArray(); }},
 };
 
-/// The table is a template argument, so that the compiler sees the functions that it calls.
-template <const auto& requirements, typename Entry>
+/// Looks at the requirements from the one at index. They are template arguments, so that the compiler sees
+/// the functions that it calls.
+template <const auto& requirements, std::size_t index = 0, typename Entry>
 std::optional<Fault> FindFault(const Entry& entry, Count count = kUnbounded)
 {
-    for (const Requirement<Entry>& requirement : requirements)
+    if constexpr (index < std::size(requirements))
     {
-        if (!requirement.isMet(entry, count))
-        {
-            return requirement.fault;
-        }
+        constexpr Requirement<Entry> requirement = requirements[index];
+        return requirement.isMet(entry, count) ? FindFault<requirements, index + 1>(entry, count)
+                                               : std::optional(requirement.fault);
     }
     return std::nullopt;
 }

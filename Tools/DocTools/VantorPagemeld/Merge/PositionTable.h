@@ -37,6 +37,16 @@ public:
         return kNotFound;
     }
 
+    /// Loads the slot of a hash while the caller does other work, such as this for the next ones. A large
+    /// table is not in the caches.
+    void Prefetch(std::uint64_t hash) const
+    {
+        if (!m_slots.empty())
+        {
+            __builtin_prefetch(&m_slots[hash & Mask()]);
+        }
+    }
+
     /// Adds the next position, whose key Find does not find yet.
     void Add(Hash hash);
 
