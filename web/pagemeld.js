@@ -1,35 +1,41 @@
-// Search and contents of all modules, in a documentation page: in its own <div id="pagemeld">, or else in a dialog that
-// a button in a corner opens. A page on disk can't fetch anything, so the outputs run as classic scripts, in hidden
-// frames: a page's own "const p0" would make their globals a syntax error. They load when they are needed. Titles and
-// texts enter the page as text only.
+// Search and contents of all modules in a documentation page: in its <div id="pagemeld">, or else in a dialog that a
+// button in a corner opens. A page on disk can't fetch, so the outputs run as scripts, in hidden frames, where a page's
+// own "const p0" is not in their way. Titles and texts enter the page as text only.
 
-(function () {
+(function main(tag, before) {
     "use strict";
+
+    // A button can wait until the page is loaded.
+    const place = document.querySelector("div#pagemeld");
+    const query = new URLSearchParams(location.search).get("pagemeld");
+    const isReady = place || query ? document.readyState !== "loading" : document.readyState === "complete";
+    if (!isReady) {
+        addEventListener("load", () => { setTimeout(main, 0, tag, before); });
+        return;
+    }
 
     const RESULTS_AT_ONCE = 10;
     const SLICE = 30; // ms of work without a pause
     const OTHER_SET = { Manual: "ScriptReference", ScriptReference: "Manual" };
 
-    const tag = document.currentScript;
-    const ownAddress = new URL(tag.getAttribute("src"), document.URL); // a <base> is to come after the tag
+    const ownAddress = new URL(tag.getAttribute("src"), document.URL); // not below a later <base>
     const docdata = new URL(tag.dataset.docdata?.replace(/\/?$/, "/") ?? new URL(".", ownAddress), document.URL);
 
     const language = { lang: document.documentElement.lang }; // of what is not the view's own words
     const box = create("input", { type: "search", autocomplete: "off", spellcheck: "false" });
     const filter = create("select", language, create("option", { value: "", lang: "en" }, "All"));
-    const form = create("form", { role: "search", "aria-label": "All modules" },
+    const fields = create("div", {},
         create("label", {}, "Search all modules ", box), create("label", { hidden: "" }, "Search in ", filter));
     const status = create("p", { role: "status" });
     const results = create("ul", { class: "pagemeld-results", ...language });
     const more = create("button", { hidden: "" }, "More results");
     const contents = create("nav", { "aria-label": "All modules" });
     const tabs = ["Search", "Contents"].map((name) => create("button", { role: "tab" }, name));
-    const view = create("div", { class: "pagemeld-view", lang: "en", role: "region", "aria-label": "All modules" },
-        create("div", { role: "tablist", "aria-label": "Parts" }, ...tabs),
-        create("div", { class: "pagemeld-finder" }, form, status, results, more), contents);
+    const view = create("div", { class: "pagemeld-view", lang: "en", role: "search", "aria-label": "All modules" },
+        create("div", { role: "tablist" }, ...tabs),
+        create("div", { class: "pagemeld-finder" }, fields, status, results, more), contents);
     const dialog = create("dialog", { id: "pagemeld", "aria-label": "All modules" });
 
-    let kept = history.state?.pagemeld; // before the page's own scripts replace it, as Sphinx's do
     const needIndex = once(loadIndexes);
     const needContents = once(loadContents);
     const lookups = []; // of the sets that are loaded, the own one first
@@ -38,28 +44,17 @@
     let isDialogKey = false;
     let placeOfPage; // below the dialog
 
-    async function start() {
-        const query = new URLSearchParams(location.search).get("pagemeld");
-        const isSeenAtOnce = query || document.querySelector("div#pagemeld");
-        if (document.readyState === "loading" || (!isSeenAtOnce && document.readyState !== "complete")) {
-            await new Promise((done) => { addEventListener("load", done); }); // XHTML does not defer scripts
-        }
-        const place = document.querySelector("div#pagemeld");
-        if (document.body?.localName !== "body") {
-            return; // a frame set
-        }
-        await loaded(create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress) }), document.head);
+    function start() {
         listen();
         selectTab(tabs[0]);
-        matchPage(place ? fillPlace(place) : fillCorner());
+        matchPage(place ? fillPlace() : fillCorner());
         if (query) {
-            restoreQuery(query);
+            restoreQuery();
             openView();
         }
     }
 
-    // In a place of the page, with a link that leads past it.
-    function fillPlace(place) {
+    function fillPlace() {
         const end = create("span", { tabindex: "-1" });
         const skip = create("a", { href: "#pagemeld", class: "pagemeld-skip" }, "Skip search and contents");
         skip.onclick = (event) => {
@@ -68,11 +63,10 @@
         };
         view.prepend(skip);
         place.append(view, end);
-        (window.requestIdleCallback ?? setTimeout)(needContents);
+        setTimeout(needContents);
         return place;
     }
 
-    // In a dialog, whose edge outside the view closes it.
     function fillCorner() {
         const opener = create("button",
             { class: "pagemeld-open", "aria-keyshortcuts": "/", "data-corner": tag.dataset.corner ?? "" },
@@ -84,22 +78,21 @@
         dialog.append(view);
         document.body.append(corner);
         opener.onclick = openView;
-        dialog.onclose = () => { keepQuery(); };
-        dialog.onmousedown = ({ target }) => { if (target === dialog) { dialog.close(); } };
         close.onclick = () => { dialog.close(); };
+        dialog.onclose = keepQuery;
+        dialog.onmousedown = ({ target }) => { if (target === dialog) { dialog.close(); } };
         addEventListener("scroll", () => { if (dialog.open) { scrollTo(placeOfPage); } }); // WebKit's keys scroll it
         return corner;
     }
 
-    // Light text is on a dark page, whose theme an attribute of the root or the body may switch. What the system says
-    // decides where the color is not given as red, green, and blue.
+    // Dark where the page's text is light, which an attribute may switch.
     function matchPage(home) {
         const systemIsDark = matchMedia("(prefers-color-scheme: dark)");
         const match = () => {
             const { color } = getComputedStyle(home.parentElement);
-            const [red, green, blue] = /^rgb/.test(color) ? color.match(/[\d.]+/g) : [];
-            const isDark = blue === undefined ? systemIsDark.matches : 0.21 * red + 0.72 * green + 0.07 * blue > 127;
-            home.style.colorScheme = isDark ? "dark" : "light";
+            const [red, green, blue] = color.match(/[\d.]+/g);
+            const isLight = 0.21 * red + 0.72 * green + 0.07 * blue > 127;
+            home.style.colorScheme = (color.startsWith("rgb") ? isLight : systemIsDark.matches) ? "dark" : "light";
         };
         const observer = new MutationObserver(match);
         [document.documentElement, document.body].forEach((part) => observer.observe(part, { attributes: true }));
@@ -108,23 +101,17 @@
     }
 
     function listen() {
-        addEventListener("pageshow", focusChosen); // Back to a page that the browser kept may lose the focus
         addEventListener("keydown", onKey);
         ["keydown", "keypress", "keyup"].forEach((type) => addEventListener(type, onDialogKey, true));
         box.onfocus = needIndex;
-        box.onblur = () => { keepQuery(); };
         box.oninput = filter.onchange = update;
+        box.onblur = view.onclick = keepQuery;
         more.onclick = showMore;
-        view.onclick = onClick;
-        form.onsubmit = (event) => {
-            event.preventDefault();
-            results.querySelector(".pagemeld-best")?.click();
-        };
         tabs.forEach((tab) => { tab.onclick = () => { selectTab(tab); }; });
     }
 
     function openView() {
-        if (dialog.isConnected && !dialog.open) {
+        if (!place && !dialog.open) {
             placeOfPage = { left: scrollX, top: scrollY, behavior: "instant" };
             dialog.showModal();
             needContents();
@@ -133,25 +120,14 @@
         box.select();
     }
 
-    // Tabs choose one of the parts where there is no room for both.
+    // Where there is no room for both parts, only the chosen one is seen.
     function selectTab(chosen) {
         tabs.forEach((tab) => tab.setAttribute("aria-selected", tab === chosen));
         view.classList.toggle("pagemeld-at-contents", chosen === tabs[1]);
         showCurrent(contents);
     }
 
-    // A link within this page does not leave it, but the dialog.
-    function onClick({ target }) {
-        const link = target.closest("a");
-        if (link) {
-            keepQuery(link.href);
-        }
-        if (link?.href.split("#")[0] === document.URL.split("#")[0]) {
-            dialog.close();
-        }
-    }
-
-    // The page does not see the keys that are pressed while the dialog is open, nor how the last one is let go.
+    // The page sees no key that is pressed in the dialog, nor the release of the one that closes it.
     function onDialogKey(event) {
         isDialogKey = event.type === "keydown" ? dialog.open : isDialogKey;
         if (isDialogKey) {
@@ -167,7 +143,7 @@
         }
     }
 
-    // Arrows lead through the results, "/" to the box, as Escape does in a place of the page. Returns whether it acted.
+    // Returns whether it acted.
     function actOn(key, target) {
         const stops = [box, ...results.querySelectorAll("a"), more];
         const next = stops.includes(target) && stops[stops.indexOf(target) + { ArrowDown: 1, ArrowUp: -1 }[key]];
@@ -176,7 +152,9 @@
             next.focus();
         } else if (key === "Escape" && dialog.open) {
             dialog.close();
-        } else if (key === "Escape" ? view.contains(target) : key === "/" && !isTyped) {
+        } else if (key === "Enter" && target === box) {
+            results.querySelector(".pagemeld-best")?.click();
+        } else if (key === "/" && !isTyped) {
             openView();
         } else {
             return false;
@@ -184,8 +162,7 @@
         return true;
     }
 
-    // The set being read, then the other one, unless the tag names the sets to search and leaves it out. The contents end
-    // with the other set: its first page of this module.
+    // Of the set being read, then of the other one, whose first page of this module becomes the last entry of the contents.
     async function loadIndexes() {
         status.textContent = "Loading the search index";
         if (!await addIndex(docdata)) {
@@ -201,30 +178,29 @@
         }
     }
 
-    // Adds the search index in a docdata. The results that are shown stay where they are. Returns whether the index ran.
+    // Leaves the results that are shown where they are. Returns whether the index ran.
     async function addIndex(from) {
         const [source, all] = await run(`${from}global_index.js`, new URL("pagemeld-search.js", ownAddress));
-        const hasRun = ["pages", "info", "common", "searchIndex", "prepareIndex"].every((name) => source[name]);
+        const hasRun = source.searchIndex && source.prepareIndex;
         if (hasRun) {
-            const nameOfModule = (prefix) => [prefix, nameOf(createLink(prefix, "", [prefix], from), -3)];
-            const modules = Object.fromEntries(["", ...all].map(nameOfModule));
+            const set = nameOf(from);
+            const label = (prefix) => [prefix, `${set}/${nameOf(createLink(prefix, "", [prefix], from))}`];
+            const labels = Object.fromEntries(["", ...all].map(label));
             search = source;
-            lookups.push({ ...await finish(source.prepareIndex(source, all)), from, set: nameOf(from, -3), modules });
+            lookups.push({ ...await finish(source.prepareIndex(source, all)), from, set, labels });
             addToFilter(lookups.at(-1));
             findAll(found.pages.slice(0, results.childElementCount));
         }
         return hasRun;
     }
 
-    function addToFilter({ set, modules }) {
-        const values = new Set([set, ...Object.values(modules).map((name) => `${set}/${name}`).sort()]);
+    function addToFilter({ set, labels }) {
+        const values = new Set([set, ...Object.values(labels).sort()]);
         filter.append(...Array.from(values, (value) => create("option", { value }, value)));
         filter.parentElement.hidden = filter.length < 4; // all, this set, and one module are the same
     }
 
-    // Whether a page is in the set or module that is chosen.
-    const accepts = ({ set, modules, prefixes }, page) =>
-        ["", set, `${set}/${modules[prefixes[page]]}`].includes(filter.value);
+    const accepts = ({ set, labels, prefixes }, page) => ["", set, labels[prefixes[page]]].includes(filter.value);
 
     function update() {
         if (lookups.length > 0) {
@@ -259,45 +235,44 @@
     }
 
     function createResult(page) {
-        const { set, modules, from, prefixes } = page.asked.lookup;
+        const { set, labels, from, prefixes } = page.asked.lookup;
         const prefix = prefixes[page.page];
         const shown = search.describePage(page);
         const linkTo = ({ link, title }) => createLink(link, title, [prefix], from);
         const result = create("li", {}, linkTo(shown), " ",
-            create("span", {}, lookups.length > 1 ? `${modules[prefix]}, ${set}` : modules[prefix]),
+            create("span", {}, labels[prefix].slice(lookups.length > 1 ? 0 : set.length + 1)),
             create("p", {}, ...shown.pieces.map((piece, i) => (i % 2 === 1 ? create("mark", {}, piece) : piece))),
             create("ul", {}, ...shown.places.map((place) => create("li", {}, linkTo(place)))));
         result.querySelector(shown.isPlaceMeant ? "ul a" : "a").classList.add("pagemeld-best");
         return result;
     }
 
-    // Writes the query of an open view into the address, and what was chosen into the history, so that Back finds it.
-    function keepQuery(chosen) {
+    // For Back, and for a reader who copies the address. A link within the page closes the dialog.
+    function keepQuery({ target }) {
         box.defaultValue = box.value; // to which WebKit resets the box after Back
-        const query = dialog.isConnected && !dialog.open ? "" : box.value.trim();
         const address = new URL(document.URL);
-        const others = address.search.replace(/[?&]pagemeld=[^&]*/, "");
-        address.search = others + (query ? `${others && "&"}pagemeld=${encodeURIComponent(query)}` : "");
-        kept = { module: filter.value, shown: results.childElementCount, chosen };
-        history.replaceState({ ...history.state, pagemeld: kept }, "", address.href);
-    }
-
-    // Once the indexes are there: as it was when the reader left for a result, unless a query is typed meanwhile.
-    async function restoreQuery(query) {
-        const before = kept;
-        box.value = query;
-        await needIndex();
-        if (before && box.value === query) {
-            kept = before;
-            filter.value = kept.module;
-            update();
-            showResults(kept.shown);
-            focusChosen();
+        address.searchParams.delete("pagemeld");
+        if (box.value && (place || dialog.open)) {
+            address.searchParams.set("pagemeld", box.value);
+        }
+        const chosen = target.closest("a")?.href;
+        const state = { module: filter.value, shown: results.childElementCount, chosen };
+        history.replaceState({ ...history.state, pagemeld: state }, "", address.href);
+        if (chosen?.split("#")[0] === document.URL.split("#")[0]) {
+            dialog.close();
         }
     }
 
-    function focusChosen() {
-        [...results.querySelectorAll("a")].find(({ href }) => href === kept?.chosen)?.focus();
+    // As the view was when the reader left for a result, unless something else is typed while the indexes load.
+    async function restoreQuery() {
+        box.value = query;
+        await needIndex();
+        if (before && box.value === query) {
+            filter.value = before.module;
+            update();
+            showResults(before.shown);
+            [...results.querySelectorAll("a")].find(({ href }) => href === before.chosen)?.focus();
+        }
     }
 
     async function loadContents() {
@@ -314,7 +289,7 @@
         showCurrent(contents);
     }
 
-    // The nodes of the contents down to the first that leads to a page, or null.
+    // Returns the nodes down to the first that leads to a page, or null.
     function findWay(nodes, page) {
         for (const node of nodes ?? []) {
             const below = node.link.split("#", 1)[0] === page ? [] : findWay(node.children, page);
@@ -325,7 +300,7 @@
         return null;
     }
 
-    // An entry of the contents. Those below it are made when it is opened, as it is on the way to this page.
+    // The entries below are made when this one is opened, as it is on the way to this page.
     function createEntry(node, way, prefixes) {
         const { link, title, children } = node;
         const name = link === "null" ? "" : createLink(link, title, prefixes);
@@ -353,8 +328,8 @@
         }
     }
 
-    // A link is a path on disk, in which only "#" has a meaning: "File:a.html" and "javascript:" are names of files.
-    // The outputs put the prefix before whole addresses too.
+    // A link is a path on disk, in which only "#" has a meaning: "javascript:" is the name of a file. The outputs put the
+    // prefix before whole addresses too.
     function createLink(link, title, prefixes, from = docdata) {
         const { length } = prefixes.find((prefix) => link.startsWith(prefix)) ?? "";
         const end = `${link}#`.indexOf("#", length);
@@ -364,12 +339,11 @@
         return create("a", { href, target: "_self" }, title.trim() || link);
     }
 
-    // The names of a module and of its set are the last two of its directories.
-    const nameOf = ({ pathname }, level) => decode(pathname.split("/").at(level) ?? "");
+    const nameOf = ({ pathname }) => decode(pathname.split("/").at(-3) ?? ""); // of a module, or of a docdata's set
     const decode = (text) => { try { return decodeURIComponent(text); } catch { return text; } }; // not UTF-8
 
-    // Runs scripts in a hidden frame that stays, so that its functions and values can be used. Returns its window, and
-    // the values of p0, p1, ..., longest first. What a script assigned tells whether it ran.
+    // Runs scripts in a frame, which stays. Returns its window, in which a script that failed left nothing, and the values
+    // of p0, p1, ..., longest first.
     async function run(...addresses) {
         const frame = create("iframe", { hidden: "" });
         await loaded(frame, view);
@@ -393,7 +367,7 @@
         return step.value;
     }
 
-    // Does something at the first call, and returns the same at each.
+    // Acts at the first call, and returns the same at each.
     function once(act) {
         let result;
         return () => (result ??= act());
@@ -409,5 +383,8 @@
         return element;
     }
 
-    start();
-}());
+    const style = create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress) });
+    if (document.body.localName === "body") { // not a frame set
+        loaded(style, document.head).then(start);
+    }
+}(document.currentScript, history.state?.pagemeld));
