@@ -16,16 +16,15 @@
 
     const RESULTS_AT_ONCE = 10;
     const SLICE = 30; // ms of work without a pause
-    const OTHER_SET = { Manual: "ScriptReference", ScriptReference: "Manual" };
 
     const ownAddress = new URL(tag.getAttribute("src"), document.URL); // not below a later <base>
     const docdata = new URL(tag.dataset.docdata?.replace(/\/?$/, "/") ?? new URL(".", ownAddress), document.URL);
 
     const language = { lang: document.documentElement.lang }; // of what is not the view's own words
-    const box = create("input", { type: "search", autocomplete: "off", spellcheck: "false" });
+    const box = create("input", { type: "search", spellcheck: "false" });
     const filter = create("select", language, create("option", { value: "", lang: "en" }, "All"));
     const fields = create("div", {},
-        create("label", {}, "Search all modules ", box), create("label", { hidden: "" }, "Search in ", filter));
+        create("label", {}, "Search all modules ", box), create("label", {}, "Search in ", filter));
     const status = create("p", { role: "status" });
     const results = create("ul", { class: "pagemeld-results", ...language });
     const more = create("button", { hidden: "" }, "More results");
@@ -40,7 +39,7 @@
     const needContents = once(loadContents);
     const lookups = []; // of the sets that are loaded, the own one first
     let search; // the functions of the search file
-    let found = { pages: [] };
+    let pages = []; // that are found
     let isDialogKey = false;
     let placeOfPage; // below the dialog
 
@@ -123,7 +122,6 @@
     // Where there is no room for both parts, only the chosen one is seen.
     function selectTab(chosen) {
         tabs.forEach((tab) => tab.setAttribute("aria-selected", tab === chosen));
-        view.classList.toggle("pagemeld-at-contents", chosen === tabs[1]);
         showCurrent(contents);
     }
 
@@ -169,9 +167,9 @@
             status.textContent = "Search is not available: global_index.js did not run";
             return;
         }
-        const set = OTHER_SET[lookups[0].set];
+        const set = nameOf(docdata) === "Manual" ? "ScriptReference" : "Manual";
         const from = new URL(`../../${set}/docdata/`, docdata);
-        if (set && (tag.dataset.sets ?? set).includes(set) && await addIndex(from)) {
+        if ((tag.dataset.sets ?? set).includes(set) && await addIndex(from)) {
             const first = lookups[1].pages[lookups[1].prefixes.indexOf("")];
             await needContents();
             contents.append(first ? createLink(first[0], set, [], from) : "");
@@ -181,23 +179,18 @@
     // Leaves the results that are shown where they are. Returns whether the index ran.
     async function addIndex(from) {
         const [source, all] = await run(`${from}global_index.js`, new URL("pagemeld-search.js", ownAddress));
-        const hasRun = source.searchIndex && source.prepareIndex;
-        if (hasRun) {
-            const set = nameOf(from);
-            const label = (prefix) => [prefix, `${set}/${nameOf(createLink(prefix, "", [prefix], from))}`];
-            const labels = Object.fromEntries(["", ...all].map(label));
-            search = source;
-            lookups.push({ ...await finish(source.prepareIndex(source, all)), from, set, labels });
-            addToFilter(lookups.at(-1));
-            findAll(found.pages.slice(0, results.childElementCount));
+        if (!source.searchIndex || !source.prepareIndex) {
+            return false;
         }
-        return hasRun;
-    }
-
-    function addToFilter({ set, labels }) {
+        const set = nameOf(from);
+        const label = (prefix) => [prefix, `${set}/${nameOf(createLink(prefix, "", [prefix], from))}`];
+        const labels = Object.fromEntries(["", ...all].map(label));
         const values = new Set([set, ...Object.values(labels).sort()]);
         filter.append(...Array.from(values, (value) => create("option", { value }, value)));
-        filter.parentElement.hidden = filter.length < 4; // all, this set, and one module are the same
+        search = source;
+        lookups.push({ ...await finish(source.prepareIndex(source, all)), from, set, labels });
+        findAll();
+        return true;
     }
 
     const accepts = ({ set, labels, prefixes }, page) => ["", set, labels[prefixes[page]]].includes(filter.value);
@@ -205,27 +198,26 @@
     function update() {
         if (lookups.length > 0) {
             results.replaceChildren();
-            findAll([]);
+            findAll();
         }
     }
 
-    function findAll(shown) {
+    function findAll() {
+        const shown = pages.slice(0, results.childElementCount);
         const isShown = ({ page, asked }) =>
             shown.some((one) => one.page === page && one.asked.lookup === asked.lookup);
-        found = search.findPages(lookups, box.value, accepts);
-        found.pages = shown.concat(found.pages.filter((page) => !isShown(page)));
-        const { length } = found.pages;
-        const whole = found.pages.filter(({ isWhole }) => isWhole).length;
-        const count = ["Nothing", "1 page"][length] ?? `${length} pages`;
-        const rest = whole === length ? "" : `, ${whole || "none"} with all words`;
+        const found = search.findPages(lookups, box.value, accepts);
+        pages = shown.concat(found.pages.filter((page) => !isShown(page)));
+        const whole = pages.filter(({ isWhole }) => isWhole).length;
+        const count = ["Nothing", "1 page"][pages.length] ?? `${pages.length} pages`;
+        const rest = whole === pages.length ? "" : `, ${whole || "none"} with all words`;
         status.textContent = found.words.length > 0 ? `${count} found${rest}` : "";
-        showResults(shown.length);
+        showResults(RESULTS_AT_ONCE);
     }
 
     function showResults(count) {
-        const next = found.pages.slice(results.childElementCount, Math.max(count, RESULTS_AT_ONCE));
-        results.append(...next.map(createResult));
-        more.hidden = results.childElementCount === found.pages.length;
+        results.append(...pages.slice(results.childElementCount, count).map(createResult));
+        more.hidden = results.childElementCount === pages.length;
     }
 
     function showMore() {
@@ -249,7 +241,6 @@
 
     // For Back, and for a reader who copies the address. A link within the page closes the dialog.
     function keepQuery({ target }) {
-        box.defaultValue = box.value; // to which WebKit resets the box after Back
         const address = new URL(document.URL);
         address.searchParams.delete("pagemeld");
         if (box.value && (place || dialog.open)) {
@@ -339,7 +330,7 @@
         return create("a", { href, target: "_self" }, title.trim() || link);
     }
 
-    const nameOf = ({ pathname }) => decode(pathname.split("/").at(-3) ?? ""); // of a module, or of a docdata's set
+    const nameOf = ({ pathname }) => decode(pathname.split("/").at(-3)); // of a module, or of a docdata's set
     const decode = (text) => { try { return decodeURIComponent(text); } catch { return text; } }; // not UTF-8
 
     // Runs scripts in a frame, which stays. Returns its window, in which a script that failed left nothing, and the values
