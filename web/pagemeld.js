@@ -1,15 +1,13 @@
-// Search and contents of all modules in a documentation page: in its <div id="pagemeld">, or else in a dialog that a
-// button in a corner opens. A page on disk can't fetch, so the outputs run as scripts, in hidden frames, where a page's
-// own "const p0" is not in their way. Titles and texts enter the page as text only.
+// Shows search and contents of all modules in the page's <div id="pagemeld">, or else in a dialog that a button opens.
+// Pages on disk can't fetch, so the outputs run as scripts: in frames, since a page may have a "const p0" of its own.
 
 (function main(tag, before) {
     "use strict";
 
-    // A button can wait until the page is loaded.
     const place = document.querySelector("div#pagemeld");
     const query = new URLSearchParams(location.search).get("pagemeld");
     const isReady = place || query ? document.readyState !== "loading" : document.readyState === "complete";
-    if (!isReady) {
+    if (!isReady) { // the button can wait
         addEventListener("load", () => { setTimeout(main, 0, tag, before); });
         return;
     }
@@ -84,7 +82,7 @@
         return corner;
     }
 
-    // Dark where the page's text is light, which an attribute may switch.
+    // Dark where the page's text is light. An attribute may switch the page's theme.
     function matchPage(home) {
         const systemIsDark = matchMedia("(prefers-color-scheme: dark)");
         const match = () => {
@@ -160,7 +158,7 @@
         return true;
     }
 
-    // Of the set being read, then of the other one, whose first page of this module becomes the last entry of the contents.
+    // The other set's index comes second, and the contents end with that set's first page of this module.
     async function loadIndexes() {
         status.textContent = "Loading the search index";
         if (!await addIndex(docdata)) {
@@ -209,7 +207,7 @@
         const found = search.findPages(lookups, box.value, accepts);
         pages = shown.concat(found.pages.filter((page) => !isShown(page)));
         const whole = pages.filter(({ isWhole }) => isWhole).length;
-        const count = ["Nothing", "1 page"][pages.length] ?? `${pages.length} pages`;
+        const count = pages.length === 1 ? "1 page" : `${pages.length || "No"} pages`;
         const rest = whole === pages.length ? "" : `, ${whole || "none"} with all words`;
         status.textContent = found.words.length > 0 ? `${count} found${rest}` : "";
         showResults(RESULTS_AT_ONCE);
@@ -239,7 +237,7 @@
         return result;
     }
 
-    // For Back, and for a reader who copies the address. A link within the page closes the dialog.
+    // For Back, and for readers who copy the address. A link within the page closes the dialog.
     function keepQuery({ target }) {
         const address = new URL(document.URL);
         address.searchParams.delete("pagemeld");
@@ -254,7 +252,7 @@
         }
     }
 
-    // As the view was when the reader left for a result, unless something else is typed while the indexes load.
+    // As it was when the reader left for a result, unless something else is typed meanwhile.
     async function restoreQuery() {
         box.value = query;
         await needIndex();
@@ -291,7 +289,7 @@
         return null;
     }
 
-    // The entries below are made when this one is opened, as it is on the way to this page.
+    // Makes the entries below when this one is opened, as it is on the way to this page.
     function createEntry(node, way, prefixes) {
         const { link, title, children } = node;
         const name = link === "null" ? "" : createLink(link, title, prefixes);
@@ -319,8 +317,8 @@
         }
     }
 
-    // A link is a path on disk, in which only "#" has a meaning: "javascript:" is the name of a file. The outputs put the
-    // prefix before whole addresses too.
+    // A link is a path on disk, in which only "#" has a meaning: "javascript:" begins the name of a file. The outputs put
+    // the prefix before whole addresses too.
     function createLink(link, title, prefixes, from = docdata) {
         const { length } = prefixes.find((prefix) => link.startsWith(prefix)) ?? "";
         const end = `${link}#`.indexOf("#", length);
@@ -333,8 +331,8 @@
     const nameOf = ({ pathname }) => decode(pathname.split("/").at(-3)); // of a module, or of a docdata's set
     const decode = (text) => { try { return decodeURIComponent(text); } catch { return text; } }; // not UTF-8
 
-    // Runs scripts in a frame, which stays. Returns its window, in which a script that failed left nothing, and the values
-    // of p0, p1, ..., longest first.
+    // Runs scripts in a frame that stays. Returns its window, where one that failed left nothing, and the values of p0,
+    // p1, ..., longest first.
     async function run(...addresses) {
         const frame = create("iframe", { hidden: "" });
         await loaded(frame, view);
@@ -374,8 +372,7 @@
         return element;
     }
 
-    const style = create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress) });
     if (document.body.localName === "body") { // not a frame set
-        loaded(style, document.head).then(start);
+        loaded(create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress) }), document.head).then(start);
     }
 }(document.currentScript, history.state?.pagemeld));
