@@ -18,9 +18,7 @@ void PositionTable::Add(Hash hash)
 
 void PositionTable::Grow()
 {
-    constexpr std::size_t kFirstSize = 16;
-    const std::vector<Slot> old = std::exchange(m_slots, {});
-    m_slots.resize(old.empty() ? kFirstSize : 2 * old.size(), Slot{0, kNotFound});
+    const std::vector<Slot> old = std::exchange(m_slots, std::vector<Slot>(2 * m_slots.size()));
     for (const Slot& slot : old)
     {
         if (slot.position != kNotFound)

@@ -22,7 +22,7 @@ public:
     template <class IsEqual>
     [[nodiscard]] std::uint32_t Find(Hash hash, IsEqual isEqual) const
     {
-        if (m_slots.empty() || !hash)
+        if (!hash)
         {
             return kNotFound;
         }
@@ -39,13 +39,7 @@ public:
 
     /// Loads the slot of a hash while the caller does other work, such as this for the next ones. A large
     /// table is not in the caches.
-    void Prefetch(std::uint64_t hash) const
-    {
-        if (!m_slots.empty())
-        {
-            __builtin_prefetch(&m_slots[hash & Mask()]);
-        }
-    }
+    void Prefetch(std::uint64_t hash) const { __builtin_prefetch(&m_slots[hash & Mask()]); }
 
     /// Adds the next position, whose key Find does not find yet.
     void Add(Hash hash);
@@ -70,15 +64,15 @@ public:
 private:
     struct Slot
     {
-        std::uint32_t hash;
-        std::uint32_t position;
+        std::uint32_t hash = 0;
+        std::uint32_t position = kNotFound;
     };
 
     [[nodiscard]] std::size_t Mask() const { return m_slots.size() - 1; }
     void Grow();
     void Place(Slot slot);
 
-    std::vector<Slot> m_slots; // a power of two or none; at most half of them are taken
+    std::vector<Slot> m_slots = std::vector<Slot>(16); // a power of two; at most half of them are taken
     std::size_t m_taken = 0;
     std::uint32_t m_size = 0;
 };

@@ -58,17 +58,6 @@ std::size_t FindEndlessDigits(std::string_view text, std::size_t maxDigits)
     return text.size();
 }
 
-/// Returns the position of the quote that ends the string begun at start, or the end of the text.
-std::size_t FindStringEnd(const std::string& text, std::size_t start)
-{
-    std::size_t i = start + 1;
-    while (i < text.size() && text[i] != '"')
-    {
-        i += text[i] == '\\' ? 2 : 1;
-    }
-    return std::min(i, text.size());
-}
-
 /// Makes an exponent of count digits one of at most nine significant digits, with zeros before them.
 void CutExponent(std::string& text, std::size_t start, std::size_t count)
 {
@@ -81,11 +70,16 @@ void CutExponent(std::string& text, std::size_t start, std::size_t count)
 
 void CutExponents(std::string& text)
 {
+    bool isInString = false;
     for (std::size_t i = 0; i < text.size(); ++i)
     {
         if (text[i] == '"')
         {
-            i = FindStringEnd(text, i);
+            isInString = !isInString;
+        }
+        else if (isInString)
+        {
+            i += text[i] == '\\' ? 1 : 0; // what it escapes may be a quote
         }
         else if (text[i] == '-' && IsExponentSign(text.c_str(), i))
         {
