@@ -15,7 +15,7 @@
     const RESULTS_AT_ONCE = 10;
     const SLICE = 30; // ms of work without a pause
 
-    const ownAddress = new URL(tag.getAttribute("src"), document.URL); // not below a later <base>
+    const ownAddress = new URL(tag.getAttribute("src"), document.URL); // a later <base> does not count
     const docdata = new URL(tag.dataset.docdata?.replace(/\/?$/, "/") ?? new URL(".", ownAddress), document.URL);
 
     const language = { lang: document.documentElement.lang }; // of what is not the view's own words
@@ -37,9 +37,9 @@
     const needContents = once(loadContents);
     const lookups = []; // of the sets that are loaded, the own one first
     let search; // the functions of the search file
-    let pages = []; // that are found
+    let pages = []; // found, best first
     let isDialogKey = false;
-    let placeOfPage; // below the dialog
+    let placeOfPage; // where the page is scrolled to
 
     function start() {
         listen();
@@ -317,7 +317,7 @@
         }
     }
 
-    // A link is a path on disk, in which only "#" has a meaning: "javascript:" begins the name of a file. The outputs put
+    // A link is a path on disk, in which only "#" has a meaning: "javascript:" begins a file's name. The outputs put
     // the prefix before whole addresses too.
     function createLink(link, title, prefixes, from = docdata) {
         const { length } = prefixes.find((prefix) => link.startsWith(prefix)) ?? "";
@@ -372,7 +372,8 @@
         return element;
     }
 
+    const style = create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress) });
     if (document.body.localName === "body") { // not a frame set
-        loaded(create("link", { rel: "stylesheet", href: new URL("pagemeld.css", ownAddress) }), document.head).then(start);
+        loaded(style, document.head).then(start);
     }
 }(document.currentScript, history.state?.pagemeld));
