@@ -98,6 +98,7 @@
     }
 
     function listen() {
+        addEventListener("pageshow", () => { focusResult(history.state?.pagemeld); }); // a kept page may lose the focus
         addEventListener("keydown", onKey);
         ["keydown", "keypress", "keyup"].forEach((type) => addEventListener(type, onDialogKey, true));
         box.onfocus = needIndex;
@@ -260,8 +261,12 @@
             filter.value = before.module;
             update();
             showResults(before.shown);
-            [...results.querySelectorAll("a")].find(({ href }) => href === before.chosen)?.focus();
+            focusResult(before);
         }
+    }
+
+    function focusResult(state) {
+        [...results.querySelectorAll("a")].find(({ href }) => href === state?.chosen)?.focus();
     }
 
     async function loadContents() {
