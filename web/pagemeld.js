@@ -66,8 +66,8 @@
 
     function fillCorner() {
         const opener = create("button",
-            { class: "pagemeld-open", "aria-keyshortcuts": "/", "data-corner": tag.dataset.corner ?? "" },
-            "Search all modules ", create("kbd", { "aria-hidden": "true" }, "/"));
+            { class: "pagemeld-open", "data-corner": tag.dataset.corner ?? "" },
+            "Search all modules ", create("kbd", {}, "/"));
         const close = create("button", { class: "pagemeld-close", "aria-label": "Close" }, "\u00d7");
         const corner = create("div", { id: "pagemeld-corner", role: "region", "aria-label": "Search", lang: "en" },
             opener, dialog);
@@ -381,4 +381,4 @@
     if (document.body.localName === "body") { // not a frame set
         loaded(style, document.head).then(start);
     }
-}(document.currentScript, history.state?.pagemeld));
+}(document.currentScript, history.state?.pagemeld)); // read before Sphinx's scripts replace it
