@@ -1,3 +1,4 @@
+#include "Tools/DocTools/PagemeldCheck/Report/JsonReport.h"
 #include "Tools/DocTools/PagemeldCheck/Report/TextReport.h"
 #include "tests/support/AnswersOfNode.h"
 #include "tests/support/CheckCase.h"
@@ -191,32 +192,79 @@ TEST(PagemeldCheck, TakesDeepContentsOnASmallStack)
     EXPECT_NE(std::string::npos, result.standardOutput.find("\n2 modules, 0 errors, 1 warning\n"));
 }
 
-TEST(PagemeldCheck, FindingsOfEveryRuleMatchTheExpressionOfTheGuide)
+TEST(PagemeldCheck, FindingsOfEveryRuleAreTakenByTheRecipesOfTheGuide)
 {
     const std::string guide = ReadFile(CHECKING_PAGE);
-    const std::size_t start = guide.find("\n    ^") + 5;
-    const std::string script = "const expression = new RegExp(String.raw`" +
-                               guide.substr(start, guide.find('\n', start) - start) + R"(`);
-        function answer(line) { return Buffer.from([...(expression.exec(line) ?? [])].slice(1).join('|')); })";
+    const auto recipe = [&](const std::string& start, const std::string& end)
+    {
+        const std::size_t first = guide.find(start) + start.size();
+        return guide.substr(first, guide.find(end, first) - first);
+    };
+    const std::string script = "const patterns = String.raw`^" + recipe("\n    ^", "\n") + "\n" +
+                               recipe("errorformat=", "\n") + R"(`.split('\n');
+        const items = {f: '(.+?)', l: '([0-9]+)', c: '([0-9]+)', t: '(.)', '*': '', m: '(.*)'};
+        function translated(format) { // of Vim
+            return format.replaceAll('\\ ', ' ').replace(']', ']+').replaceAll(/%(.)/g, (_, item) => items[item]);
+        }
+        const expressions = [[patterns[0]], patterns[1].split(',').map(translated)];
+        function groups(alternatives, line) {
+            return alternatives.map((one) => RegExp(`^${one}$`).exec(line)).find((match) => match) ?? [];
+        }
+        function answer(line) {
+            return Buffer.from(expressions.map((one) => groups(one, line).slice(1).join('|')).join('\n'));
+        })";
+    Finding located = Finding::OfFile(Rule::Count, {0, DocSet::Manual, "a: b/c:7"}, "is [x]: [y]");
+    located.place = ValuePlace{5, 2, 3};
+    located.pointer = "/a: error: [x]";
+    struct
+    {
+        Finding finding;
+        std::string answer;
+        std::string sarif;
+    } cases[] = {
+        {located,
+         "a: b/c:7|2|3|LEVEL|is [x]: [y]|RULE\na: b/c:7|2|3|INITIAL|is [x]: [y] [RULE] /a: error: [x]",
+         R"(["RULE","LEVEL","is [x]: [y]","a%3A%20b/c%3A7",2])"},
+        {Finding::OfRun(Rule::Count, "a", "is [x]: [y]"),
+         "a|||LEVEL|is [x]: [y]|RULE\na|INITIAL|is [x]: [y] [RULE]",
+         R"(["RULE","LEVEL","is [x]: [y]","a",1])"},
+        {Finding::OfSet(Rule::Count, DocSet::Manual, "is [x]: [y]"),
+         "Manual|||LEVEL|is [x]: [y]|RULE\nManual|INITIAL|is [x]: [y] [RULE]",
+         R"(["RULE","LEVEL","is [x]: [y]",null,null])"},
+    };
     std::vector<std::string> lines = {TextSummary({3, {1, 0, 0}, {{{"b"}, {"a", "c"}}, {}}})};
-    std::vector<std::string> expected = {""};
+    std::vector<std::string> answers = {"\n"};
+    std::string json;
+    std::string sarif;
     for (const RuleRow& rule : AllRules())
     {
-        Finding located = Finding::OfFile(rule.id, {0, DocSet::Manual, "a: b/c:7"}, "is [x]: [y]");
-        located.place = ValuePlace{5, 2, 3};
-        located.pointer = "/a: error: [x]";
-        const std::pair<Finding, std::string> cases[] = {
-            {located, "a: b/c:7|2|3|"},
-            {Finding::OfRun(rule.id, "a", "is [x]: [y]"), "a|||"},
-            {Finding::OfSet(rule.id, DocSet::Manual, "is [x]: [y]"), "Manual|||"},
-        };
-        for (const auto& [finding, groups] : cases)
+        const std::string level = NameOf(rule.level);
+        const auto ofRule = [&](const std::string& text)
         {
+            return ReplaceAll(ReplaceAll(ReplaceAll(text, "RULE", rule.name), "LEVEL", level), "INITIAL",
+                              level.substr(0, 1));
+        };
+        for (auto& [finding, expectedAnswer, expectedSarif] : cases)
+        {
+            finding.rule = rule.id;
             lines.push_back(TextLine(finding, false));
-            expected.push_back(groups + NameOf(rule.level) + "|is [x]: [y]|" + rule.name);
+            answers.push_back(ofRule(expectedAnswer));
+            json += JsonLine(finding, {"a"}) + "\n";
+            sarif += ofRule(expectedSarif) + "\n";
         }
     }
-    EXPECT_EQ(expected, AnswersOfNode(script, lines));
+    EXPECT_EQ(answers, AnswersOfNode(script, lines));
+    if (RunProgram("sh", {"-c", "command -v jq"}).status != 0)
+    {
+        GTEST_SKIP() << "the recipe for SARIF is not tested: jq is not installed";
+    }
+    const TemporaryDirectory directory;
+    WriteFile(directory / "findings.jsonl", json + JsonSummary({}));
+    const std::string shown = R"( | jq -c '.runs[0].results[] | [.ruleId, .level, .message.text,
+        (.locations[0].physicalLocation | .artifactLocation.uri, .region.startLine)]')";
+    const std::string convert = "jq" + recipe("    jq", " > findings.sarif");
+    EXPECT_EQ(sarif,
+              RunProgram("sh", {"-c", "cd " + directory.Path() + "; " + convert + shown}).standardOutput);
 }
 
 TEST(PagemeldCheck, ExplainsEveryRuleInHelpAndOnItsPage)
