@@ -7,6 +7,7 @@
 #include "Tools/DocTools/VantorPagemeld/Render/ModulePrefix.h"
 
 #include <algorithm>
+#include <map>
 
 namespace
 {
@@ -24,11 +25,11 @@ struct SetPath
     {
     }
 
-    /// Whether a name is itself in a URL and in a script, and is a step that can't be left out. A space that
-    /// begins a URL is lost.
+    /// Whether a name is itself in a URL and in a script, where empty ones are dropped. A space that begins a
+    /// URL is lost.
     static bool IsPlain(std::string_view name)
     {
-        return !name.empty() && name != "." && name != ".." && name.front() != ' ' &&
+        return name != "." && name != ".." && name.substr(0, 1) != " " &&
                std::none_of(name.begin(), name.end(), [](char c) { return c >= '\0' && c < ' '; }) &&
                name.find_first_of("%#?:\"\\") == std::string_view::npos &&
                FindInvalidUtf8(name) == std::string_view::npos;
@@ -59,21 +60,17 @@ struct SetPath
     std::size_t plainFrom;
 };
 
-/// Returns whether the prefix from one path to another is right for what RelativePrefix is: "../" for every
-/// step after the last '/' that both share, then the rest. It is wrong if they share no '/'. Returns nothing
-/// if a name in "to" is the beginning of the other's, since the walk then ends within that name, or if what
-/// follows that '/' is not plain. What comes before it is not in the prefix.
-std::optional<bool> IsPlainlyRight(const SetPath& from, const SetPath& to)
+/// Returns the length of what both share, to the last '/', if the rest of "to" is plain. It then ends the
+/// prefix as well, so that all prefixes from one path with this length are right, or none. Returns nothing if
+/// a name in "to" is the beginning of the other's, since the walk then ends within that name.
+std::optional<std::size_t> SharedBeforePlainRest(const SetPath& from, const SetPath& to)
 {
     const std::string& source = from.module.Text();
     const auto difference = std::mismatch(source.begin(), source.end(), to.target.begin(), to.target.end());
-    if (difference.first != source.end() && difference.second != to.target.end() && *difference.second == '/')
-    {
-        return std::nullopt;
-    }
     const auto length = static_cast<std::size_t>(difference.first - source.begin());
     const std::size_t shared = std::string_view(source).substr(0, length).rfind('/') + 1;
-    return shared < std::max(from.plainFrom, to.plainFrom) ? std::nullopt : std::optional(shared > 0);
+    const bool endsWithin = difference.second != to.target.end() && *difference.second == '/';
+    return endsWithin || shared < to.plainFrom ? std::nullopt : std::optional(shared);
 }
 
 /// Returns the prefix from one set directory to another as the scripts have it, or nothing if it breaks them.
@@ -113,26 +110,29 @@ struct WrongLinks
 WrongLinks FindWrongLinks(const std::vector<SetPath>& paths, const SetPath& from)
 {
     WrongLinks wrong;
+    std::map<std::size_t, bool> areWrong; // by the length that is shared
     for (const SetPath& to : paths)
     {
-        const std::optional<bool> isRight = IsPlainlyRight(from, to);
-        if (to.position == from.position || isRight == true)
+        const std::optional<std::size_t> shared = SharedBeforePlainRest(from, to);
+        const auto known = shared ? areWrong.find(*shared) : areWrong.end();
+        if (known != areWrong.end())
         {
-            continue;
-        }
-        if (isRight == false && wrong.count > 0)
-        {
-            ++wrong.count;
+            wrong.count += known->second ? 1 : 0;
             continue;
         }
         const std::optional<std::string> prefix = PrefixInScripts(from, to);
         const std::optional<std::string> reached =
             prefix ? FollowPrefix(from, *prefix) : to.webPath; // the other's fault
-        if (reached != to.webPath && wrong.count++ == 0)
+        const bool isWrong = reached != to.webPath;
+        if (isWrong && wrong.count++ == 0)
         {
             wrong.first = &to;
             wrong.reached = reached.value_or("");
             wrong.isHandled = FollowPrefix(from, EncodedPrefix(*prefix)) == to.webPath;
+        }
+        if (shared)
+        {
+            areWrong[*shared] = isWrong;
         }
     }
     return wrong;
