@@ -7,7 +7,10 @@
 TEST(PagemeldCheck, SaysWhatKeepsARunFromWriting)
 {
     ExpectReports({
-        {"mkfifo b/Manual/docdata/global_toc.json.tmp; ln -s /dev/null c/Manual/docdata/global_toc.js.tmp; "
+        {"mkfifo b/Manual/docdata/global_toc.json.tmp; cd a/ScriptReference/docdata; "
+         "echo >global_toc.json; ln -s global_toc.json global_index.json.tmp; ln global_toc.json "
+         "global_index.js.tmp; ln toc.json global_toc.js.tmp; cd @; ln -s /dev/null "
+         "c/Manual/docdata/global_toc.js.tmp; "
          "python3 -c 'import socket; "
          "socket.socket(socket.AF_UNIX).bind(\"c/Manual/docdata/global_toc.json.tmp\")'; "
          "CHECK @/a @/b @/c # Nothing keeps outputs from being written",
@@ -21,7 +24,9 @@ TEST(PagemeldCheck, SaysWhatKeepsARunFromWriting)
           {"a/ScriptReference/docdata/index.json", Index(R"(["p.html","P"])")},
           {"a/ScriptReference/docdata/toc.json", Toc("")},
           {"b/ScriptReference/docdata", "a file"}},
-         R"(@/b/Manual/docdata/global_index.js.tmp: error: a directory is in the place of the temporary file: the run ends here with status 255, and leaves 1 later module and ScriptReference unwritten [output-blocked]
+         R"(@/a/ScriptReference/docdata/global_index.json.tmp: error: is a link to global_toc.json, which the run overwrites [output-blocked]
+@/a/ScriptReference/docdata/global_toc.js.tmp: error: is a link to toc.json, which the run overwrites [output-blocked]
+@/b/Manual/docdata/global_index.js.tmp: error: a directory is in the place of the temporary file: the run ends here with status 255, and leaves 1 later module and ScriptReference unwritten [output-blocked]
 @/b/Manual/docdata/global_index.json.tmp: error: a link to where no file can be made is in the place of the temporary file: the run keeps the old output [output-blocked]
 @/b/Manual/docdata/global_toc.js: error: a directory is in the place of the output: the new one stays as .tmp [output-blocked]
 @/b/Manual/docdata/global_toc.json.tmp: error: a pipe is in the place of the temporary file: the run keeps the old output [output-blocked]
@@ -31,13 +36,15 @@ TEST(PagemeldCheck, SaysWhatKeepsARunFromWriting)
 @/c/Manual/docdata/global_toc.js.tmp: error: a device is in the place of the temporary file: the run writes into it, and it becomes the output: readers get nothing [output-blocked]
 @/c/Manual/docdata/global_toc.json.tmp: error: a socket is in the place of the temporary file: the run keeps the old output [output-blocked]
 @/c/ScriptReference/docdata: error: is missing: a run that came so far would end here with status 255 [output-blocked]
-3 modules, 9 errors, 0 warnings, status 1)"},
+3 modules, 11 errors, 0 warnings, status 1)"},
         {"cd a/Manual/docdata; chmod 0 index.json; chmod 500 .; cd @; chmod 400 b/Manual/docdata/*.tmp; "
          "chmod 0 c/Manual/docdata; AS_USER CHECK @/a @/b @/c # What a user may not read or write",
-         {{"b/Manual/docdata/global_index.js.tmp", ""}, {"c/Manual/docdata", kDirectory}},
-         R"(@/a/Manual/docdata: error: can't be written to: permission denied: the run ends here with status 255, and leaves 2 later modules unwritten [output-blocked]
+         {{"a/Manual/docdata/global_index.js.tmp", ""},
+          {"b/Manual/docdata/global_index.js.tmp", ""},
+          {"c/Manual/docdata", kDirectory}},
+         R"(@/a/Manual/docdata: error: can't be written to: permission denied: the run keeps the old outputs [output-blocked]
 @/a/Manual/docdata/index.json: error: can't be read: permission denied; "a" will be missing from the search of Manual [unreadable]
-@/b/Manual/docdata/global_index.js.tmp: error: a file that can't be read and written is in the place of the temporary file: a run that came so far would end here with status 255 [output-blocked]
+@/b/Manual/docdata/global_index.js.tmp: error: a file that can't be read and written is in the place of the temporary file: the run ends here with status 255, and leaves 1 later module unwritten [output-blocked]
 @/c/Manual/docdata: error: can't be written to: permission denied: a run that came so far would end here with status 255 [output-blocked]
 @/c/Manual/docdata/index.json: error: can't be reached: permission denied; "c" will be missing from the search of Manual [unreadable]
 @/c/Manual/docdata/toc.json: error: can't be reached: permission denied; "c" will be missing from the contents of Manual [unreadable]

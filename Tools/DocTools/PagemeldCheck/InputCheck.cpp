@@ -14,7 +14,6 @@
 #include "Tools/DocTools/VantorPagemeld/System/FileStatus.h"
 
 #include <cerrno>
-#include <cstring>
 #include <utility>
 
 namespace
@@ -102,10 +101,7 @@ public:
             return isSound;
         }
         CheckTocStructure(m_document, onFault);
-        if (MayNameModules())
-        {
-            (void)ReportTaggedNode(m_document, JsonPointer(), isSound);
-        }
+        (void)ReportTaggedNode(m_document, JsonPointer(), isSound);
         return isSound;
     }
 
@@ -163,12 +159,6 @@ private:
                                   return "this is an output: the " + kind + " names its module, " +
                                          DescribeValue(module, m_scope.options.quoteSize) + consequence;
                               });
-    }
-
-    /// Cheap pre-check, false for nearly all texts: a name is there in plain letters, or with an escape.
-    [[nodiscard]] bool MayNameModules() const
-    {
-        return std::strstr(m_text, "\"module\"") != nullptr || std::strstr(m_text, "\\u") != nullptr;
     }
 
     /// Reports the first node that has a module. Returns whether to go on.

@@ -70,12 +70,11 @@ std::uint32_t MergedContents::Add(std::uint64_t way, std::uint32_t module)
 
 std::vector<std::uint64_t> MergedContents::WaysTo(const Value& children, std::uint64_t parent) const
 {
-    std::vector<std::uint64_t> ways;
-    ways.reserve(children.Size());
-    for (const Value& child : children.GetArray())
+    std::vector<std::uint64_t> ways(children.Size());
+    for (rapidjson::SizeType i = 0; i < children.Size(); ++i)
     {
-        ways.push_back(WayTo(parent, child));
-        m_positions.Prefetch(ways.back());
+        ways[i] = WayTo(parent, children[i]);
+        m_positions.Prefetch(ways[i]);
     }
     return ways;
 }

@@ -47,7 +47,7 @@ private:
         }
         else if (!problem.empty())
         {
-            Add(module.docdata, problem + ": " + EndOfRun(module));
+            Add(module.docdata, problem + ": " + OutcomeOfDirectory(module));
         }
         else
         {
@@ -59,19 +59,27 @@ private:
         }
     }
 
+    /// Returns what follows if no file can be made in docdata, where one may be left over.
+    std::string OutcomeOfDirectory(const SetModule& module)
+    {
+        const std::string temporary = TemporaryPathOf(module.path.PathOf(RowOf(kOutputs, kEndsRun)));
+        return FileStatus::Of(temporary).Exists() && DescribeObstacle(temporary).empty()
+                   ? "the run keeps the old outputs"
+                   : EndOfRun(module);
+    }
+
     void CheckOutput(const SetModule& module, const OutputRow& output)
     {
         const ModuleFile file = module.File(output);
         // A link to a directory is not an obstacle: the rename replaces it.
-        if (FileStatus::OfEntry(file.path).IsDirectory())
+        const char* const obstacle =
+            FileStatus::OfEntry(file.path).IsDirectory() ? "a directory is in the place of the output"
+            : IsReservedForOwner(module.docdata.path, file.path)
+                ? "the output of another user in a sticky directory can't be replaced"
+                : nullptr;
+        if (obstacle != nullptr)
         {
-            Add(file, "a directory is in the place of the output: the new one stays as .tmp");
-        }
-        else if (IsReservedForOwner(module.docdata.path, file.path))
-        {
-            Add(file,
-                "the output of another user in a sticky directory can't be replaced: the new one stays as "
-                ".tmp");
+            Add(file, obstacle + (": the new one stays as " + TemporaryPathOf("")));
         }
     }
 
@@ -83,6 +91,10 @@ private:
         {
             Add(file, obstacle + " is in the place of the temporary file: " +
                           (output.id == kEndsRun ? EndOfRun(module) : "the run keeps the old output"));
+        }
+        else if (const std::string name = OverwrittenBy(file.path, module); !name.empty())
+        {
+            Add(file, "is a link to " + name + ", which the run overwrites");
         }
         else if (FileStatus::Of(file.path).IsDevice())
         {
@@ -96,6 +108,21 @@ private:
                 "the temporary file of another user in a sticky directory can't be renamed: the run keeps "
                 "the old output");
         }
+    }
+
+    /// Returns the name of the file that a run overwrites by a link at path, or an empty text. An output is
+    /// replaced, which leaves hard links to it alone.
+    static std::string OverwrittenBy(const std::string& path, const SetModule& module)
+    {
+        const FileStatus status = FileStatus::Of(path);
+        const auto nameIn = [&](const auto& rows) -> std::string
+        {
+            const auto isSame = [&](const auto& row)
+            { return FileStatus::Of(module.docdata.path + "/" + row.name).Id() == status.Id(); };
+            const auto same = std::find_if(std::begin(rows), std::end(rows), isSame);
+            return status.Exists() && same != std::end(rows) ? same->name : "";
+        };
+        return nameIn(kInputs) + (FileStatus::OfEntry(path).IsLink() ? nameIn(kOutputs) : "");
     }
 
     /// Returns what follows where the run ends, or would end if it came that far.

@@ -84,7 +84,9 @@ std::string DescribeUnwritableDirectory(const std::string& path)
     {
         return "is not a directory";
     }
-    return MayAccess(path, W_OK | X_OK) ? "" : "can't be written to: permission denied";
+    return MayAccess(path, W_OK | X_OK) ? ""
+           : errno == EROFS             ? "is on a file system that is read-only"
+                                        : "can't be written to: permission denied";
 }
 
 std::string DescribeObstacle(const std::string& path)
