@@ -15,13 +15,6 @@ TEST(PagemeldCheck, ReadsInputs)
 @/c/Manual/docdata/index.json: error: can't be read: it is larger than 4 GiB; "c" will be missing from the search of Manual [unreadable]
 @/c/Manual/docdata/toc.json: error: is a link to what does not exist; "c" will be missing from the contents of Manual [unreadable]
 3 modules, 4 errors, 0 warnings; missing from the search of Manual: b, c; from its contents: a, c, status 1)"},
-        {"CHECK @/a @/b # A set without inputs is a note",
-         {{"b/Manual/docdata/index.json", kGone},
-          {"b/Manual/docdata/toc.json", kGone},
-          {"b/ScriptReference/docdata", kDirectory}},
-         R"(@/b/Manual/docdata: note: has neither index.json nor toc.json: the module adds nothing to Manual [set-empty]
-@/b/ScriptReference/docdata: note: has neither index.json nor toc.json: the module adds nothing to ScriptReference [set-empty]
-2 modules, 0 errors, 0 warnings, status 0)"},
         {"CHECK @/a @/b # One input does without the other, and not without any",
          {{"a/Manual/docdata/toc.json", kGone}, {"b/Manual/docdata/toc.json", "[]"}},
          R"(@/a/Manual/docdata/toc.json: error: is missing beside index.json; "a" will be missing from the contents of Manual [unreadable]
@@ -42,12 +35,6 @@ Manual: error: no module has a sound toc.json: nothing will be written [nothing-
 @/c/Manual/docdata/toc.json:1:1: error: not JSON: the file is empty; refused at byte 0, at the end of the text; "c" will be missing from the contents of Manual [not-json]
 Manual: error: no module has a sound toc.json: nothing will be written [nothing-to-combine]
 3 modules, 6 errors, 0 warnings; missing from the search of Manual: a, b; from its contents: a, b, c, status 1)"},
-        {"CHECK @/a # UTF-16 is not JSON",
-         {{"a/Manual/docdata/index.json", std::string("{\000\"\000", 4)}},
-         R"(@/a/Manual/docdata/index.json:1:2: warning: a NUL byte ends the text; bytes after it that are not seen: 2 [text-after-nul]
-@/a/Manual/docdata/index.json:1:2: error: not JSON: the file is in UTF-16: save it as UTF-8; refused at byte 1, at the end of the text; "a" will be missing from the search of Manual [not-json]
-Manual: error: no module has a sound index.json: nothing will be written [nothing-to-combine]
-1 module, 2 errors, 1 warning; missing from the search of Manual: a, status 1)"},
         {"CHECK @/a @/b # Each broken rule of the formats is shown, ten of a kind",
          {{"b/Manual/docdata/index.json",
            Index(
@@ -71,11 +58,6 @@ Manual: error: no module has a sound index.json: nothing will be written [nothin
 @/b/Manual/docdata/toc.json:2:48: error: "children" is an object of 0, not an array or null; "b" will be missing from the contents of Manual [structure] /children/0/children
 @/b/Manual/docdata/toc.json:2:52: error: node is 7, not an object; "b" will be missing from the contents of Manual [structure] /children/1
 2 modules, 15 errors, 0 warnings; missing from the search of Manual: b; from its contents: b, status 1)"},
-        {"CHECK @/a @/b # Members are there and of their kind",
-         {{"b/Manual/docdata/index.json", R"({"pages":{},"info":[["i",9]],"common":{}})"}},
-         R"(@/b/Manual/docdata/index.json:1:1: error: "searchIndex" is missing; it must be an object; "b" will be missing from the search of Manual [structure]
-@/b/Manual/docdata/index.json:1:10: error: "pages" is an object of 0, not an array; "b" will be missing from the search of Manual [structure] /pages
-2 modules, 2 errors, 0 warnings; missing from the search of Manual: b, status 1)"},
     });
 }
 
