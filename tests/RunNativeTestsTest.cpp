@@ -13,6 +13,7 @@
 #include <gtest/gtest.h>
 
 #include <stdexcept>
+#include <utility>
 
 #include <unistd.h>
 
@@ -37,9 +38,8 @@ std::string RunWithPlaceholders(Arguments&&... arguments)
 void PrintAndLog()
 {
     EXPECT_NE(nullptr, Testing::g_TestReporter);
-    const int assertCount = Testing::g_AssertCountBeforeTests;
     EXPECT_FALSE(IsNativeTestExpectingAssertionFailure("any text"));
-    EXPECT_EQ(assertCount + 1, Testing::g_AssertCountBeforeTests);
+    EXPECT_EQ(1, std::exchange(Testing::g_AssertCountBeforeTests, 0));
     printf_console("swallowed\n");
     DebugStringToFile({"swallowed too", LogType::Error, "file", 1});
 }

@@ -52,7 +52,7 @@ TEST(ScriptLiteral, HasTheValueThatAScriptEngineGivesIt)
         {R"("\uD83D-\uDE00\uD83D")", "\xED\xA0\xBD-\xED\xB8\x80\xED\xA0\xBD"},
         {R"("\u{10FFFF}\uDBFF\uDFFF\uD800\uDC00")", "\xF4\x8F\xBF\xBF\xF4\x8F\xBF\xBF\xF0\x90\x80\x80"},
         {R"("\7\18\377\400\60z")", "\7\1\x38\xC3\xBF\x20\x30\x30z"},
-        {R"("\08")", std::string("\0\x38", 2)},
+        {R"("\08\0001")", std::string("\0\x38\0\x31", 4)},
         {R"("\"\\" Operator")", kBroken},
         {R"("C:\users")", kBroken},
         {R"("\u{110000}")", kBroken},
