@@ -38,6 +38,7 @@
     const lookups = []; // of the sets that are loaded, the own one first
     let search; // the functions of the search file
     let pages = []; // found, best first
+    let chosen; // the link by which the reader leaves
     let isDialogKey = false;
     let placeOfPage; // where the page is scrolled to
 
@@ -98,7 +99,7 @@
     }
 
     function listen() {
-        addEventListener("pageshow", () => { focusResult(history.state?.pagemeld); }); // a kept page may lose the focus
+        addEventListener("pageshow", () => { chosen?.focus(); }); // a page that the browser kept may lose the focus
         addEventListener("keydown", onKey);
         ["keydown", "keypress", "keyup"].forEach((type) => addEventListener(type, onDialogKey, true));
         box.onfocus = needIndex;
@@ -121,7 +122,7 @@
     // Where there is no room for both parts, only the chosen one is seen.
     function selectTab(chosen) {
         tabs.forEach((tab) => tab.setAttribute("aria-selected", tab === chosen));
-        showCurrent(contents);
+        showCurrent();
     }
 
     // The page sees no key that is pressed in the dialog, nor the release of the one that closes it.
@@ -209,7 +210,7 @@
         pages = shown.concat(found.pages.filter((page) => !isShown(page)));
         const whole = pages.filter(({ isWhole }) => isWhole).length;
         const count = pages.length === 1 ? "1 page" : `${pages.length || "No"} pages`;
-        const rest = whole === pages.length ? "" : `, ${whole || "none"} with all words`;
+        const rest = whole === pages.length ? "" : `, ${whole} with all words`;
         status.textContent = found.words.length > 0 ? `${count} found${rest}` : "";
         showResults(RESULTS_AT_ONCE);
     }
@@ -245,10 +246,10 @@
         if (box.value && (place || dialog.open)) {
             address.searchParams.set("pagemeld", box.value);
         }
-        const chosen = target.closest("a")?.href;
-        const state = { module: filter.value, shown: results.childElementCount, chosen };
+        chosen = target.closest("a");
+        const state = { module: filter.value, shown: results.childElementCount, chosen: chosen?.href };
         history.replaceState({ ...history.state, pagemeld: state }, "", address.href);
-        if (chosen?.split("#")[0] === document.URL.split("#")[0]) {
+        if (chosen?.href.split("#")[0] === document.URL.split("#")[0]) {
             dialog.close();
         }
     }
@@ -261,12 +262,8 @@
             filter.value = before.module;
             update();
             showResults(before.shown);
-            focusResult(before);
+            [...results.querySelectorAll("a")].find(({ href }) => href === before.chosen)?.focus();
         }
-    }
-
-    function focusResult(state) {
-        [...results.querySelectorAll("a")].find(({ href }) => href === state?.chosen)?.focus();
     }
 
     async function loadContents() {
@@ -280,7 +277,6 @@
         const way = findWay(toc.children, page) ?? [];
         const list = create("ul", language, ...toc.children.map((node) => createEntry(node, way, prefixes)));
         contents.append(create("p", language, toc.title), list);
-        showCurrent(contents);
     }
 
     // Returns the nodes down to the first that leads to a page, or null.
@@ -294,12 +290,13 @@
         return null;
     }
 
-    // Makes the entries below when this one is opened, as it is on the way to this page.
+    // Makes the entries below when it is opened, as it is on the way to this page.
     function createEntry(node, way, prefixes) {
         const { link, title, children } = node;
         const name = link === "null" ? "" : createLink(link, title, prefixes);
         if (node === way.at(-1)) {
             name.setAttribute("aria-current", "page");
+            setTimeout(showCurrent);
         }
         if (!children?.length) {
             return create("li", {}, name || title);
@@ -307,18 +304,15 @@
         const list = create("ul", {});
         const summary = name ? create("summary", { "aria-label": `Below ${title}` }) : create("summary", {}, title);
         const details = create("details", {}, summary, list);
-        const fill = () => {
-            list.append(...children.map((child) => createEntry(child, way, prefixes)));
-            showCurrent(list);
-        };
+        const fill = () => { list.append(...children.map((child) => createEntry(child, way, prefixes))); };
         details.addEventListener("toggle", fill, { once: true });
-        details.open = way.slice(0, -1).includes(node);
+        details.open = way.includes(node);
         return create("li", {}, name, details);
     }
 
-    function showCurrent(part) {
+    function showCurrent() {
         if (dialog.open) {
-            part.querySelector("[aria-current]")?.scrollIntoView({ block: "center" });
+            contents.querySelector("[aria-current]")?.scrollIntoView({ block: "center" });
         }
     }
 
