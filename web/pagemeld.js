@@ -38,9 +38,9 @@
     const lookups = []; // of the sets that are loaded, the own one first
     let search; // the functions of the search file
     let pages = []; // found, best first
-    let chosen; // the link by which the reader leaves
+    let chosen; // the link by which the reader left
     let isDialogKey = false;
-    let placeOfPage; // where the page is scrolled to
+    let pageScroll;
 
     function start() {
         listen();
@@ -79,7 +79,7 @@
         close.onclick = () => { dialog.close(); };
         dialog.onclose = keepQuery;
         dialog.onmousedown = ({ target }) => { if (target === dialog) { dialog.close(); } };
-        addEventListener("scroll", () => { if (dialog.open) { scrollTo(placeOfPage); } }); // WebKit's keys scroll it
+        addEventListener("scroll", () => { if (dialog.open) { scrollTo(pageScroll); } }); // WebKit's keys scroll it
         return corner;
     }
 
@@ -111,7 +111,7 @@
 
     function openView() {
         if (!place && !dialog.open) {
-            placeOfPage = { left: scrollX, top: scrollY, behavior: "instant" };
+            pageScroll = { left: scrollX, top: scrollY, behavior: "instant" };
             dialog.showModal();
             needContents();
         }
@@ -119,13 +119,12 @@
         box.select();
     }
 
-    // Where there is no room for both parts, only the chosen one is seen.
     function selectTab(chosen) {
         tabs.forEach((tab) => tab.setAttribute("aria-selected", tab === chosen));
         showCurrent();
     }
 
-    // The page sees no key that is pressed in the dialog, nor the release of the one that closes it.
+    // The page sees no key pressed in the dialog, nor the release of the one that closes it.
     function onDialogKey(event) {
         isDialogKey = event.type === "keydown" ? dialog.open : isDialogKey;
         if (isDialogKey) {
@@ -248,13 +247,13 @@
         }
         chosen = target.closest("a");
         const state = { module: filter.value, shown: results.childElementCount, chosen: chosen?.href };
-        history.replaceState({ ...history.state, pagemeld: state }, "", address.href);
+        history.replaceState({ ...history.state, pagemeld: state }, "", address);
         if (chosen?.href.split("#")[0] === document.URL.split("#")[0]) {
             dialog.close();
         }
     }
 
-    // As it was when the reader left for a result, unless something else is typed meanwhile.
+    // As it was when the reader left, unless something else is typed meanwhile.
     async function restoreQuery() {
         box.value = query;
         await needIndex();
