@@ -1,77 +1,71 @@
-// Finds pages for a query in search indexes, without a document: runs in the frame in which an index ran.
-//
+// Finds pages for a query in search indexes. It has no document.
 // A unit has a title: a page, a place in it (an entry with a fragment), or a text with a heading ("Heading – text").
 // A key is a word, or a part of one, without case and accents. Forms are the keys that a word of a query can mean.
 "use strict";
 
 const WORDS = /[\p{L}\p{M}\p{N}_]+/gu;
 const PARTS = /\p{Lu}+(?!\p{Ll})|\p{Lu}?\p{Ll}+|\p{N}+/gu; // of "JsonParser" or "utf_8"
-const UNSPACED = /([\p{sc=Han}\p{sc=Hira}\p{sc=Kana}\p{sc=Hang}]{1,2})/u; // of words without spaces between them
+const HAS_PARTS = /\S\p{Lu}|_\p{Ll}|\p{N}/u;
+const UNSPACED = /([\p{sc=Han}\p{sc=Hira}\p{sc=Kana}\p{sc=Hang}]{1,2})/u; // of words without spaces
 const [TITLE, HEADING, TEXT] = [1, 0.7, 0.25]; // weights of a word by where it is
-const [PAGES_COMPARED, PLACES_COMPARED, PLACES_SHOWN] = [60, 6, 3];
 
 const byScore = (a, b) => b.score - a.score;
-const push = (map, key, value) => { map.set(key, map.get(key) ?? []).get(key).push(value); };
-const isUnspaced = (text) => UNSPACED.test(text);
+const recall = (map, key, make) => map.get(key) ?? map.set(key, make()).get(key); // a value that is made once
+const push = (map, key, value) => { recall(map, key, () => []).push(value); };
 const unaccent = (text) => text.normalize("NFD").replace(/[\u0300-\u036f]/g, "").replaceAll("ı", "i").normalize("NFC");
 const fold = (text) => (/[^\0-\x7f]/.test(text) ? unaccent(text) : text).toLowerCase();
 const wordsOf = (text) => fold(text).match(WORDS) ?? [];
 const lettersOf = (text) => wordsOf(text).join("").replaceAll("_", "");
-const keysOf = (text) => new Set([...wordsOf(text), ...(text.match(PARTS) ?? []).map(fold)]);
+const keysOf = (text) => wordsOf(text).concat(HAS_PARTS.test(text) ? text.match(PARTS).map(fold) : []);
+// The units whose titles have a key, and the texts that are listed for it.
+const useOf = ({ uses }, key) => recall(uses, key, () => ({ key, units: [], texts: [] }));
 
 // Takes the lists of an index, and its prefixes, longest first. Yields now and then; returns the lookup.
 function* prepareIndex({ pages, info, common, searchIndex }, allPrefixes) {
     const lookup = {
         pages, info, common, prefixes: [], titles: [], owners: [], fields: [], // of units: title, page, title's weight
         unitOfText: [], texts: new Map(), units: new Map(), // texts by unit, units by page
-        named: new Map(), listed: new Map(), pieces: new Map(), // units and texts by key; keys by some of their letters
+        uses: new Map(), groups: new Map(), weighed: new Map(), // of keys; of words of queries
     };
     const owners = new Map();
-    for (const [path, title] of pages) {
+    yield* each(pages, ([path, title]) => {
         const prefix = allPrefixes.find((start) => path.startsWith(start)) ?? "";
-        const page = prefix + path.slice(prefix.length).split("#", 1);
-        owners.set(page, owners.get(page) ?? lookup.titles.length);
+        const page = path.slice(0, `${path}#`.indexOf("#", prefix.length));
         lookup.prefixes.push(prefix);
-        addUnit(lookup, title, owners.get(page));
-        yield;
-    }
-    yield* addTexts(lookup);
-    yield* addKeys(lookup, searchIndex);
+        addUnit(lookup, title, recall(owners, page, () => lookup.titles.length));
+    });
+    yield* each(info, ([words, entry]) => addText(lookup, words, entry));
+    yield* each(Object.keys(searchIndex), (term) => {
+        const use = useOf(lookup, fold(term));
+        use.texts = use.texts.length > 0 ? use.texts.concat(searchIndex[term]) : searchIndex[term];
+    });
     return lookup;
 }
 
-function addUnit({ titles, owners, fields, named, units }, title, owner) {
-    const unit = titles.push(title) - 1;
-    const keys = keysOf(title);
-    owners.push(owner);
-    fields.push((owner === unit ? TITLE : HEADING) * (0.7 + 0.3 / keys.size));
-    push(units, owner, unit);
-    keys.forEach((key) => push(named, key, unit));
+function* each(list, act) {
+    for (let i = 0; i < list.length; i += 500) {
+        list.slice(i, i + 500).forEach((item) => act(item));
+        yield;
+    }
+}
+
+function addUnit(lookup, title, owner) {
+    const unit = lookup.titles.push(title) - 1;
+    const keys = new Set(keysOf(title));
+    lookup.owners.push(owner);
+    lookup.fields.push((owner === unit ? TITLE : HEADING) * (0.7 + 0.3 / keys.size));
+    push(lookup.units, owner, unit);
+    keys.forEach((key) => useOf(lookup, key).units.push(unit));
     return unit;
 }
 
 // The unit of a text is its entry, but a new one if it is of a page and has a heading.
-function* addTexts(lookup) {
-    const { info, titles, owners, unitOfText, texts } = lookup;
-    for (const [text, [words, entry]] of info.entries()) {
-        const [heading, ...rest] = owners[entry] === entry ? words.split(" \u2013 ") : [];
-        const isNew = rest.length > 0 && heading !== titles[entry];
-        unitOfText[text] = isNew ? addUnit(lookup, heading, entry) : entry;
-        push(texts, unitOfText[text], text);
-        yield;
-    }
-}
-
-function* addKeys({ named, listed, pieces }, searchIndex) {
-    for (const [term, texts] of Object.entries(searchIndex)) {
-        const key = fold(term);
-        listed.set(key, listed.get(key)?.concat(texts) ?? texts);
-        yield;
-    }
-    for (const key of new Set([...named.keys(), ...listed.keys()])) {
-        [key.slice(0, 1), key.slice(0, 2), `+${key.slice(3, 5)}`].forEach((piece) => push(pieces, piece, key));
-        yield;
-    }
+function addText(lookup, words, entry) {
+    const { titles, owners, unitOfText, texts } = lookup;
+    const end = owners[entry] === entry ? words.indexOf(" \u2013 ") : -1;
+    const heading = end < 0 ? titles[entry] : words.slice(0, end);
+    const unit = heading === titles[entry] ? entry : addUnit(lookup, heading, entry);
+    push(texts, unit, unitOfText.push(unit) - 1);
 }
 
 // The words searched for: common ones only if there are no others. The last is open, to grow, if the query ends with it.
@@ -83,59 +77,68 @@ function splitQuery(text, common) {
 }
 
 // Whether a number of edits (a letter added, left out, replaced, or swapped) makes a word a key, or its beginning.
-function isNear(word, key, isOpen, edits) {
-    let i = 0;
-    while (i < word.length && word[i] === key[i]) {
+function isNear(word, key, isOpen, edits, i = 0, j = 0) {
+    while (i < word.length && word[i] === key[j]) {
         i++;
+        j++;
     }
     if (edits === 0 || i === word.length) {
-        return i === word.length && (isOpen || key.length - i <= edits);
+        return i === word.length && (isOpen || key.length - j <= edits);
     }
-    const isAfter = (m, n) => isNear(word.slice(i + m), key.slice(i + n), isOpen, edits - 1);
+    const isAfter = (m, n) => isNear(word, key, isOpen, edits - 1, i + m, j + n);
     return isAfter(1, 1) || isAfter(1, 0) || isAfter(0, 1)
-        || (word[i] === key[i + 1] && word[i + 1] === key[i] && isAfter(2, 2));
+        || (word[i] === key[j + 1] && word[i + 1] === key[j] && isAfter(2, 2));
 }
 
 // How well a key is a form of a word: equal, begun, inflected (the same but for the last letters), or mistyped.
-function weighForm(key, { key: word, isOpen }, isLenient) {
+function weighForm(key, word, stem, isOpen, isLenient) {
+    const isMistyped = (edits) => isLenient && word.length >= 4 * edits && isNear(word, key, isOpen, edits);
     const share = Math.min(word.length, key.length) / Math.max(word.length, key.length);
-    const stem = word.slice(0, Math.max(3, Math.ceil(0.7 * word.length)));
-    const canBeNear = (edits) => word.length >= 4 * edits && (isOpen || Math.abs(key.length - word.length) <= edits);
-    const isMistyped = (edits) => isLenient && canBeNear(edits) && isNear(word, key, isOpen, edits);
     return key === word ? 1
-        : key.startsWith(word) && (isOpen || word.length > 2) ? (isOpen ? 0.6 : 0.4) + 0.4 * share
+        : key.startsWith(word) && (isOpen || word.length > 2) ? (isOpen ? 0.8 : 0.6)
         : key.startsWith(stem) && share > 0.6 ? 0.8 * share
         : isMistyped(1) ? 0.5
         : isMistyped(2) ? 0.3 : 0;
 }
 
-// The keys that may be forms. A mistyped word is right at its beginning, or about its fourth letter.
-function findCandidates({ named, listed, pieces }, key, isLenient) {
-    if (isUnspaced(key)) {
-        return [...named.keys(), ...listed.keys()].filter((other) => other.includes(key));
+// The uses of keys that may be forms. A mistyped word is right at its beginning, or about its fourth letter.
+function findCandidates({ uses, groups }, word, isLenient) {
+    const isPart = UNSPACED.test(word);
+    if (isPart || word.length === 1) {
+        return [...uses.values()].filter(({ key }) => (isPart ? key.includes(word) : key.startsWith(word)));
     }
-    const middles = isLenient ? [2, 3, 4].map((start) => `+${key.slice(start, start + 2)}`) : [];
-    return [key.slice(0, 2), ...middles].flatMap((piece) => pieces.get(piece) ?? []);
+    const groupBy = (place) => {
+        const group = new Map();
+        uses.forEach((use) => push(group, use.key.slice(place, place + 2), use));
+        return group;
+    };
+    const find = (place, start) => recall(groups, place, () => groupBy(place)).get(word.slice(start, start + 2)) ?? [];
+    return isLenient ? find(0, 0).concat(find(3, 2), find(3, 3), find(3, 4)) : find(0, 0);
 }
 
 // Weighs units for a word, and pages by the form alone. One or two letters begin a word of nearly every text.
-function weighWord(lookup, word, isLenient) {
-    const { named, listed, owners, fields, unitOfText, units } = lookup;
-    const [forms, scores, held] = [new Map(), new Float32Array(owners.length), new Float32Array(owners.length)];
+function weighWord(lookup, { key: word, isOpen }, isLenient) {
+    const { owners, fields, unitOfText, units } = lookup;
+    const [forms, scores, held] = [new Set(), new Float32Array(owners.length), new Float32Array(owners.length)];
+    const stem = word.slice(0, Math.max(3, Math.ceil(0.7 * word.length)));
+    const isPart = UNSPACED.test(word);
+    let count = 0;
     const raise = (unit, weight, field) => {
+        count += held[owners[unit]] > 0 ? 0 : 1;
         scores[unit] = Math.max(scores[unit], weight * field);
         held[owners[unit]] = Math.max(held[owners[unit]], weight);
     };
-    for (const key of findCandidates(lookup, word.key, isLenient)) {
-        const weight = isUnspaced(word.key) ? 0.8 : weighForm(key, word, isLenient);
-        if (weight > 0 && !forms.has(key)) {
-            forms.set(key, weight);
-            named.get(key)?.forEach((unit) => raise(unit, weight, fields[unit]));
-            const texts = word.key.length > 2 || weight > 0.7 ? listed.get(key) : [];
-            texts?.forEach((text) => raise(unitOfText[text], weight, TEXT));
+    for (const use of findCandidates(lookup, word, isLenient)) {
+        const weight = isPart ? 0.9 : weighForm(use.key, word, stem, isOpen, isLenient);
+        if (weight > 0 && !forms.has(use.key)) {
+            forms.add(use.key);
+            use.units.forEach((unit) => raise(unit, weight, fields[unit]));
+            for (const text of word.length > 2 || weight > 0.8 ? use.texts : []) {
+                raise(unitOfText[text], weight, TEXT);
+            }
         }
     }
-    return { forms, scores, held, rarity: Math.log(1 + units.size / (1 + held.filter(Boolean).length)) };
+    return { key: word, forms, scores, held, rarity: Math.log(1 + units.size / (1 + count)) };
 }
 
 // How close a title is to the query: 4 if it is it, from 3 on if it ends with it, from 2.5 on if it holds it, else less.
@@ -149,21 +152,17 @@ function compareTitle({ words, letters }, title, score) {
     return 2 * score * wordsOf(title).filter(isMeant).length / Math.max(1, wordsOf(title).length);
 }
 
-// The sum of what words weigh, each by its share of the rarity of all.
-function addUp(words, name, length) {
-    const whole = words.reduce((total, { rarity }) => total + rarity, 0);
-    const sums = new Float32Array(length);
-    for (const { rarity, [name]: weights } of words) {
-        weights.forEach((weight, i) => { sums[i] += rarity / whole * weight; });
-    }
-    return sums;
-}
-
 // The pages that hold at least .4 as much of the query as any does; of equal ones the own module's come first.
 function scorePages(asked, accepts) {
     const { words, lookup, lookup: { owners, units, prefixes } } = asked;
-    const [scores, held] = ["scores", "held"].map((name) => addUp(words, name, owners.length));
-    const best = new Float32Array(owners.length);
+    const [scores, held, best] = [0, 0, 0].map(() => new Float32Array(owners.length));
+    const whole = words.reduce((total, { rarity }) => total + rarity, 0);
+    for (const word of words) {
+        for (let unit = 0; unit < owners.length; unit++) {
+            scores[unit] += word.rarity / whole * word.scores[unit];
+            held[unit] += word.rarity / whole * word.held[unit];
+        }
+    }
     scores.forEach((score, unit) => { best[owners[unit]] = Math.max(best[owners[unit]], score); });
     const least = 0.4 * held.reduce((a, b) => Math.max(a, b), 0);
     const found = [...units.keys()].filter((page) => held[page] > least && accepts(lookup, page));
@@ -179,7 +178,7 @@ function compareTitles(result) {
     const { asked, asked: { lookup }, scores, page, factor } = result;
     const compare = (unit) => compareTitle(asked, lookup.titles[unit], scores[unit]);
     const holding = lookup.units.get(page).filter((unit) => unit !== page && scores[unit] > 0);
-    const best = holding.sort((a, b) => scores[b] - scores[a]).slice(0, PLACES_COMPARED);
+    const best = holding.sort((a, b) => scores[b] - scores[a]).slice(0, 6);
     const places = best.map((unit) => ({ unit, score: scores[unit] + compare(unit) })).sort(byScore);
     const first = places.length > 0 ? compare(places[0].unit) : 0;
     const score = result.score + Math.max(compare(page), first < 2 ? 0 : HEADING * first) * factor;
@@ -190,20 +189,22 @@ function compareTitles(result) {
 function findPages(lookups, text, accepts) {
     const words = splitQuery(text, lookups[0].common);
     const find = (isLenient) => lookups.flatMap((lookup) => {
-        const weighed = words.map((word) => ({ ...word, ...weighWord(lookup, word, isLenient) }));
-        return scorePages({ lookup, letters: lettersOf(text), words: weighed }, accepts);
-    }).sort(byScore);
+        const weigh = (word) => weighWord(lookup, word, isLenient);
+        const weighOnce = (word) => recall(lookup.weighed, `${word.key} ${isLenient}`, () => weigh(word));
+        const known = words.map((word) => (word.isOpen ? weigh(word) : weighOnce(word))); // the others do not grow
+        return scorePages({ lookup, letters: lettersOf(text), words: known }, accepts);
+    });
+    lookups.filter(({ weighed }) => weighed.size > 9).forEach(({ weighed }) => weighed.clear());
     const exact = find(false);
-    const pages = exact.some(({ isWhole }) => isWhole) ? exact : find(true);
-    const best = pages.slice(0, PAGES_COMPARED).map(compareTitles).sort(byScore);
-    return { words, pages: best.concat(pages.slice(PAGES_COMPARED)) };
+    const pages = (exact.some(({ isWhole }) => isWhole) ? exact : find(true)).sort(byScore);
+    return { words, pages: pages.slice(0, 60).map(compareTitles).sort(byScore).concat(pages.slice(60)) };
 }
 
 // Splits a text. Every second piece is a word found; of words without spaces between them, what the query has of them.
 function splitText(text, words) {
     const keys = RegExp(words.map(({ key }) => key).join("|"), "giu");
-    const isFound = (word) => [...keysOf(word)].some((key) => words.some(({ forms }) => forms.has(key)));
-    const mark = (word) => (isFound(word) ? word.replace(isUnspaced(word) ? keys : word, "\0$&\0") : word);
+    const isFound = (word) => keysOf(word).some((key) => words.some(({ forms }) => forms.has(key)));
+    const mark = (word) => (isFound(word) ? word.replace(UNSPACED.test(word) ? keys : word, "\0$&\0") : word);
     return text.replace(WORDS, mark).split("\0");
 }
 
@@ -215,6 +216,6 @@ function describePage(result) {
         link: pages[unit]?.[0] ?? `${pages[page][0]}#:~:text=${encodeURIComponent(titles[unit]).replaceAll("-", "%2D")}` });
     const best = units.get(page).filter((unit) => texts.has(unit)).reduce((a, b) => (scores[b] > scores[a] ? b : a), page);
     const pieces = (texts.get(best) ?? []).map((text) => splitText(info[text][0], words));
-    return { ...linkTo(page), isPlaceMeant, places: places.slice(0, PLACES_SHOWN).map(({ unit }) => linkTo(unit)),
+    return { ...linkTo(page), isPlaceMeant, places: places.slice(0, 3).map(({ unit }) => linkTo(unit)),
         pieces: pieces.reduce((a, b) => (b.length > a.length ? b : a), []) };
 }
