@@ -19,12 +19,7 @@ using rapidjson::Value;
 /// Returns the number of binary digits: 0 for 0, 1 for 1, 2 for 2 and 3.
 unsigned BitLength(std::size_t number)
 {
-    unsigned length = 0;
-    for (; number != 0; number >>= 1)
-    {
-        ++length;
-    }
-    return length;
+    return number == 0 ? 0 : 1 + BitLength(number / 2);
 }
 
 void AppendElements(Value& list, Value& input, ArrayRecycler::Allocator& allocator)
