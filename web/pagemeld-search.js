@@ -1,31 +1,30 @@
-// Finds pages for a query in search indexes. It has no document.
-// A unit has a title: a page, a place in it (an entry with a fragment), or a text with a heading ("Heading – text").
-// A key is a word, or a part of one, without case and accents. Forms are the keys that a word of a query can mean.
+// Finds pages for a query. A unit has a title: a page, a place in it (an entry with a fragment), or a text with a heading
+// ("Heading – text"). A key is a word or a part of one, without case and accents. Forms are the keys that a word can mean.
 "use strict";
 
 const WORDS = /[\p{L}\p{M}\p{N}_]+/gu;
 const PARTS = /\p{Lu}+(?!\p{Ll})|\p{Lu}?\p{Ll}+|\p{N}+/gu; // of "JsonParser" or "utf_8"
 const HAS_PARTS = /\S\p{Lu}|_\p{Ll}|\p{N}/u;
 const UNSPACED = /([\p{sc=Han}\p{sc=Hira}\p{sc=Kana}\p{sc=Hang}]{1,2})/u; // of words without spaces
-const [TITLE, HEADING, TEXT] = [1, 0.7, 0.25]; // weights of a word by where it is
+const [TITLE, HEADING, TEXT] = [1, 0.7, 0.25]; // weights
 
 const byScore = (a, b) => b.score - a.score;
-const recall = (map, key, make) => map.get(key) ?? map.set(key, make()).get(key); // a value that is made once
+const recall = (map, key, make) => map.get(key) ?? map.set(key, make()).get(key);
 const push = (map, key, value) => { recall(map, key, () => []).push(value); };
 const unaccent = (text) => text.normalize("NFD").replace(/[\u0300-\u036f]/g, "").replaceAll("ı", "i").normalize("NFC");
 const fold = (text) => (/[^\0-\x7f]/.test(text) ? unaccent(text) : text).toLowerCase();
 const wordsOf = (text) => fold(text).match(WORDS) ?? [];
 const lettersOf = (text) => wordsOf(text).join("").replaceAll("_", "");
 const keysOf = (text) => wordsOf(text).concat(HAS_PARTS.test(text) ? text.match(PARTS).map(fold) : []);
-// The units whose titles have a key, and the texts that are listed for it.
+// The units and texts that have a key.
 const useOf = ({ uses }, key) => recall(uses, key, () => ({ key, units: [], texts: [] }));
 
 // Takes the lists of an index, and its prefixes, longest first. Yields now and then; returns the lookup.
 function* prepareIndex({ pages, info, common, searchIndex }, allPrefixes) {
     const lookup = {
-        pages, info, common, prefixes: [], titles: [], owners: [], fields: [], // of units: title, page, title's weight
-        unitOfText: [], texts: new Map(), units: new Map(), // texts by unit, units by page
-        uses: new Map(), groups: new Map(), weighed: new Map(), // of keys; of words of queries
+        pages, info, common, prefixes: [], titles: [], owners: [], fields: [], // of units: the title's weight
+        unitOfText: [], texts: new Map(), units: new Map(), // by unit, by page
+        uses: new Map(), groups: new Map(), weighed: new Map(), // by key, by letters, by word
     };
     const owners = new Map();
     yield* each(pages, ([path, title]) => {
@@ -59,7 +58,7 @@ function addUnit(lookup, title, owner) {
     return unit;
 }
 
-// The unit of a text is its entry, but a new one if it is of a page and has a heading.
+// A text of a page is a unit of its own if it has a heading.
 function addText(lookup, words, entry) {
     const { titles, owners, unitOfText, texts } = lookup;
     const end = owners[entry] === entry ? words.indexOf(" \u2013 ") : -1;
@@ -68,15 +67,16 @@ function addText(lookup, words, entry) {
     push(texts, unit, unitOfText.push(unit) - 1);
 }
 
-// The words searched for: common ones only if there are no others. The last is open, to grow, if the query ends with it.
+// Common words are left out unless there are no others. The last word is open, to grow, while the query ends with it.
 function splitQuery(text, common) {
     const all = [...new Set(wordsOf(text).flatMap((word) => word.split(UNSPACED)))].filter((key) => key !== "");
     const rare = all.filter((key) => !Object.hasOwn(common, key));
     const canGrow = (rare.length > 0 || all.length === 1) && fold(text).endsWith(all.at(-1));
-    return (rare.length > 0 ? rare : all).map((key) => ({ key, isOpen: canGrow && key === all.at(-1) }));
+    const stemOf = (key) => key.slice(0, Math.max(3, Math.ceil(0.7 * key.length)));
+    return (rare.length > 0 ? rare : all).map((key) => ({ key, stem: stemOf(key), isOpen: canGrow && key === all.at(-1) }));
 }
 
-// Whether a number of edits (a letter added, left out, replaced, or swapped) makes a word a key, or its beginning.
+// Whether edits (a letter added, left out, replaced, or swapped) make a word a key, or its beginning.
 function isNear(word, key, isOpen, edits, i = 0, j = 0) {
     while (i < word.length && word[i] === key[j]) {
         i++;
@@ -90,8 +90,8 @@ function isNear(word, key, isOpen, edits, i = 0, j = 0) {
         || (word[i] === key[j + 1] && word[i + 1] === key[j] && isAfter(2, 2));
 }
 
-// How well a key is a form of a word: equal, begun, inflected (the same but for the last letters), or mistyped.
-function weighForm(key, word, stem, isOpen, isLenient) {
+// How well a key is a form of a word: equal, begun, inflected, or mistyped.
+function weighForm(key, { key: word, stem, isOpen }, isLenient) {
     const isMistyped = (edits) => isLenient && word.length >= 4 * edits && isNear(word, key, isOpen, edits);
     const share = Math.min(word.length, key.length) / Math.max(word.length, key.length);
     return key === word ? 1
@@ -101,7 +101,7 @@ function weighForm(key, word, stem, isOpen, isLenient) {
         : isMistyped(2) ? 0.3 : 0;
 }
 
-// The uses of keys that may be forms. A mistyped word is right at its beginning, or about its fourth letter.
+// A mistyped word is right at its beginning, or about its fourth letter.
 function findCandidates({ uses, groups }, word, isLenient) {
     const isPart = UNSPACED.test(word);
     if (isPart || word.length === 1) {
@@ -116,32 +116,31 @@ function findCandidates({ uses, groups }, word, isLenient) {
     return isLenient ? find(0, 0).concat(find(3, 2), find(3, 3), find(3, 4)) : find(0, 0);
 }
 
-// Weighs units for a word, and pages by the form alone. One or two letters begin a word of nearly every text.
-function weighWord(lookup, { key: word, isOpen }, isLenient) {
+// Weighs units for a word, and pages by the form alone. Nearly every text has a word that one or two letters begin.
+function weighWord(lookup, word, isLenient) {
     const { owners, fields, unitOfText, units } = lookup;
     const [forms, scores, held] = [new Set(), new Float32Array(owners.length), new Float32Array(owners.length)];
-    const stem = word.slice(0, Math.max(3, Math.ceil(0.7 * word.length)));
-    const isPart = UNSPACED.test(word);
+    const isPart = UNSPACED.test(word.key);
     let count = 0;
     const raise = (unit, weight, field) => {
         count += held[owners[unit]] > 0 ? 0 : 1;
         scores[unit] = Math.max(scores[unit], weight * field);
         held[owners[unit]] = Math.max(held[owners[unit]], weight);
     };
-    for (const use of findCandidates(lookup, word, isLenient)) {
-        const weight = isPart ? 0.9 : weighForm(use.key, word, stem, isOpen, isLenient);
+    for (const use of findCandidates(lookup, word.key, isLenient)) {
+        const weight = isPart ? 0.9 : weighForm(use.key, word, isLenient);
         if (weight > 0 && !forms.has(use.key)) {
             forms.add(use.key);
             use.units.forEach((unit) => raise(unit, weight, fields[unit]));
-            for (const text of word.length > 2 || weight > 0.8 ? use.texts : []) {
+            for (const text of word.key.length > 2 || weight > 0.8 ? use.texts : []) {
                 raise(unitOfText[text], weight, TEXT);
             }
         }
     }
-    return { key: word, forms, scores, held, rarity: Math.log(1 + units.size / (1 + count)) };
+    return { ...word, forms, scores, held, rarity: Math.log(1 + units.size / (1 + count)) };
 }
 
-// How close a title is to the query: 4 if it is it, from 3 on if it ends with it, from 2.5 on if it holds it, else less.
+// How close a title is to the query: 4 if it is it, 3 and more if it ends with it, 2.5 and more if it holds it.
 function compareTitle({ words, letters }, title, score) {
     const own = lettersOf(title);
     const isEnd = own.endsWith(letters);
@@ -152,7 +151,7 @@ function compareTitle({ words, letters }, title, score) {
     return 2 * score * wordsOf(title).filter(isMeant).length / Math.max(1, wordsOf(title).length);
 }
 
-// The pages that hold at least .4 as much of the query as any does; of equal ones the own module's come first.
+// Pages hold at least .4 as much of the query as any does; of equal ones the own module's come first.
 function scorePages(asked, accepts) {
     const { words, lookup, lookup: { owners, units, prefixes } } = asked;
     const [scores, held, best] = [0, 0, 0].map(() => new Float32Array(owners.length));
@@ -173,7 +172,7 @@ function scorePages(asked, accepts) {
     });
 }
 
-// Adds the best places to a result, and to its score how close the titles are to the query.
+// Adds to a result its best places, and to its score how close the titles are to the query.
 function compareTitles(result) {
     const { asked, asked: { lookup }, scores, page, factor } = result;
     const compare = (unit) => compareTitle(asked, lookup.titles[unit], scores[unit]);
@@ -185,7 +184,7 @@ function compareTitles(result) {
     return { ...result, score, places, isPlaceMeant: first >= Math.max(3, compare(page)) };
 }
 
-// Returns the words searched for, and the pages found in the lookups, best first, of those that the caller accepts.
+// Returns the words searched for, and the pages found that the caller accepts, best first.
 function findPages(lookups, text, accepts) {
     const words = splitQuery(text, lookups[0].common);
     const find = (isLenient) => lookups.flatMap((lookup) => {
@@ -200,7 +199,7 @@ function findPages(lookups, text, accepts) {
     return { words, pages: pages.slice(0, 60).map(compareTitles).sort(byScore).concat(pages.slice(60)) };
 }
 
-// Splits a text. Every second piece is a word found; of words without spaces between them, what the query has of them.
+// Splits a text. Every second piece is a word found, or a part of one that is not separated from others by spaces.
 function splitText(text, words) {
     const keys = RegExp(words.map(({ key }) => key).join("|"), "giu");
     const isFound = (word) => keysOf(word).some((key) => words.some(({ forms }) => forms.has(key)));
@@ -208,7 +207,7 @@ function splitText(text, words) {
     return text.replace(WORDS, mark).split("\0");
 }
 
-// What is shown of a result: a link, a text with its words, and the best places, without an address by their headings.
+// What is shown of a result. A place without an address is linked by its heading.
 function describePage(result) {
     const { asked: { words, lookup }, scores, page, places, isPlaceMeant } = compareTitles(result);
     const { titles, pages, units, texts, info } = lookup;
