@@ -18,7 +18,7 @@ class Page {
 
     // Waits until an expression is true, also across pages.
     async until(expression) {
-        for (const end = Date.now() + 10000; !(await this.evaluate(`Boolean(${expression})`).catch(() => false));) {
+        for (const end = Date.now() + 30000; !(await this.evaluate(`Boolean(${expression})`).catch(() => false));) {
             assert(Date.now() < end, `never true: ${expression}`);
             await delay(20);
         }
@@ -100,9 +100,10 @@ class WebKitPage extends Page {
         }
     }
 
+    // What is asked of a page while it is left may never be answered.
     async ask(command, body) {
-        const method = body ? "POST" : "GET";
-        const response = await fetch(this.address + command, { method, body: body ? JSON.stringify(body) : null });
+        const options = { method: body ? "POST" : "GET", body: body ? JSON.stringify(body) : null };
+        const response = await fetch(this.address + command, { ...options, signal: AbortSignal.timeout(15000) });
         const { value } = await response.json();
         assert(response.ok, value?.message);
         return value;
