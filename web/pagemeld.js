@@ -37,7 +37,7 @@
     const needContents = once(loadContents);
     const lookups = []; // of the sets that are loaded, the own one first
     let search; // the functions of the search file
-    let pages = []; // found, best first
+    let pages = []; // found
     let chosen; // the link by which the reader left
     let isDialogKey = false;
     let pageScroll;
@@ -99,7 +99,7 @@
     }
 
     function listen() {
-        addEventListener("pageshow", () => { chosen?.focus(); }); // a page that the browser kept may lose the focus
+        addEventListener("pageshow", () => { chosen?.focus(); }); // a page kept for Back may lose the focus
         addEventListener("keydown", onKey);
         ["keydown", "keypress", "keyup"].forEach((type) => addEventListener(type, onDialogKey, true));
         box.onfocus = needIndex;
@@ -342,7 +342,7 @@
         return [source, prefixes.sort((a, b) => b.length - a.length)];
     }
 
-    // Runs a generator, and makes way for the reader's events now and then. Returns its result.
+    // Returns the result of a generator, and lets the reader's events pass while it runs.
     async function finish(steps) {
         const { port1, port2 } = new MessageChannel(); // a timer would wait 4 ms each time
         let step = steps.next();
@@ -358,7 +358,6 @@
         return step.value;
     }
 
-    // Acts at the first call, and returns the same at each.
     function once(act) {
         let result;
         return () => (result ??= act());
