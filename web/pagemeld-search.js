@@ -1,5 +1,5 @@
-// Finds pages for a query. A unit has a title: a page, a place in it (an entry with a fragment), or a text with a heading
-// ("Heading – text"). A key is a word or a part of one, without case and accents. Forms are the keys that a word can mean.
+// A unit has a title: a page, a place in it (an entry with a fragment), or a text with a heading ("Heading – text").
+// A key is a word or a part of one, without case and accents. Forms are the keys that a word of a query can mean.
 "use strict";
 
 const WORDS = /[\p{L}\p{M}\p{N}_]+/gu;
@@ -72,8 +72,8 @@ function splitQuery(text, common) {
     const all = [...new Set(wordsOf(text).flatMap((word) => word.split(UNSPACED)))].filter((key) => key !== "");
     const rare = all.filter((key) => !Object.hasOwn(common, key));
     const canGrow = (rare.length > 0 || all.length === 1) && fold(text).endsWith(all.at(-1));
-    const stemOf = (key) => key.slice(0, Math.max(3, Math.ceil(0.7 * key.length)));
-    return (rare.length > 0 ? rare : all).map((key) => ({ key, stem: stemOf(key), isOpen: canGrow && key === all.at(-1) }));
+    return (rare.length > 0 ? rare : all).map((key) => ({ key, isOpen: canGrow && key === all.at(-1),
+        stem: key.slice(0, Math.max(3, Math.ceil(0.7 * key.length))) }));
 }
 
 // Whether edits (a letter added, left out, replaced, or swapped) make a word a key, or its beginning.
