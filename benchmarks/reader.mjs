@@ -165,7 +165,7 @@ async function measure(page) {
         ["of it, the index script alone", "-", ms(alone)],
         ["the longest other task", "at most 100 ms", ms(task)],
         ["a keystroke, median / 95th percentile", "at most 8 / 25 ms", await measureKeystrokes(page)],
-        ["size of the files / with gzip", "at most 34 / 11 KB", measureSizes()],
+        ["size of the files / with gzip", "at most 34 / 11 KiB", measureSizes()],
     ];
     const script = statSync(fileURLToPath(`${base}docdata/global_index.js`)).size;
     const model = /^model name\s*: (.*)/m.exec(readFileSync("/proc/cpuinfo", "utf8"))?.[1];

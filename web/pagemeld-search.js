@@ -19,7 +19,7 @@ const keysOf = (text) => wordsOf(text).concat(HAS_PARTS.test(text) ? text.match(
 // The units and texts that have a key.
 const useOf = ({ uses }, key) => recall(uses, key, () => ({ key, units: [], texts: [] }));
 
-// Takes the lists of an index, and its prefixes, longest first. Yields now and then; returns the lookup.
+// Takes an index, and its prefixes, longest first. Yields now and then, and returns the lookup.
 function* prepareIndex({ pages, info, common, searchIndex }, allPrefixes) {
     const lookup = {
         pages, info, common, prefixes: [], titles: [], owners: [], fields: [], // of units: the title's weight
@@ -67,9 +67,9 @@ function addText(lookup, words, entry) {
     push(texts, unit, unitOfText.push(unit) - 1);
 }
 
-// Common words are left out unless there are no others. The last word is open, to grow, while the query ends with it.
+// Common words are left out unless there are no others. The last is open, to grow, while the query ends with it.
 function splitQuery(text, common) {
-    const all = [...new Set(wordsOf(text).flatMap((word) => word.split(UNSPACED)))].filter((key) => key !== "");
+    const all = [...new Set(wordsOf(text).flatMap((word) => word.split(UNSPACED)))].filter(Boolean);
     const rare = all.filter((key) => !Object.hasOwn(common, key));
     const canGrow = (rare.length > 0 || all.length === 1) && fold(text).endsWith(all.at(-1));
     return (rare.length > 0 ? rare : all).map((key) => ({ key, isOpen: canGrow && key === all.at(-1),
@@ -93,10 +93,10 @@ function isNear(word, key, isOpen, edits, i = 0, j = 0) {
 // How well a key is a form of a word: equal, begun, inflected, or mistyped.
 function weighForm(key, { key: word, stem, isOpen }, isLenient) {
     const isMistyped = (edits) => isLenient && word.length >= 4 * edits && isNear(word, key, isOpen, edits);
-    const share = Math.min(word.length, key.length) / Math.max(word.length, key.length);
+    const share = Math.min(key.length / word.length, word.length / key.length);
     return key === word ? 1
         : key.startsWith(word) && (isOpen || word.length > 2) ? (isOpen ? 0.8 : 0.6)
-        : key.startsWith(stem) && share > 0.6 ? 0.8 * share
+        : share > 0.6 && key.startsWith(stem) ? 0.8 * share
         : isMistyped(1) ? 0.5
         : isMistyped(2) ? 0.3 : 0;
 }
@@ -116,7 +116,7 @@ function findCandidates({ uses, groups }, word, isLenient) {
     return isLenient ? find(0, 0).concat(find(3, 2), find(3, 3), find(3, 4)) : find(0, 0);
 }
 
-// Weighs units for a word, and pages by the form alone. Nearly every text has a word that one or two letters begin.
+// Weighs units, and pages by the form alone. Nearly every text has a word that one or two letters begin.
 function weighWord(lookup, word, isLenient) {
     const { owners, fields, unitOfText, units } = lookup;
     const [forms, scores, held] = [new Set(), new Float32Array(owners.length), new Float32Array(owners.length)];
@@ -140,7 +140,7 @@ function weighWord(lookup, word, isLenient) {
     return { ...word, forms, scores, held, rarity: Math.log(1 + units.size / (1 + count)) };
 }
 
-// How close a title is to the query: 4 if it is it, 3 and more if it ends with it, 2.5 and more if it holds it.
+// Returns 4 if the title is the query, 3 and more if it ends with it, 2.5 and more if it holds it.
 function compareTitle({ words, letters }, title, score) {
     const own = lettersOf(title);
     const isEnd = own.endsWith(letters);
@@ -172,7 +172,7 @@ function scorePages(asked, accepts) {
     });
 }
 
-// Adds to a result its best places, and to its score how close the titles are to the query.
+// Adds the best places, and to the score how close titles are to the query.
 function compareTitles(result) {
     const { asked, asked: { lookup }, scores, page, factor } = result;
     const compare = (unit) => compareTitle(asked, lookup.titles[unit], scores[unit]);
@@ -184,7 +184,7 @@ function compareTitles(result) {
     return { ...result, score, places, isPlaceMeant: first >= Math.max(3, compare(page)) };
 }
 
-// Returns the words searched for, and the pages found that the caller accepts, best first.
+// Returns the words searched for, and the pages found, best first.
 function findPages(lookups, text, accepts) {
     const words = splitQuery(text, lookups[0].common);
     const find = (isLenient) => lookups.flatMap((lookup) => {
@@ -199,7 +199,7 @@ function findPages(lookups, text, accepts) {
     return { words, pages: pages.slice(0, 60).map(compareTitles).sort(byScore).concat(pages.slice(60)) };
 }
 
-// Splits a text. Every second piece is a word found, or a part of one that is not separated from others by spaces.
+// Every second piece is a word found, or a part of one where words have no spaces between them.
 function splitText(text, words) {
     const keys = RegExp(words.map(({ key }) => key).join("|"), "giu");
     const isFound = (word) => keysOf(word).some((key) => words.some(({ forms }) => forms.has(key)));
