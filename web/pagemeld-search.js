@@ -4,8 +4,8 @@
 
 const WORDS = /[\p{L}\p{M}\p{N}_]+/gu;
 const PARTS = /\p{Lu}+(?!\p{Ll})|\p{Lu}?\p{Ll}+|\p{N}+/gu; // of "JsonParser" or "utf_8"
-const HAS_PARTS = /\S\p{Lu}|_\p{Ll}|\p{N}/u;
-const UNSPACED = /([\p{sc=Han}\p{sc=Hira}\p{sc=Kana}\p{sc=Hang}]{1,2})/u; // of words without spaces
+const HAS_PARTS = /\S\p{Lu}|[_\p{Lo}\p{Lm}]\p{Ll}|\p{N}/u;
+const UNSPACED = /([\p{sc=Han}\p{sc=Hira}\p{scx=Kana}\p{sc=Hang}]{1,2})/u; // of words without spaces
 const [TITLE, HEADING, TEXT] = [1, 0.7, 0.25]; // weights
 
 const byScore = (a, b) => b.score - a.score;
