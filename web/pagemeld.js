@@ -85,7 +85,7 @@ function matchPage(home) {
     const systemIsDark = matchMedia("(prefers-color-scheme: dark)");
     const match = () => {
         const { color } = getComputedStyle(home.parentElement);
-        const [red, green, blue] = color.match(/[\d.]+/g);
+        const [, red, green, blue] = color.split(/[(,)]/);
         const isLight = 0.21 * red + 0.72 * green + 0.07 * blue > 127;
         home.style.colorScheme = (color.startsWith("rgb") ? isLight : systemIsDark.matches) ? "dark" : "light";
     };
@@ -96,7 +96,7 @@ function matchPage(home) {
 }
 
 function listen() {
-    addEventListener("pageshow", () => { chosen?.focus(); }); // a page kept for Back may lose the focus
+    addEventListener("pageshow", () => { chosen?.focus({ preventScroll: true }); }); // lost by a page kept for Back
     addEventListener("keydown", onKey);
     ["keydown", "keypress", "keyup"].forEach((type) => addEventListener(type, onDialogKey, true));
     box.onfocus = needIndex;
@@ -131,7 +131,8 @@ function onDialogKey(event) {
 }
 
 function onKey(event) {
-    const isTaken = event.ctrlKey || event.altKey || event.metaKey || event.isComposing || event.defaultPrevented;
+    const isComposing = event.isComposing || event.keyCode === 229; // the last key, in Safari
+    const isTaken = event.ctrlKey || event.altKey || event.metaKey || isComposing || event.defaultPrevented;
     if (event.type === "keydown" && !isTaken && actOn(event.key, event.composedPath()[0])) {
         event.preventDefault();
     }
@@ -163,9 +164,9 @@ async function loadIndexes() {
         status.textContent = "Search is not available: global_index.js did not run";
         return;
     }
-    const set = nameOf(docdata) === "Manual" ? "ScriptReference" : "Manual";
+    const set = { Manual: "ScriptReference", ScriptReference: "Manual" }[nameOf(docdata)];
     const from = new URL(`../../${set}/docdata/`, docdata);
-    if ((tag.dataset.sets ?? set).includes(set) && await addIndex(from)) {
+    if ((tag.dataset.sets ?? set)?.includes(set) && await addIndex(from)) {
         const first = lookups[1].pages[lookups[1].prefixes.indexOf("")];
         await needContents();
         contents.append(first ? createLink(first[0], set, [], from) : "");
@@ -311,8 +312,7 @@ function showCurrent() {
     }
 }
 
-// A link is a path on disk, in which only "#" has a meaning: "javascript:" begins a file's name. The outputs put
-// the prefix before whole addresses too.
+// A link is a path on disk, even "javascript:"; only "#" has a meaning. A prefix may precede a whole address.
 function createLink(link, title, prefixes, from = docdata) {
     const { length } = prefixes.find((prefix) => link.startsWith(prefix)) ?? "";
     const end = `${link}#`.indexOf("#", length);
@@ -322,11 +322,10 @@ function createLink(link, title, prefixes, from = docdata) {
     return create("a", { href, target: "_self" }, title.trim() || link);
 }
 
-const nameOf = ({ pathname }) => decode(pathname.split("/").at(-3)); // of a module, or of a docdata's set
+const nameOf = ({ pathname }) => decode(pathname.split("/").at(-3) ?? ""); // of a module, or of a docdata's set
 const decode = (text) => { try { return decodeURIComponent(text); } catch { return text; } }; // not UTF-8
 
-// Runs scripts in a frame that stays. Returns its window, where one that failed left nothing, and the values of p0,
-// p1, ..., longest first.
+// Runs scripts in a frame that stays. Returns its window, and the values of p0, p1, ..., longest first.
 async function run(...addresses) {
     const frame = create("iframe", { hidden: "" });
     await loaded(frame, view);
@@ -338,7 +337,7 @@ async function run(...addresses) {
     return [source, prefixes.sort((a, b) => b.length - a.length)];
 }
 
-// Returns a generator's result. Lets the reader's events pass while it runs.
+// Runs a generator, and lets the reader's events pass.
 async function finish(steps) {
     let step = steps.next();
     for (let end = 0; !step.done; step = steps.next()) {
