@@ -40,7 +40,7 @@ const entries = [
     ["c.html", "C", "A language."], ["cplus.html", "Classes", "More than c."],
     ["cafe.html", "Cr\u00e8me br\u00fbl\u00e9e", "Sugar."], ["city.html", "\u0130stanbul ve I\u011fd\u0131r, k\u0131\u015f", "\u015eehir."], ["zone.html", "Zones", "Of time."],
     ["zh.html", "\u5168\u6587\u641c\u7d22\u5f15\u64ce", "\u5b89\u88c5\u7a0b\u5e8f\u7684\u6b65\u9aa4\u3002"],
-    ["ja.html", "\u30b5\u30fc\u30d0\u30fcmqtt\u6587\u66f8\u306e\u691c\u7d22\u65b9\u6cd5", "\u30d7\u30ed\u30b0\u30e9\u30e0\u3092\u8d77\u52d5\u3057\u307e\u3059\u3002"],
+    ["ja.html", "\u30b5\u30fc\u30d0\u30fcqt\u6587\u66f8\u306e\u691c\u7d22\u65b9\u6cd5", "\u30d7\u30ed\u30b0\u30e9\u30e0\u3092\u8d77\u52d5\u3057\u307e\u3059\u3002"],
     ["ko.html", "\uc804\uc790\ubb38\uc11c\ub97c \uc77d\uae30", "\ud504\ub85c\uadf8\ub7a8\uc744 \uc2dc\uc791\ud569\ub2c8\ub2e4."],
     ["../../sea/Manual/tide.html", "Tide tables", "Rise and fall."], ["tide.html", "Tide tables", "Rise and fall."],
     ["odd.html", "__proto__", "hasOwnProperty and constructor."],
@@ -77,7 +77,7 @@ const rows = [
     ["Turkish, dotted", "istanbul", "city.html"], ["Turkish, dotless, too short for an edit", "kis", "city.html"],
     ["Chinese, in a run", "\u641c\u7d22", "zh.html"], ["Chinese, in two runs", "\u5b89\u88c5\u6b65\u9aa4", "zh.html"],
     ["Japanese", "\u691c\u7d22", "ja.html"], ["Japanese, in a text", "\u8d77\u52d5", "ja.html"],
-    ["Latin letters in a run", "mqtt", "ja.html"],
+    ["Latin letters in a run", "qt", "ja.html"],
     ["Korean", "\ubb38\uc11c", "ko.html"],
     ["names of every object", "__proto__", "odd.html"], ["names of every object", "constructor", "odd.html"],
 ];

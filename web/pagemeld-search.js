@@ -4,7 +4,7 @@
 
 const WORDS = /[\p{L}\p{M}\p{N}_]+/gu;
 const PARTS = /\p{Lu}+(?!\p{Ll})|\p{Lu}?\p{Ll}+|\p{N}+/gu; // of "JsonParser" or "utf_8"
-const HAS_PARTS = /\S\p{Lu}|[_\p{Lo}\p{Lm}]\p{Ll}|\p{N}/u;
+const HAS_PARTS = /\S\p{Lu}|[_\p{Lo}\p{Lm}\p{N}]/u;
 const UNSPACED = /([\p{sc=Han}\p{sc=Hira}\p{scx=Kana}\p{sc=Hang}]{1,2})/u; // of words without spaces
 const [TITLE, HEADING, TEXT] = [1, 0.7, 0.25]; // weights
 
@@ -15,7 +15,7 @@ const unaccent = (text) => text.normalize("NFD").replace(/[\u0300-\u036f]/g, "")
 const fold = (text) => (/[^\0-\x7f]/.test(text) ? unaccent(text) : text).toLowerCase();
 const wordsOf = (text) => fold(text).match(WORDS) ?? [];
 const lettersOf = (text) => wordsOf(text).join("").replaceAll("_", "");
-const keysOf = (text) => wordsOf(text).concat(HAS_PARTS.test(text) ? text.match(PARTS).map(fold) : []);
+const keysOf = (text) => wordsOf(text).concat(HAS_PARTS.test(text) ? (text.match(PARTS) ?? []).map(fold) : []);
 // The units and texts that have a key.
 const useOf = ({ uses }, key) => recall(uses, key, () => ({ key, units: [], texts: [] }));
 
