@@ -34,7 +34,7 @@ TEST(PagemeldCheck, FindsModulesAsARunDoes)
           {"c/n", kLink + "c/.o"},
           {"c/.o/p/Manual/docdata", kDirectory},
           {"c/r/ScriptReference/docdata", kDirectory},
-          {"c/s/ScriptReference", kDirectory},
+          {"c/s/ScriptReference/picture.png", ""},
           {"c/t/manual/docdata/index.json", ""},
           {"c/u/Manual/page.html", ""},
           {"c/v/docdata/toc.json", ""},
@@ -121,13 +121,13 @@ TEST(PagemeldCheck, FollowsLinksFromRootToRoot)
 n/b: error: links to a will lead to n/a/Manual: give absolute paths [wrong-link-path]
 a: error: links to n/./a and 1 more will lead to a/n/a/Manual: give absolute paths [wrong-link-path]
 3 modules, 3 errors, 0 warnings, status 1)"},
-        {"CHECK @/a @/a/ScriptReference-1 # Links of both sets are followed",
+        {"CHECK -q @/a @/a/ScriptReference-1 @/ab # Links of both sets are followed, and told once",
          {{"a/ScriptReference/docdata", kDirectory},
           {"a/ScriptReference-1", kModule},
-          {"a/ScriptReference-1/ScriptReference/docdata", kDirectory}},
-         R"(@/a/ScriptReference/docdata: note: has neither index.json nor toc.json: the module adds nothing to ScriptReference [set-empty]
-@/a/ScriptReference-1: error: links to @/a will lead to @/a/ScriptReference-1: rename ScriptReference-1, which begins with ScriptReference [wrong-link-path]
-@/a/ScriptReference-1/ScriptReference/docdata: note: has neither index.json nor toc.json: the module adds nothing to ScriptReference [set-empty]
-2 modules, 1 error, 0 warnings, status 1)"},
+          {"a/ScriptReference-1/ScriptReference/docdata", kDirectory},
+          {"ab", kModule},
+          {"ab/ScriptReference/docdata", kDirectory}},
+         R"(@/a/ScriptReference-1: error: links to @/a will lead to @/a/ScriptReference-1: rename ScriptReference-1, which begins with ScriptReference [wrong-link-path]
+@/ab: error: links to @/a and 1 more will lead to @/ab/Manual: rename ab, which begins with a [wrong-link-path], status 1)"},
     });
 }

@@ -56,21 +56,14 @@ TEST(WebPath, TellsRightPrefixesFromWrongOnes)
         bool isRight;
         bool isRightBack;
     } cases[] = {{"docs/a", "docs/b", true, true},
-
                  {"docs/m1", "docs/m12", true, false}, // one name begins with the other
-
-                 {"docs1", "docs2", false, false}, // no common directory
-
+                 {"docs1", "docs2", false, false},     // no common directory
                  {"./a", "b", true, false},
                  {"a/../b", "a/c", false, true},
-
                  {"docs/a/", "docs/b/", false, false}, // every slash is one more to climb
                  {"docs/a/", "docs/b", false, true},
-
                  {"docs//a", "docs//b", true, true},
-
                  {"/r/100%", "/r/b c", true, true},
-
                  {"/r/%2e%2e/a", "/r/%2e%2e/b", true, true},
                  {"m", "m/Manual/ftp:", false, true}}; // the prefix has a scheme
     for (const auto& c : cases)

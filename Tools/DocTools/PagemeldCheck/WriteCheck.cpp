@@ -63,7 +63,7 @@ private:
     std::string OutcomeOfDirectory(const SetModule& module)
     {
         const std::string temporary = TemporaryPathOf(module.path.PathOf(RowOf(kOutputs, kEndsRun)));
-        return FileStatus::Of(temporary).Exists() && DescribeObstacle(temporary).empty()
+        return FileStatus::OfEntry(temporary).Exists() && DescribeObstacle(temporary).empty()
                    ? "the run keeps the old outputs"
                    : EndOfRun(module);
     }
